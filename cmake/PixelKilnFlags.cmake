@@ -1,0 +1,15 @@
+# Compile flags that every target of the project shares.
+#
+# Floating-point results are part of the interface: no contraction into fused multiply-adds, no fast-math.
+
+add_library(pixelkiln_flags INTERFACE)
+target_compile_options(pixelkiln_flags INTERFACE -ffp-contract=off -Wall -Wextra -Wshadow -Wconversion
+                       -Wno-sign-conversion)
+if(PIXELKILN_WARNINGS_AS_ERRORS)
+  target_compile_options(pixelkiln_flags INTERFACE -Werror)
+endif()
+if(PIXELKILN_SANITIZE)
+  target_compile_options(pixelkiln_flags INTERFACE -fsanitize=${PIXELKILN_SANITIZE} -fno-omit-frame-pointer
+                         -fno-sanitize-recover=all)
+  target_link_options(pixelkiln_flags INTERFACE -fsanitize=${PIXELKILN_SANITIZE})
+endif()

@@ -1,0 +1,24 @@
+# pixelkiln_add_kernels(TARGET FILE...)
+#
+# Compiles each X.kernels.cpp once per instruction set, in the namespace named after it, and adds the
+# objects to TARGET. A further instruction set is one more word in the list below and one file in
+# Src/primitives/simd/.
+
+set(PIXELKILN_KERNEL_TARGETS plain sse2 ssse3 sse41 avx2)
+set(PIXELKILN_KERNEL_FLAGS_plain "")
+set(PIXELKILN_KERNEL_FLAGS_sse2 -msse2)
+set(PIXELKILN_KERNEL_FLAGS_ssse3 -mssse3)
+set(PIXELKILN_KERNEL_FLAGS_sse41 -msse4.1)
+set(PIXELKILN_KERNEL_FLAGS_avx2 -mavx2)
+
+function(pixelkiln_add_kernels target)
+  foreach(isa IN LISTS PIXELKILN_KERNEL_TARGETS)
+    set(objects ${target}_kernels_${isa})
+    add_library(${objects} OBJECT ${ARGN})
+    target_link_libraries(${objects} PRIVATE pixelkiln_flags)
+    target_include_directories(${objects} PRIVATE ${PROJECT_SOURCE_DIR}/Src ${PROJECT_SOURCE_DIR}/include)
+    target_compile_definitions(${objects} PRIVATE PK_TARGET=${isa} PK_TARGET_HEADER="primitives/simd/${isa}.h")
+    target_compile_options(${objects} PRIVATE ${PIXELKILN_KERNEL_FLAGS_${isa}})
+    target_sources(${target} PRIVATE $<TARGET_OBJECTS:${objects}>)
+  endforeach()
+endfunction()
