@@ -5,11 +5,17 @@
 # Src/primitives/simd/.
 
 set(PIXELKILN_KERNEL_TARGETS plain sse2 ssse3 sse41 avx2)
-set(PIXELKILN_KERNEL_FLAGS_plain "")
+# The plain bodies stay scalar: they are the form to debug, and the one that no vectoriser has touched.
+set(PIXELKILN_KERNEL_FLAGS_plain -fno-tree-vectorize -fno-tree-slp-vectorize)
 set(PIXELKILN_KERNEL_FLAGS_sse2 -msse2)
 set(PIXELKILN_KERNEL_FLAGS_ssse3 -mssse3)
 set(PIXELKILN_KERNEL_FLAGS_sse41 -msse4.1)
 set(PIXELKILN_KERNEL_FLAGS_avx2 -mavx2)
+set(PIXELKILN_KERNEL_HEADER_plain plain)
+set(PIXELKILN_KERNEL_HEADER_sse2 vector128)
+set(PIXELKILN_KERNEL_HEADER_ssse3 vector128)
+set(PIXELKILN_KERNEL_HEADER_sse41 vector128)
+set(PIXELKILN_KERNEL_HEADER_avx2 avx2)
 
 function(pixelkiln_add_kernels target)
   foreach(isa IN LISTS PIXELKILN_KERNEL_TARGETS)
@@ -17,7 +23,8 @@ function(pixelkiln_add_kernels target)
     add_library(${objects} OBJECT ${ARGN})
     target_link_libraries(${objects} PRIVATE pixelkiln_flags)
     target_include_directories(${objects} PRIVATE ${PROJECT_SOURCE_DIR}/Src ${PROJECT_SOURCE_DIR}/include)
-    target_compile_definitions(${objects} PRIVATE PK_TARGET=${isa} PK_TARGET_HEADER="primitives/simd/${isa}.h")
+    target_compile_definitions(${objects} PRIVATE PK_TARGET=${isa} 
+                               PK_TARGET_HEADER="primitives/simd/${PIXELKILN_KERNEL_HEADER_${isa}}.h")
     target_compile_options(${objects} PRIVATE ${PIXELKILN_KERNEL_FLAGS_${isa}})
     target_sources(${target} PRIVATE $<TARGET_OBJECTS:${objects}>)
   endforeach()

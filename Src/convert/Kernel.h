@@ -150,15 +150,25 @@ struct KernelBodies {
 };
 
 // One declaration for each kernel source; the source defines the specialisation of its own target.
-template <Target> KernelBodies OrderBodies();        // Order.kernels.cpp
-template <Target> KernelBodies PremultiplyBodies();  // Premultiply.kernels.cpp
-template <Target> KernelBodies DepthBodies();        // Depth.kernels.cpp
-template <Target> KernelBodies RGBToYUVBodies();     // RGBToYUV.kernels.cpp
-template <Target> KernelBodies YUVToRGBBodies();     // YUVToRGB.kernels.cpp
-template <Target> KernelBodies YUVToYUVBodies();     // YUVToYUV.kernels.cpp
-template <Target> KernelBodies ChromaBodies();       // Chroma.kernels.cpp
-template <Target> KernelBodies TransferBodies();     // Transfer.kernels.cpp
-template <Target> KernelBodies V210Bodies();         // V210.kernels.cpp
-template <Target> KernelBodies RGB10Bodies();        // RGB10.kernels.cpp
+template <Target>
+KernelBodies OrderBodies(); // Order.kernels.cpp
+template <Target>
+KernelBodies PremultiplyBodies(); // Premultiply.kernels.cpp
+template <Target>
+KernelBodies DepthBodies(); // Depth.kernels.cpp
+template <Target>
+KernelBodies RGBToYUVBodies(); // RGBToYUV.kernels.cpp
+template <Target>
+KernelBodies YUVToRGBBodies(); // YUVToRGB.kernels.cpp
+template <Target>
+KernelBodies YUVToYUVBodies(); // YUVToYUV.kernels.cpp
+template <Target>
+KernelBodies ChromaBodies(); // Chroma.kernels.cpp
+template <Target>
+KernelBodies TransferBodies(); // Transfer.kernels.cpp
+template <Target>
+KernelBodies V210Bodies(); // V210.kernels.cpp
+template <Target>
+KernelBodies RGB10Bodies(); // RGB10.kernels.cpp
 
 } // namespace PK

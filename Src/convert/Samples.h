@@ -1,0 +1,19 @@
+#pragma once
+
+// Sample encodings that several kernel sources share: how 8-bit samples expand to float and pack back.
+
+#include "primitives/simd/Target.h"
+
+namespace PK::PK_TARGET {
+
+inline constexpr float kReciprocal255 = 0x1.010102p-8f; // 0x3b808081, 1 / 255 rounded to nearest
+inline constexpr float kReciprocal224 = 0x1.24924ap-8f; // 0x3b924925, 1 / 224
+inline constexpr float kReciprocal219 = 0x1.2b404ap-8f; // 0x3b95a025, 1 / 219
+
+/// Interleaved V, U, Y, A codes to float: chroma about 0, luma and alpha from 0 to 1.
+inline F32 ExpandVUYA(F32 codes) {
+    return (codes - PixelFloats(128, 128, 16, 0)) *
+           PixelFloats(kReciprocal224, kReciprocal224, kReciprocal219, kReciprocal255);
+}
+
+} // namespace PK::PK_TARGET

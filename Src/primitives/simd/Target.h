@@ -1,0 +1,54 @@
+#pragma once
+
+// The vector types of the instruction set that this translation unit is compiled for. Kernel sources include
+// this header, Targets.h, the fixed-width integer and memory headers, and nothing of the standard library: an
+// inline function of the library compiled for AVX2 might be the copy that the linker keeps for all.
+//
+// Every target has the same two types and the same functions on them:
+//
+//   F32, I32                 kLanes lanes of float or 32-bit integer; kLanes is a multiple of four, so that a
+//                            vector holds whole interleaved four-channel float pixels
+//   Floats, Ints             one value in every lane; PixelFloats, PixelInts: four values, repeated
+//   Min, Max                 the first operand where it is less (greater), else the second: NaN yields the
+//   second Nearest, Truncate        to integers, by the current rounding mode or towards zero; out of range
+//   and NaN
+//                            give INT32_MIN
+//   Select(mask, a, b)       a where the mask's bits are set, else b
+//   ...Pixel...              work on each block of four lanes, that is on each interleaved pixel
+//   LoadBytes, StoreBytes    kLanes bytes to and from lanes; stores saturate
+//   LoadChannels, ...        kLanes four-channel pixels to and from four vectors, one a channel
+
+#include "primitives/simd/Targets.h"
+
+#include PK_TARGET_HEADER
+
+namespace PK::PK_TARGET {
+
+inline constexpr Target kTarget = Target::PK_TARGET;
+
+/// Four channels of kLanes pixels, in memory order: B, G, R, A or V, U, Y, A.
+struct Channels {
+    F32 c0, c1, c2, c3;
+};
+
+struct IntChannels {
+    I32 c0, c1, c2, c3;
+};
+
+/// kLanes pixels of four bytes.
+inline IntChannels LoadByteChannels(const void* source) {
+    const I32 pixels = LoadInts(source);
+    const I32 low = Ints(0xff);
+    return {pixels & low, ShiftRight<8>(pixels) & low, ShiftRight<16>(pixels) & low, ShiftRight<24>(pixels)};
+}
+
+inline F32 LoadBytesAsFloats(const void* source) {
+    return ToFloat(LoadBytes(source));
+}
+
+/// Limits x from above, leaving NaN to the conversion that follows, which turns it into INT32_MIN.
+inline F32 AtMost(F32 limit, F32 x) {
+    return Min(limit, x);
+}
+
+} // namespace PK::PK_TARGET

@@ -1,0 +1,261 @@
+#pragma once
+
+// The plain vector types: four lanes in an array, one scalar operation a lane. This is the form that every
+// processor runs and that a debugger can step through; the build keeps the compiler from vectorising it.
+
+#include <cstdint>
+#include <cstring>
+#include <immintrin.h> // conversions by the current rounding mode and the reciprocal estimate, one lane at a time
+
+namespace PK::plain {
+
+inline constexpr int kLanes = 4;
+inline constexpr bool kHasByteShuffle = false;
+
+struct F32 {
+    float lane[kLanes];
+};
+
+struct I32 {
+    uint32_t lane[kLanes];
+};
+
+template <class Result, class Operand, class Operation>
+inline Result Map(Operand a, Operation operation) {
+    Result result;
+    for (int i = 0; i < kLanes; ++i) result.lane[i] = operation(a.lane[i]);
+    return result;
+}
+
+template <class Result, class Operand, class Operation>
+inline Result Map(Operand a, Operand b, Operation operation) {
+    Result result;
+    for (int i = 0; i < kLanes; ++i) result.lane[i] = operation(a.lane[i], b.lane[i]);
+    return result;
+}
+
+inline F32 Floats(float x) {
+    return {{x, x, x, x}};
+}
+inline F32 PixelFloats(float c0, float c1, float c2, float c3) {
+    return {{c0, c1, c2, c3}};
+}
+inline I32 Ints(int32_t x) {
+    const auto bits = static_cast<uint32_t>(x);
+    return {{bits, bits, bits, bits}};
+}
+inline I32 PixelInts(int32_t c0, int32_t c1, int32_t c2, int32_t c3) {
+    return {{static_cast<uint32_t>(c0), static_cast<uint32_t>(c1), static_cast<uint32_t>(c2),
+             static_cast<uint32_t>(c3)}};
+}
+
+template <class Vector>
+inline Vector LoadVector(const void* source) {
+    Vector result;
+    std::memcpy(&result, source, sizeof result);
+    return result;
+}
+inline F32 LoadFloats(const void* source) {
+    return LoadVector<F32>(source);
+}
+inline I32 LoadInts(const void* source) {
+    return LoadVector<I32>(source);
+}
+inline void Store(void* destination, F32 x) {
+    std::memcpy(destination, &x, sizeof x);
+}
+inline void Store(void* destination, I32 x) {
+    std::memcpy(destination, &x, sizeof x);
+}
+
+inline F32 operator+(F32 a, F32 b) {
+    return Map<F32>(a, b, [](float x, float y) { return x + y; });
+}
+inline F32 operator-(F32 a, F32 b) {
+    return Map<F32>(a, b, [](float x, float y) { return x - y; });
+}
+inline F32 operator*(F32 a, F32 b) {
+    return Map<F32>(a, b, [](float x, float y) { return x * y; });
+}
+inline F32 operator/(F32 a, F32 b) {
+    return Map<F32>(a, b, [](float x, float y) { return x / y; });
+}
+inline F32 Min(F32 a, F32 b) {
+    return Map<F32>(a, b, [](float x, float y) { return x < y ? x : y; });
+}
+inline F32 Max(F32 a, F32 b) {
+    return Map<F32>(a, b, [](float x, float y) { return x > y ? x : y; });
+}
+inline F32 ReciprocalEstimate(F32 a) {
+    return Map<F32>(a, [](float x) { return _mm_cvtss_f32(_mm_rcp_ss(_mm_set_ss(x))); });
+}
+
+inline I32 operator+(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x + y; });
+}
+inline I32 operator-(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x - y; });
+}
+inline I32 operator*(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x * y; });
+}
+inline I32 operator&(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x & y; });
+}
+inline I32 operator|(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x | y; });
+}
+inline I32 operator^(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x ^ y; });
+}
+inline I32 Not(I32 a) {
+    return Map<I32>(a, [](uint32_t x) { return ~x; });
+}
+template <int kBits>
+inline I32 ShiftLeft(I32 a) {
+    return Map<I32>(a, [](uint32_t x) { return x << kBits; });
+}
+template <int kBits>
+inline I32 ShiftRight(I32 a) {
+    return Map<I32>(a, [](uint32_t x) { return x >> kBits; });
+}
+template <int kBits>
+inline I32 ShiftRightSigned(I32 a) {
+    return Map<I32>(a, [](uint32_t x) { return static_cast<uint32_t>(static_cast<int32_t>(x) >> kBits); });
+}
+inline I32 Min(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) {
+        return static_cast<int32_t>(x) < static_cast<int32_t>(y) ? x : y;
+    });
+}
+inline I32 Max(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) {
+        return static_cast<int32_t>(x) > static_cast<int32_t>(y) ? x : y;
+    });
+}
+
+/// The low 16 bits of the product of each 16-bit half with its counterpart.
+inline I32 MultiplyHalves(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) {
+        return ((x & 0xffff) * (y & 0xffff) & 0xffff) | ((x >> 16) * (y >> 16) << 16);
+    });
+}
+
+/// All bits set where the comparison holds.
+inline I32 Equal(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) { return x == y ? ~0u : 0u; });
+}
+inline I32 Less(F32 a, F32 b) {
+    return Map<I32>(a, b, [](float x, float y) { return x < y ? ~0u : 0u; });
+}
+inline I32 NotGreater(F32 a, F32 b) {
+    return Map<I32>(a, b, [](float x, float y) { return x <= y ? ~0u : 0u; });
+}
+
+inline I32 Bits(F32 a) {
+    return LoadInts(&a);
+}
+inline F32 FromBits(I32 a) {
+    return LoadFloats(&a);
+}
+inline I32 Select(I32 mask, I32 a, I32 b) {
+    return (a & mask) | (b & Not(mask));
+}
+inline F32 Select(I32 mask, F32 a, F32 b) {
+    return FromBits(Select(mask, Bits(a), Bits(b)));
+}
+
+inline F32 ToFloat(I32 a) {
+    return Map<F32>(a, [](uint32_t x) { return static_cast<float>(static_cast<int32_t>(x)); });
+}
+inline I32 Nearest(F32 a) {
+    return Map<I32>(a, [](float x) { return static_cast<uint32_t>(_mm_cvtss_si32(_mm_set_ss(x))); });
+}
+inline I32 Truncate(F32 a) {
+    return Map<I32>(a, [](float x) { return static_cast<uint32_t>(_mm_cvttss_si32(_mm_set_ss(x))); });
+}
+
+/// table[index] in each lane.
+inline F32 Lookup(const float* table, I32 index) {
+    return Map<F32>(index, [table](uint32_t i) { return table[i]; });
+}
+
+template <class Element>
+inline I32 LoadElements(const void* source) {
+    Element elements[kLanes];
+    std::memcpy(elements, source, sizeof elements);
+    return {{elements[0], elements[1], elements[2], elements[3]}};
+}
+inline I32 LoadBytes(const void* source) {
+    return LoadElements<uint8_t>(source);
+}
+inline I32 LoadWords(const void* source) {
+    return LoadElements<uint16_t>(source);
+}
+
+inline uint32_t Saturate(uint32_t x, int32_t limit) {
+    const auto value = static_cast<int32_t>(x);
+    return static_cast<uint32_t>(value < 0 ? 0 : value > limit ? limit : value);
+}
+inline void StoreBytes(void* destination, I32 a) {
+    uint8_t bytes[kLanes];
+    for (int i = 0; i < kLanes; ++i) bytes[i] = static_cast<uint8_t>(Saturate(a.lane[i], 255));
+    std::memcpy(destination, bytes, sizeof bytes);
+}
+/// The low 16 bits of each lane, unsaturated.
+inline void StoreWords(void* destination, I32 a) {
+    uint16_t words[kLanes];
+    for (int i = 0; i < kLanes; ++i) words[i] = static_cast<uint16_t>(a.lane[i]);
+    std::memcpy(destination, words, sizeof words);
+}
+
+template <int kFirst, int kSecond, int kThird, int kFourth>
+inline I32 ShufflePixel(I32 a) {
+    return {{a.lane[kFirst], a.lane[kSecond], a.lane[kThird], a.lane[kFourth]}};
+}
+template <int kFirst, int kSecond, int kThird, int kFourth>
+inline F32 ShufflePixel(F32 a) {
+    return {{a.lane[kFirst], a.lane[kSecond], a.lane[kThird], a.lane[kFourth]}};
+}
+
+/// Reverses the four bytes of each lane.
+inline I32 ReverseBytes(I32 a) {
+    return Map<I32>(a, [](uint32_t x) { return __builtin_bswap32(x); });
+}
+
+/// Turns four interleaved pixels, one a vector, into four channels of four pixels, and back.
+inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
+    const F32 rows[4] = {a, b, c, d};
+    F32* const columns[4] = {&a, &b, &c, &d};
+    for (int i = 0; i < 4; ++i)
+        for (int j = 0; j < 4; ++j) columns[i]->lane[j] = rows[j].lane[i];
+}
+
+/// Four float vectors of kLanes interleaved pixels to one vector a channel.
+inline void LoadFloatChannels(const void* source, F32& c0, F32& c1, F32& c2, F32& c3) {
+    const auto* pixels = static_cast<const float*>(source);
+    c0 = LoadFloats(pixels);
+    c1 = LoadFloats(pixels + 4);
+    c2 = LoadFloats(pixels + 8);
+    c3 = LoadFloats(pixels + 12);
+    TransposePixels(c0, c1, c2, c3);
+}
+inline void StoreFloatChannels(void* destination, F32 c0, F32 c1, F32 c2, F32 c3) {
+    auto* pixels = static_cast<float*>(destination);
+    TransposePixels(c0, c1, c2, c3);
+    Store(pixels, c0);
+    Store(pixels + 4, c1);
+    Store(pixels + 8, c2);
+    Store(pixels + 12, c3);
+}
+
+/// Saturates each channel to a byte and interleaves them into kLanes four-byte pixels.
+inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
+    I32 pixels;
+    for (int i = 0; i < kLanes; ++i)
+        pixels.lane[i] = Saturate(c0.lane[i], 255) | Saturate(c1.lane[i], 255) << 8 |
+                         Saturate(c2.lane[i], 255) << 16 | Saturate(c3.lane[i], 255) << 24;
+    return pixels;
+}
+
+} // namespace PK::plain

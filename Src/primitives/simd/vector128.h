@@ -1,0 +1,253 @@
+#pragma once
+
+// The vector types of 128 bits, for SSE2, SSSE3 and SSE4.1: the same text, with the shorter instruction
+// sequences where the target has them.
+
+#include <cstdint>
+#include <cstring>
+#include <immintrin.h>
+
+namespace PK::PK_TARGET {
+
+inline constexpr int kLanes = 4;
+#ifdef __SSSE3__
+inline constexpr bool kHasByteShuffle = true;
+#else
+inline constexpr bool kHasByteShuffle = false;
+#endif
+
+struct F32 {
+    __m128 v;
+};
+
+struct I32 {
+    __m128i v;
+};
+
+inline F32 Floats(float x) {
+    return {_mm_set1_ps(x)};
+}
+inline F32 PixelFloats(float c0, float c1, float c2, float c3) {
+    return {_mm_setr_ps(c0, c1, c2, c3)};
+}
+inline I32 Ints(int32_t x) {
+    return {_mm_set1_epi32(x)};
+}
+inline I32 PixelInts(int32_t c0, int32_t c1, int32_t c2, int32_t c3) {
+    return {_mm_setr_epi32(c0, c1, c2, c3)};
+}
+
+inline F32 LoadFloats(const void* source) {
+    return {_mm_loadu_ps(static_cast<const float*>(source))};
+}
+inline I32 LoadInts(const void* source) {
+    return {_mm_loadu_si128(static_cast<const __m128i*>(source))};
+}
+inline void Store(void* destination, F32 x) {
+    _mm_storeu_ps(static_cast<float*>(destination), x.v);
+}
+inline void Store(void* destination, I32 x) {
+    _mm_storeu_si128(static_cast<__m128i*>(destination), x.v);
+}
+
+inline F32 operator+(F32 a, F32 b) {
+    return {_mm_add_ps(a.v, b.v)};
+}
+inline F32 operator-(F32 a, F32 b) {
+    return {_mm_sub_ps(a.v, b.v)};
+}
+inline F32 operator*(F32 a, F32 b) {
+    return {_mm_mul_ps(a.v, b.v)};
+}
+inline F32 operator/(F32 a, F32 b) {
+    return {_mm_div_ps(a.v, b.v)};
+}
+inline F32 Min(F32 a, F32 b) {
+    return {_mm_min_ps(a.v, b.v)};
+}
+inline F32 Max(F32 a, F32 b) {
+    return {_mm_max_ps(a.v, b.v)};
+}
+inline F32 ReciprocalEstimate(F32 a) {
+    return {_mm_rcp_ps(a.v)};
+}
+
+inline I32 operator+(I32 a, I32 b) {
+    return {_mm_add_epi32(a.v, b.v)};
+}
+inline I32 operator-(I32 a, I32 b) {
+    return {_mm_sub_epi32(a.v, b.v)};
+}
+inline I32 operator&(I32 a, I32 b) {
+    return {_mm_and_si128(a.v, b.v)};
+}
+inline I32 operator|(I32 a, I32 b) {
+    return {_mm_or_si128(a.v, b.v)};
+}
+inline I32 operator^(I32 a, I32 b) {
+    return {_mm_xor_si128(a.v, b.v)};
+}
+inline I32 Not(I32 a) {
+    return {_mm_xor_si128(a.v, _mm_set1_epi32(-1))};
+}
+template <int kBits>
+inline I32 ShiftLeft(I32 a) {
+    return {_mm_slli_epi32(a.v, kBits)};
+}
+template <int kBits>
+inline I32 ShiftRight(I32 a) {
+    return {_mm_srli_epi32(a.v, kBits)};
+}
+template <int kBits>
+inline I32 ShiftRightSigned(I32 a) {
+    return {_mm_srai_epi32(a.v, kBits)};
+}
+inline I32 operator*(I32 a, I32 b) {
+#ifdef __SSE4_1__
+    return {_mm_mullo_epi32(a.v, b.v)};
+#else
+    const __m128i even = _mm_mul_epu32(a.v, b.v);
+    const __m128i odd = _mm_mul_epu32(_mm_srli_epi64(a.v, 32), _mm_srli_epi64(b.v, 32));
+    return {_mm_unpacklo_epi32(_mm_shuffle_epi32(even, _MM_SHUFFLE(0, 0, 2, 0)),
+                               _mm_shuffle_epi32(odd, _MM_SHUFFLE(0, 0, 2, 0)))};
+#endif
+}
+/// The low 16 bits of the product of each 16-bit half with its counterpart.
+inline I32 MultiplyHalves(I32 a, I32 b) {
+    return {_mm_mullo_epi16(a.v, b.v)};
+}
+
+/// All bits set where the comparison holds.
+inline I32 Equal(I32 a, I32 b) {
+    return {_mm_cmpeq_epi32(a.v, b.v)};
+}
+inline I32 Less(F32 a, F32 b) {
+    return {_mm_castps_si128(_mm_cmplt_ps(a.v, b.v))};
+}
+inline I32 NotGreater(F32 a, F32 b) {
+    return {_mm_castps_si128(_mm_cmple_ps(a.v, b.v))};
+}
+
+inline I32 Bits(F32 a) {
+    return {_mm_castps_si128(a.v)};
+}
+inline F32 FromBits(I32 a) {
+    return {_mm_castsi128_ps(a.v)};
+}
+inline I32 Select(I32 mask, I32 a, I32 b) {
+    return {_mm_or_si128(_mm_and_si128(mask.v, a.v), _mm_andnot_si128(mask.v, b.v))};
+}
+inline F32 Select(I32 mask, F32 a, F32 b) {
+    return FromBits(Select(mask, Bits(a), Bits(b)));
+}
+
+inline I32 Min(I32 a, I32 b) {
+#ifdef __SSE4_1__
+    return {_mm_min_epi32(a.v, b.v)};
+#else
+    return Select(I32{_mm_cmplt_epi32(a.v, b.v)}, a, b);
+#endif
+}
+inline I32 Max(I32 a, I32 b) {
+#ifdef __SSE4_1__
+    return {_mm_max_epi32(a.v, b.v)};
+#else
+    return Select(I32{_mm_cmpgt_epi32(a.v, b.v)}, a, b);
+#endif
+}
+
+inline F32 ToFloat(I32 a) {
+    return {_mm_cvtepi32_ps(a.v)};
+}
+inline I32 Nearest(F32 a) {
+    return {_mm_cvtps_epi32(a.v)};
+}
+inline I32 Truncate(F32 a) {
+    return {_mm_cvttps_epi32(a.v)};
+}
+
+/// table[index] in each lane.
+inline F32 Lookup(const float* table, I32 index) {
+    int32_t i[kLanes];
+    Store(i, index);
+    return {_mm_setr_ps(table[i[0]], table[i[1]], table[i[2]], table[i[3]])};
+}
+
+inline I32 LoadBytes(const void* source) {
+    int32_t bytes;
+    std::memcpy(&bytes, source, sizeof bytes);
+    const __m128i zero = _mm_setzero_si128();
+    return {_mm_unpacklo_epi16(_mm_unpacklo_epi8(_mm_cvtsi32_si128(bytes), zero), zero)};
+}
+inline I32 LoadWords(const void* source) {
+    return {_mm_unpacklo_epi16(_mm_loadl_epi64(static_cast<const __m128i*>(source)), _mm_setzero_si128())};
+}
+inline void StoreBytes(void* destination, I32 a) {
+    const __m128i words = _mm_packs_epi32(a.v, a.v);
+    const int32_t bytes = _mm_cvtsi128_si32(_mm_packus_epi16(words, words));
+    std::memcpy(destination, &bytes, sizeof bytes);
+}
+/// The low 16 bits of each lane, unsaturated.
+inline void StoreWords(void* destination, I32 a) {
+    // Sign-extending the low half first makes the saturating pack exact.
+    const __m128i low = _mm_srai_epi32(_mm_slli_epi32(a.v, 16), 16);
+    _mm_storel_epi64(static_cast<__m128i*>(destination), _mm_packs_epi32(low, low));
+}
+
+template <int kFirst, int kSecond, int kThird, int kFourth>
+inline I32 ShufflePixel(I32 a) {
+    return {_mm_shuffle_epi32(a.v, _MM_SHUFFLE(kFourth, kThird, kSecond, kFirst))};
+}
+template <int kFirst, int kSecond, int kThird, int kFourth>
+inline F32 ShufflePixel(F32 a) {
+    return {_mm_shuffle_ps(a.v, a.v, _MM_SHUFFLE(kFourth, kThird, kSecond, kFirst))};
+}
+
+/// Reverses the four bytes of each lane.
+inline I32 ReverseBytes(I32 a) {
+#ifdef __SSSE3__
+    return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(3, 2, 1, 0, 7, 6, 5, 4, 11, 10, 9, 8, 15, 14, 13, 12))};
+#else
+    const __m128i swapped = _mm_or_si128(_mm_slli_epi16(a.v, 8), _mm_srli_epi16(a.v, 8));
+    return {_mm_or_si128(_mm_slli_epi32(swapped, 16), _mm_srli_epi32(swapped, 16))};
+#endif
+}
+
+/// Turns four interleaved pixels, one a vector, into four channels of four pixels, and back.
+inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
+    _MM_TRANSPOSE4_PS(a.v, b.v, c.v, d.v);
+}
+
+/// Four float vectors of kLanes interleaved pixels to one vector a channel.
+inline void LoadFloatChannels(const void* source, F32& c0, F32& c1, F32& c2, F32& c3) {
+    const auto* pixels = static_cast<const float*>(source);
+    c0 = LoadFloats(pixels);
+    c1 = LoadFloats(pixels + 4);
+    c2 = LoadFloats(pixels + 8);
+    c3 = LoadFloats(pixels + 12);
+    TransposePixels(c0, c1, c2, c3);
+}
+inline void StoreFloatChannels(void* destination, F32 c0, F32 c1, F32 c2, F32 c3) {
+    auto* pixels = static_cast<float*>(destination);
+    TransposePixels(c0, c1, c2, c3);
+    Store(pixels, c0);
+    Store(pixels + 4, c1);
+    Store(pixels + 8, c2);
+    Store(pixels + 12, c3);
+}
+
+/// Saturates each channel to a byte and interleaves them into kLanes four-byte pixels.
+inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
+#ifdef __SSSE3__
+    const __m128i planes = _mm_packus_epi16(_mm_packs_epi32(c0.v, c1.v), _mm_packs_epi32(c2.v, c3.v));
+    return {_mm_shuffle_epi8(planes, _mm_setr_epi8(0, 4, 8, 12, 1, 5, 9, 13, 2, 6, 10, 14, 3, 7, 11, 15))};
+#else
+    const __m128i even = _mm_packs_epi32(c0.v, c2.v);
+    const __m128i odd = _mm_packs_epi32(c1.v, c3.v);
+    const __m128i first = _mm_unpacklo_epi16(even, odd);  // c0 c1 of each pixel
+    const __m128i second = _mm_unpackhi_epi16(even, odd); // c2 c3 of each pixel
+    return {_mm_packus_epi16(_mm_unpacklo_epi32(first, second), _mm_unpackhi_epi32(first, second))};
+#endif
+}
+
+} // namespace PK::PK_TARGET
