@@ -1,0 +1,88 @@
+#pragma once
+
+// The fields of a pixel format and the questions that the rest of the library asks of them.
+
+#include <PixelKiln/Types.h>
+
+namespace PK {
+
+inline constexpr uint32_t kModelMask = 0x00000001;
+inline constexpr uint32_t kModelRGB = 0;
+inline constexpr uint32_t kModelYUV = 0x1;
+
+inline constexpr uint32_t kLightMask = 0x00000002;
+inline constexpr uint32_t kLightGamma = 0;
+inline constexpr uint32_t kLightLinear = 0x2;
+
+inline constexpr uint32_t kAlphaMask = 0x0000000c;
+inline constexpr uint32_t kAlphaNone = 0;
+inline constexpr uint32_t kAlphaStraight = 0x4;
+inline constexpr uint32_t kAlphaPremultiplied = 0x8;
+inline constexpr uint32_t kAlphaMeaningless = 0xc;
+
+inline constexpr uint32_t kStructureMask = 0x00000030;
+inline constexpr uint32_t kStructure444 = 0;
+inline constexpr uint32_t kStructure422 = 0x10;
+inline constexpr uint32_t kStructureDV = 0x20;
+inline constexpr uint32_t kStructure420 = 0x30;
+
+inline constexpr uint32_t kDepthMask = 0x000001c0;
+inline constexpr uint32_t kDepth8u = 0;
+inline constexpr uint32_t kDepth10u = 0x40;
+inline constexpr uint32_t kDepth15u = 0x80;
+inline constexpr uint32_t kDepth32f = 0x100;
+
+inline constexpr uint32_t kMatrixMask = 0x00000600; // Any value but kMatrix601 counts as not 601.
+inline constexpr uint32_t kMatrix601 = 0;
+inline constexpr uint32_t kMatrix709 = 0x200;
+
+inline constexpr uint32_t kRangeMask = 0x00000800;
+inline constexpr uint32_t kRangeFull = 0;
+inline constexpr uint32_t kRangeVideo = 0x800;
+
+inline constexpr uint32_t kOrderMask = 0x00001000;
+inline constexpr uint32_t kOrderBGRA = 0;      // or UYVY
+inline constexpr uint32_t kOrderARGB = 0x1000; // or YUYV
+
+inline constexpr uint32_t kStreamMask = 0xff000000;
+inline constexpr uint32_t kStreamShift = 24;
+inline constexpr uint32_t kStreamLastDV = 8;
+inline constexpr uint32_t kStreamFirst420 = 9;
+inline constexpr uint32_t kStreamLast420 = 12;
+
+constexpr uint32_t StreamKind(PK_PixelFormat format) {
+    return format >> kStreamShift;
+}
+
+constexpr bool IsYUV(PK_PixelFormat format) {
+    return (format & kModelMask) == kModelYUV;
+}
+
+/// A plain interleaved layout of four channels.
+constexpr bool IsPacked4444(PK_PixelFormat format) {
+    return (format & kStructureMask) == kStructure444 && (format & kAlphaMask) != kAlphaNone;
+}
+
+constexpr bool Is422(PK_PixelFormat format) {
+    return (format & kStructureMask) == kStructure422;
+}
+
+constexpr bool IsStream(PK_PixelFormat format) {
+    return (format & kStreamMask) != 0;
+}
+
+constexpr bool Is420Planar(PK_PixelFormat format) {
+    return IsYUV(format) && StreamKind(format) >= kStreamFirst420 && StreamKind(format) <= kStreamLast420 &&
+           (format & kStructureMask) == kStructure420;
+}
+
+constexpr bool IsV210(PK_PixelFormat format) {
+    return (format & ~kMatrix709) == 0x851;
+}
+
+/// The alpha channel is missing or tells nothing.
+constexpr bool HasNoAlphaMeaning(PK_PixelFormat format) {
+    return (format & kAlphaMask) == kAlphaNone || (format & kAlphaMask) == kAlphaMeaningless;
+}
+
+} // namespace PK

@@ -1,0 +1,42 @@
+#pragma once
+
+/// \file
+/// Start and stop of the library, processor capabilities and debug switches.
+///
+/// PK_Initialize, PK_Terminate and PK_SetDebugFlag take no lock: call them from one thread at a time, and not
+/// while another operation runs. The three queries may be called from any thread.
+
+#include <PixelKiln/Types.h>
+
+extern "C" {
+
+/// Starts the library. Calls nest: only the one that brings the count of open calls to 1 does any work, which
+/// is to detect the processor (this sets capability flags and never clears any), to read the host's settings
+/// "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), and to start the
+/// primitives. Every call wants a matching PK_Terminate.
+/// \return always PK_Success.
+PK_API PK_Result PK_Initialize(void) noexcept;
+
+/// Takes back one PK_Initialize; the last one stops the library. Capability flags stay as they are. A call
+/// without an open PK_Initialize counts below 0, and the next PK_Initialize then only makes good for it.
+/// \return always PK_Success.
+PK_API PK_Result PK_Terminate(void) noexcept;
+
+/// Sets one of the numbered switches. A capability that the processor lacks can be switched on; nothing
+/// guards against that. \param which  0 blur of motion in linear light; 2 SSE, 3 SSE2, 4 SSE3, 5 SSSE3, 6
+/// SSE4.1, 7 SSE4.2, 8 AVX,
+///               9 AVX2; 10 every format has its origin at the top left. 1 and all above 10 are ignored.
+/// \param value  0 is off, anything else on.
+/// \return always PK_Success.
+PK_API PK_Result PK_SetDebugFlag(uint32_t which, int32_t value) noexcept;
+
+/// Whether SSE4.1 code is used, as the flag stands now: after detection, settings and switches.
+PK_API bool PK_hasSSE4(void) noexcept;
+
+/// Whether AVX counts as present, as the flag stands now: after detection, settings and switches.
+PK_API bool PK_hasAVX(void) noexcept;
+
+/// Whether AVX2 code is used, as the flag stands now: after detection, settings and switches.
+PK_API bool PK_hasAVX2(void) noexcept;
+
+} // extern "C"

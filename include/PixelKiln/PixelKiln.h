@@ -1,0 +1,9 @@
+#pragma once
+
+/// \file
+/// The whole exported interface.
+
+#include <PixelKiln/Buffers.h>
+#include <PixelKiln/Lifecycle.h>
+#include <PixelKiln/PixelFormat.h>
+#include <PixelKiln/Types.h>
