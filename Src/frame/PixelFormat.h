@@ -85,4 +85,16 @@ constexpr bool HasNoAlphaMeaning(PK_PixelFormat format) {
     return (format & kAlphaMask) == kAlphaNone || (format & kAlphaMask) == kAlphaMeaningless;
 }
 
+/// Bytes of a pixel of an interleaved format, 0 for an unknown depth and for 10-bit YUV.
+int32_t BytesPerPixel(PK_PixelFormat format) noexcept;
+
+/// How a raster row is laid out: groups of pixels, then padding to a multiple of the alignment.
+struct RowLayout {
+    int32_t groupPixels;
+    int32_t groupBytes;
+    int32_t alignment;
+};
+
+RowLayout LayoutOfRow(PK_PixelFormat format) noexcept;
+
 } // namespace PK

@@ -1,0 +1,31 @@
+// Start and stop of the library.
+
+#include "frame/Capabilities.h"
+#include "frame/PrimitivesStart.h"
+#include "frame/Wrap32.h"
+
+#include <PixelKiln/Lifecycle.h>
+
+namespace PK {
+namespace {
+
+// Calls of PK_Initialize not yet matched by PK_Terminate; below 0 after a stop too many.
+int32_t sNestingCount = 0;
+
+} // namespace
+} // namespace PK
+
+PK_Result PK_Initialize(void) noexcept {
+    using namespace PK;
+    sNestingCount = WrapAdd(sNestingCount, 1);
+    if (sNestingCount != 1) return PK_Success;
+    DetectProcessor();
+    StartPrimitives();
+    return PK_Success;
+}
+
+PK_Result PK_Terminate(void) noexcept {
+    using namespace PK;
+    sNestingCount = WrapAdd(sNestingCount, -1);
+    return PK_Success;
+}

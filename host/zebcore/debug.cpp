@@ -1,0 +1,110 @@
+// Bundled settings and trace of the host.
+
+#include "zebcore/debug.h"
+
+#include <atomic>
+#include <cstdio>
+#include <fcntl.h>
+#include <string_view>
+#include <unistd.h>
+
+namespace zebcore::debug {
+namespace {
+
+// One, not zero: a site whose kept count is still zero asks for its first answer.
+std::atomic<uint32_t> sTraceChanges{1};
+std::atomic<TraceSink> sTraceSink{nullptr};
+
+struct TraceLevels {
+    std::mutex mutex;
+    std::map<std::string, int32_t, std::less<>> highest;
+};
+
+TraceLevels& Levels() {
+    static TraceLevels levels;
+    return levels;
+}
+
+} // namespace
+
+DebugDatabase& DebugDatabase::Instance() {
+    static DebugDatabase database;
+    return database;
+}
+
+std::string DebugDatabase::GetEntry(const std::string& name, const std::string& defaultText) const {
+    const std::lock_guard lock(fMutex);
+    const auto entry = fEntries.find(name);
+    return entry == fEntries.end() ? defaultText : entry->second;
+}
+
+void DebugDatabase::SetEntry(const std::string& name, const std::string& text) {
+    const std::lock_guard lock(fMutex);
+    fEntries[name] = text;
+}
+
+void DebugDatabase::RemoveEntry(const std::string& name) {
+    const std::lock_guard lock(fMutex);
+    fEntries.erase(name);
+}
+
+uint32_t TraceChangeCount() noexcept {
+    return sTraceChanges;
+}
+
+bool TraceEnabled(const char* channel, int32_t level, bool enabledByDefault) {
+    TraceLevels& levels = Levels();
+    const std::lock_guard lock(levels.mutex);
+    const auto entry = levels.highest.find(std::string_view(channel));
+    return entry == levels.highest.end() ? enabledByDefault : level <= entry->second;
+}
+
+void SetTraceLevel(const char* channel, int32_t highestLevel) {
+    TraceLevels& levels = Levels();
+    const std::lock_guard lock(levels.mutex);
+    levels.highest[channel] = highestLevel;
+    ++sTraceChanges;
+}
+
+void ClearTraceLevel(const char* channel) {
+    TraceLevels& levels = Levels();
+    const std::lock_guard lock(levels.mutex);
+    levels.highest.erase(channel);
+    ++sTraceChanges;
+}
+
+void SetTraceSink(TraceSink sink) noexcept {
+    sTraceSink = sink;
+}
+
+void Trace(const std::string& text) {
+    if (const TraceSink sink = sTraceSink)
+        sink(text.c_str());
+    else
+        std::fputs(text.c_str(), stderr);
+}
+
+// There is no dialog here: the violation is traced, and a debugger that is there is worth stopping in.
+bool BreakAfterContractDialog(const char* expression, const char* sourcePath, const char* function,
+                              int32_t line) {
+    Trace(std::string(sourcePath) + ":" + std::to_string(line) + ": " + function +
+          ": contract violated: " + expression + "\n");
+    return true;
+}
+
+// The kernel tells the tracing process, or 0, in a line of the process status.
+bool IsDebuggerAttached() noexcept {
+    const int file = open("/proc/self/status", O_RDONLY | O_CLOEXEC);
+    if (file < 0) return false;
+    char text[4096];
+    const ssize_t length = read(file, text, sizeof text);
+    close(file);
+    if (length <= 0) return false;
+    constexpr std::string_view kLabel = "TracerPid:\t";
+    const std::string_view status(text, static_cast<size_t>(length));
+    const size_t at = status.find(kLabel);
+    if (at == std::string_view::npos || at + kLabel.size() >= status.size()) return false;
+    return status[at + kLabel.size()] != '0';
+}
+
+} // namespace zebcore::debug
