@@ -9,6 +9,7 @@
 #include <PixelKiln/PixelFormat.h>
 
 #include <array>
+#include <cstddef>
 
 namespace PK {
 namespace {
@@ -171,7 +172,7 @@ void Enter(BodyTable& table) {
           RGBToYUVBodies<kTarget>(), YUVToRGBBodies<kTarget>(), YUVToYUVBodies<kTarget>(),
           ChromaBodies<kTarget>(), TransferBodies<kTarget>(), V210Bodies<kTarget>(), RGB10Bodies<kTarget>()})
         for (int32_t i = 0; i < bodies.count; ++i)
-            table[static_cast<size_t>(bodies.first[i].kernel)][static_cast<size_t>(kTarget)] =
+            table[static_cast<std::size_t>(bodies.first[i].kernel)][static_cast<std::size_t>(kTarget)] =
                 bodies.first[i].run;
 }
 
@@ -183,31 +184,31 @@ BodyTable MakeBodyTable() {
     Enter<Target::sse41>(table);
     Enter<Target::avx2>(table);
     for (const KernelBody& copy : kCopyBodies)
-        table[static_cast<size_t>(copy.kernel)][static_cast<size_t>(Target::plain)] = copy.run;
+        table[static_cast<std::size_t>(copy.kernel)][static_cast<std::size_t>(Target::plain)] = copy.run;
     return table;
 }
 
 } // namespace
 
 const KernelInfo& Info(Kernel kernel) noexcept {
-    return kRegister[static_cast<size_t>(kernel)];
+    return kRegister[static_cast<std::size_t>(kernel)];
 }
 
 const char* TargetName(Target target) noexcept {
     constexpr const char* names[kTargetCount] = {"plain", "SSE2", "SSSE3", "SSE4.1", "AVX2"};
-    return names[static_cast<size_t>(target)];
+    return names[static_cast<std::size_t>(target)];
 }
 
 bool IsEnabled(Target target) noexcept {
     const uint8_t flags[kTargetCount] = {1, sCPUHasSSE2, sCPUHasSSSE3, sCPUHasSSE4, sCPUHasAVX2};
-    for (size_t i = 0; i <= static_cast<size_t>(target); ++i)
+    for (std::size_t i = 0; i <= static_cast<std::size_t>(target); ++i)
         if (!flags[i]) return false;
     return true;
 }
 
 RowKernel Body(Kernel kernel, Target target) noexcept {
     static const BodyTable table = MakeBodyTable();
-    return table[static_cast<size_t>(kernel)][static_cast<size_t>(target)];
+    return table[static_cast<std::size_t>(kernel)][static_cast<std::size_t>(target)];
 }
 
 bool ChooseTarget(Kernel kernel, Target& target) noexcept {

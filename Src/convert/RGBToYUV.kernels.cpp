@@ -3,7 +3,8 @@
 #include "convert/Kernel.h"
 #include "convert/RowGroups.h"
 
-template <> PK::KernelBodies PK::RGBToYUVBodies<PK::PK_TARGET::kTarget>() {
+template <>
+PK::KernelBodies PK::RGBToYUVBodies<PK::PK_TARGET::kTarget>() {
     static constexpr KernelBody bodies[] = {{Kernel::RGBToYUV601Row, nullptr}};
     return bodies;
 }

@@ -3,7 +3,8 @@
 #include "convert/Kernel.h"
 #include "convert/RowGroups.h"
 
-template <> PK::KernelBodies PK::YUVToYUVBodies<PK::PK_TARGET::kTarget>() {
+template <>
+PK::KernelBodies PK::YUVToYUVBodies<PK::PK_TARGET::kTarget>() {
     static constexpr KernelBody bodies[] = {{Kernel::YUV601To709Row, nullptr}};
     return bodies;
 }
