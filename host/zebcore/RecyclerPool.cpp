@@ -15,7 +15,7 @@ uint64_t RecyclerPool::SizeOfClass(size_t index) noexcept {
 // The smallest class that holds size bytes; size is at most kLargest.
 size_t RecyclerPool::ClassIndex(uint64_t size) noexcept {
     if (size <= kSmallest) return 0;
-    const int doubling = std::bit_width(size - 1) - 1 - kSmallestBits;
+    const int doubling = static_cast<int>(std::bit_width(size - 1)) - 1 - kSmallestBits;
     const int stepShift = doubling + kSmallestBits - kStepBits;
     const uint64_t stepsAbove = ((size - 1) >> stepShift) - (uint64_t{1} << kStepBits) + 1;
     return (static_cast<size_t>(doubling) << kStepBits) + static_cast<size_t>(stepsAbove);

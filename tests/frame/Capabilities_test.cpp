@@ -1,0 +1,133 @@
+// What the processor's report sets, and what settings take away.
+
+#include "frame/Capabilities.h"
+
+#include "support/FlagScope.h"
+
+#include "zebcore/debug.h"
+
+#include <gtest/gtest.h>
+
+using namespace PK;
+using PKTest::FlagScope;
+using zebcore::debug::DebugDatabase;
+
+namespace {
+
+constexpr uint32_t kSignature = 0x000306c3;
+constexpr uint32_t kAVXAndOSXSAVE = 0x18000000;
+
+class Capabilities : public testing::Test {
+protected:
+    Capabilities() { FlagScope::ClearAll(); }
+    ~Capabilities() override {
+        DebugDatabase::Instance().RemoveEntry("PK.disableAVX");
+        DebugDatabase::Instance().RemoveEntry("PK.disableAVX2");
+    }
+
+private:
+    FlagScope fFlags;
+};
+
+} // namespace
+
+TEST_F(Capabilities, EachBitSetsItsFlagAndNoOther) {
+    struct {
+        ProcessorReport report;
+        uint8_t* flag;
+    } const cases[] = {
+        {{kSignature, 0, 1u << 25, 0, 0}, &sCPUHasSSE},
+        {{kSignature, 0, 1u << 26, 0, 0}, &sCPUHasSSE2},
+        {{kSignature, 1u << 0, 0, 0, 0}, &sCPUHasSSE3},
+        {{kSignature, 1u << 9, 0, 0, 0}, &sCPUHasSSSE3},
+        {{kSignature, 1u << 19, 0, 0, 0}, &sCPUHasSSE4},
+        {{kSignature, 1u << 20, 0, 0, 0}, &sCPUHasSSE42},
+        {{kSignature, kAVXAndOSXSAVE, 0, 0, 6}, &sCPUHasAVX},
+    };
+    for (const auto& single : cases) {
+        FlagScope::ClearAll();
+        SetCapabilities(single.report);
+        for (const uint8_t* flag : PKTest::AllFlags()) EXPECT_EQ(*flag, flag == single.flag ? 1 : 0);
+    }
+}
+
+TEST_F(Capabilities, AVXNeedsTheProcessorAndTheSystem) {
+    const ProcessorReport lacking[] = {
+        {kSignature, 0x10000000, 0, 0x20, 6},     // no XGETBV
+        {kSignature, 0x08000000, 0, 0x20, 6},     // no AVX
+        {kSignature, kAVXAndOSXSAVE, 0, 0x20, 2}, // YMM not saved
+        {kSignature, kAVXAndOSXSAVE, 0, 0x20, 4}, // XMM not saved
+    };
+    for (const ProcessorReport& report : lacking) {
+        SetCapabilities(report);
+        EXPECT_EQ(sCPUHasAVX, 0);
+        EXPECT_EQ(sCPUHasAVX2, 0);
+    }
+    SetCapabilities({kSignature, kAVXAndOSXSAVE, 0, 0x20, 0xe7});
+    EXPECT_EQ(sCPUHasAVX, 1);
+    EXPECT_EQ(sCPUHasAVX2, 1);
+}
+
+TEST_F(Capabilities, AVX2IsAskedForByTheSignature) {
+    SetCapabilities({6, kAVXAndOSXSAVE, 0, 0x20, 6});
+    EXPECT_EQ(sCPUHasAVX, 1);
+    EXPECT_EQ(sCPUHasAVX2, 0);
+    SetCapabilities({7, kAVXAndOSXSAVE, 0, 0x20, 6});
+    EXPECT_EQ(sCPUHasAVX2, 1);
+}
+
+TEST_F(Capabilities, DetectionClearsNothing) {
+    for (uint8_t* flag : PKTest::AllFlags()) *flag = 1;
+    SetCapabilities({});
+    for (const uint8_t* flag : PKTest::AllFlags()) EXPECT_EQ(*flag, 1);
+}
+
+TEST_F(Capabilities, DetectionAgreesWithTheCompiler) {
+    DetectProcessor();
+    EXPECT_EQ(sCPUHasSSE, 1);
+    EXPECT_EQ(sCPUHasSSE2, 1);
+    EXPECT_EQ(sCPUHasSSE3 != 0, __builtin_cpu_supports("sse3") != 0);
+    EXPECT_EQ(sCPUHasSSSE3 != 0, __builtin_cpu_supports("ssse3") != 0);
+    EXPECT_EQ(sCPUHasSSE4 != 0, __builtin_cpu_supports("sse4.1") != 0);
+    EXPECT_EQ(sCPUHasSSE42 != 0, __builtin_cpu_supports("sse4.2") != 0);
+    EXPECT_EQ(sCPUHasAVX != 0, __builtin_cpu_supports("avx") != 0);
+    EXPECT_EQ(sCPUHasAVX2 != 0, __builtin_cpu_supports("avx2") != 0);
+}
+
+TEST_F(Capabilities, EachSettingTakesItsFlagOnly) {
+    sCPUHasAVX = sCPUHasAVX2 = 1;
+    DebugDatabase::Instance().SetEntry("PK.disableAVX", "true");
+    ApplyCapabilitySettings();
+    EXPECT_EQ(sCPUHasAVX, 0);
+    EXPECT_EQ(sCPUHasAVX2, 1);
+
+    sCPUHasAVX = 1;
+    DebugDatabase::Instance().RemoveEntry("PK.disableAVX");
+    DebugDatabase::Instance().SetEntry("PK.disableAVX2", "true");
+    ApplyCapabilitySettings();
+    EXPECT_EQ(sCPUHasAVX, 1);
+    EXPECT_EQ(sCPUHasAVX2, 0);
+}
+
+TEST_F(Capabilities, OnlyExactlyTrueCounts) {
+    sCPUHasAVX = sCPUHasAVX2 = 1;
+    for (const char* text : {"", "false", "True", "TRUE", "1", "true ", " true", "yes"}) {
+        DebugDatabase::Instance().SetEntry("PK.disableAVX", text);
+        DebugDatabase::Instance().SetEntry("PK.disableAVX2", text);
+        ApplyCapabilitySettings();
+        EXPECT_EQ(sCPUHasAVX, 1) << text;
+        EXPECT_EQ(sCPUHasAVX2, 1) << text;
+    }
+}
+
+TEST_F(Capabilities, TheCacheIsFoundBeforeTheSettingsAreRead) {
+    DebugDatabase::Instance().SetEntry("PK.disableAVX", "true");
+    DebugDatabase::Instance().SetEntry("PK.disableAVX2", "true");
+    sCPUHasAVX = 1; // so that the default of the cache, if it comes to that, is the one of AVX
+    sLargestCacheBytes = 0;
+    DetectProcessor();
+    EXPECT_EQ(sCPUHasAVX, 0);
+    EXPECT_EQ(sCPUHasAVX2, 0);
+    EXPECT_GE(sLargestCacheLevel, 2);
+    EXPECT_GT(LargestCacheBytes(), 0u);
+}

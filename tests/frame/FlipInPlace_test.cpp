@@ -1,0 +1,82 @@
+// PK_FlipInPlace swaps the pixels of rows and nothing else.
+
+#include "support/GuardedRows.h"
+#include "support/Random.h"
+
+#include <PixelKiln/Buffers.h>
+
+#include <algorithm>
+#include <gtest/gtest.h>
+#include <vector>
+
+using namespace PKTest;
+
+namespace {
+
+struct Image {
+    PK_PixelFormat format;
+    int32_t width;
+    int32_t height;
+    int32_t padding; // bytes between the pixels of one row and the next
+    int32_t pixelBytes;
+};
+
+// Flips with rows in either direction and compares with a copy that was turned row by row.
+void CheckFlip(const Image& image, bool upwards) {
+    SCOPED_TRACE(testing::Message() << PK_PixelFormatName(image.format) << " " << image.width << "x"
+                                    << image.height << " padding " << image.padding << " upwards "
+                                    << upwards);
+    Random random(3);
+    const size_t step = static_cast<size_t>(image.pixelBytes + image.padding);
+    const size_t rows = static_cast<size_t>(image.height);
+    const GuardedRows memory(step * rows - static_cast<size_t>(image.padding), Guard::kAfter);
+    random.Fill(memory.Bytes(), memory.Size());
+    std::vector<uint8_t> expected(memory.Bytes(), memory.Bytes() + memory.Size());
+    for (size_t row = 0; row < rows; ++row)
+        std::copy_n(memory.Bytes() + row * step, image.pixelBytes, expected.data() + (rows - 1 - row) * step);
+
+    uint8_t* first = memory.Bytes() + (upwards ? step * (rows - 1) : 0);
+    const int32_t rowBytes = upwards ? -static_cast<int32_t>(step) : static_cast<int32_t>(step);
+    ASSERT_EQ(PK_FlipInPlace(first, rowBytes, image.width, image.height, image.format), PK_Success);
+    ASSERT_TRUE(std::equal(expected.begin(), expected.end(), memory.Bytes()));
+}
+
+} // namespace
+
+TEST(FlipInPlace, SwapsRowsOfEvenAndOddHeights) {
+    for (const bool upwards : {false, true}) {
+        for (int32_t height = 1; height <= 9; ++height) {
+            CheckFlip({PK_PixelFormat_BGRA_4444_8u, 5, height, 0, 20}, upwards);
+            CheckFlip({PK_PixelFormat_BGRA_4444_8u, 5, height, 44, 20}, upwards);
+            CheckFlip({PK_PixelFormat_UYVY_422_8u, 5, height, 3, 12}, upwards);
+            CheckFlip({PK_PixelFormat_V210_422_10u, 7, height, 96, 32}, upwards);
+        }
+    }
+}
+
+TEST(FlipInPlace, SwapsRowsTooLongForTheStackAndLongEnoughToStream) {
+    CheckFlip({PK_PixelFormat_BGRA_4444_32f, 16385, 3, 7, 262160}, false);
+    CheckFlip({PK_PixelFormat_BGRA_4444_32f, 32771, 4, 16, 524336}, true);
+}
+
+TEST(FlipInPlace, LeavesTheMiddleRowOfThree) {
+    uint8_t rows[3][4] = {{1, 2, 3, 4}, {5, 6, 7, 8}, {9, 10, 11, 12}};
+    ASSERT_EQ(PK_FlipInPlace(rows, 4, 1, 3, PK_PixelFormat_BGRA_4444_8u), PK_Success);
+    const uint8_t expected[3][4] = {{9, 10, 11, 12}, {5, 6, 7, 8}, {1, 2, 3, 4}};
+    EXPECT_TRUE(std::equal(&rows[0][0], &rows[0][0] + 12, &expected[0][0]));
+}
+
+TEST(FlipInPlace, DoesNothingToHeightsBelowTwoAndToEmptyRows) {
+    EXPECT_EQ(PK_FlipInPlace(nullptr, 64, 16, 0, PK_PixelFormat_BGRA_4444_8u), PK_Success);
+    EXPECT_EQ(PK_FlipInPlace(nullptr, 64, 16, 1, PK_PixelFormat_BGRA_4444_8u), PK_Success);
+    EXPECT_EQ(PK_FlipInPlace(nullptr, 64, 0, 8, PK_PixelFormat_BGRA_4444_8u), PK_Success);
+}
+
+TEST(FlipInPlace, RefusesImpossibleArguments) {
+    uint8_t pixel[8] = {};
+    EXPECT_EQ(PK_FlipInPlace(nullptr, 64, 16, 2, PK_PixelFormat_BGRA_4444_8u), PK_ErrFailed);
+    EXPECT_EQ(PK_FlipInPlace(pixel, 4, -1, 2, PK_PixelFormat_BGRA_4444_8u), PK_ErrFailed);
+    EXPECT_EQ(PK_FlipInPlace(pixel, 4, 1, -2, PK_PixelFormat_BGRA_4444_8u), PK_ErrFailed);
+    // 16 bytes x 0x08000000 pixels is 2^31, which 32 bits hold as a negative length
+    EXPECT_EQ(PK_FlipInPlace(pixel, 4, 0x08000000, 2, PK_PixelFormat_BGRA_4444_32f), PK_ErrFailed);
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+// Puts the capability flags and the debug switches back as they were at the end of the scope.
+
+#include "frame/CacheSize.h"
+#include "frame/Capabilities.h"
+#include "frame/DebugSwitches.h"
+
+#include <array>
+
+namespace PKTest {
+
+/// The flags in the order of their switch numbers; switch 1 has none.
+inline std::array<uint8_t*, 10> AllFlags() {
+    using namespace PK;
+    return {&sMotionBlurLinear, &sCPUHasSSE,   &sCPUHasSSE2, &sCPUHasSSE3, &sCPUHasSSSE3,
+            &sCPUHasSSE4,       &sCPUHasSSE42, &sCPUHasAVX,  &sCPUHasAVX2, &sAllOriginsTopLeft};
+}
+
+class FlagScope {
+public:
+    FlagScope() : fFlags(AllFlags()) {
+        for (size_t i = 0; i < fFlags.size(); ++i) fSaved[i] = *fFlags[i];
+    }
+    ~FlagScope() {
+        for (size_t i = 0; i < fFlags.size(); ++i) *fFlags[i] = fSaved[i];
+        PK::sLargestCacheLevel = fCacheLevel;
+        PK::sLargestCacheBytes = fCacheBytes;
+    }
+    FlagScope(const FlagScope&) = delete;
+    FlagScope& operator=(const FlagScope&) = delete;
+
+    /// Switches everything off, as it stands before the first start.
+    static void ClearAll() {
+        for (uint8_t* flag : AllFlags()) *flag = 0;
+    }
+
+private:
+    std::array<uint8_t*, 10> fFlags;
+    std::array<uint8_t, 10> fSaved{};
+    int32_t fCacheLevel = PK::sLargestCacheLevel;
+    uint64_t fCacheBytes = PK::sLargestCacheBytes;
+};
+
+} // namespace PKTest
