@@ -1,0 +1,99 @@
+// PK_Convert: copies, decodes, encodes or runs rows, by what the two formats are.
+
+#include <PixelKiln/Convert.h>
+
+#include "convert/ConvertRasterRows.h"
+#include "convert/CopySameFormat.h"
+#include "convert/RasterFormats.h"
+#include "convert/Streams.h"
+#include "frame/FloatMode.h"
+#include "frame/TransientMemory.h"
+
+namespace PK {
+
+namespace {
+
+/// A transient image as what it is to one operation and to the next.
+DestinationImage AsDestination(const TransientPixelBuffer& buffer, PK_PixelFormat format, int32_t width,
+                               int32_t height) {
+    return {buffer.Pixels(), buffer.RowBytes(), format, width, height};
+}
+
+SourceImage AsSource(const DestinationImage& image) {
+    return {image.pixels, image.rowBytes, image.format, image.width, image.height};
+}
+
+PK_Result ConvertToRaster(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    if (source.height < 1) return ConvertRasterRows(source, destination, quality);
+    return ConvertRasterRows(FromBottomOfPicture(source), FromBottomOfPicture(destination), quality);
+}
+
+PK_Result Convert(const SourceImage& source, const DestinationImage& destination, int32_t quality);
+
+PK_Result ConvertToStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    if (source.width < 0 || source.height < 0) return PK_ErrFailed;
+    if (source.pixels == nullptr || destination.pixels == nullptr) return PK_ErrFailed;
+
+    PK_PixelFormat format = PK_PixelFormat_Invalid;
+    const PK_Result chosen = ChooseEncodeSource(source.format, destination.format, quality, format);
+    if (chosen != PK_Success) return chosen;
+    if (format == source.format) return EncodeStream(source, destination, quality);
+
+    const TransientPixelBuffer buffer(format, source.width, source.height);
+    if (buffer.Result() != PK_Success) return buffer.Result();
+    const DestinationImage staged = AsDestination(buffer, format, source.width, source.height);
+    const PK_Result converted = Convert(source, staged, quality);
+    return converted == PK_Success ? EncodeStream(AsSource(staged), destination, quality) : converted;
+}
+
+PK_Result ConvertRaster(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    return IsStream(destination.format) ? ConvertToStream(source, destination, quality)
+                                        : ConvertToRaster(source, destination, quality);
+}
+
+PK_Result ConvertFromStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    if (source.width < 0) return PK_ErrFailed;
+    if (source.pixels == nullptr || destination.pixels == nullptr) return PK_ErrFailed;
+
+    // A stream without a target of its own keeps what is wanted here, and is refused by DecodeStream.
+    const DecodeTarget wanted = {destination.format, source.width, source.height};
+    DecodeTarget target = wanted;
+    ChooseDecodeTarget({source.format, source.width, source.height}, wanted, quality, target);
+    if (target.width != source.width || target.height != source.height) return PK_ErrSizeMismatch;
+
+    constexpr int32_t kWholeFrame = 0;
+    if (target.format == destination.format) return DecodeStream(source, kWholeFrame, destination, quality);
+
+    const TransientPixelBuffer buffer(target.format, target.width, target.height);
+    if (buffer.Result() != PK_Success) return buffer.Result();
+    const DestinationImage decoded = AsDestination(buffer, target.format, target.width, target.height);
+    const PK_Result result = DecodeStream(source, kWholeFrame, decoded, quality);
+    return result == PK_Success ? ConvertRaster(AsSource(decoded), destination, quality) : result;
+}
+
+constexpr bool IsKnown(PK_PixelFormat format) {
+    return IsStream(format) || IsRasterFormat(format);
+}
+
+PK_Result Convert(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    if (!IsKnown(source.format)) return PK_ErrBadSrcFormat;
+    if (!IsKnown(destination.format)) return PK_ErrBadDstFormat;
+    if (source.format == destination.format) return CopySameFormat(source, destination);
+    return IsStream(source.format) ? ConvertFromStream(source, destination, quality)
+                                   : ConvertRaster(source, destination, quality);
+}
+
+} // namespace
+
+} // namespace PK
+
+using namespace PK;
+
+PK_Result PK_Convert(const void* source, int32_t sourceRowBytes, PK_PixelFormat sourceFormat,
+                     void* destination, int32_t destinationRowBytes, PK_PixelFormat destinationFormat,
+                     int32_t width, int32_t height, int32_t quality) noexcept {
+    const FloatMode mode;
+    return Convert(
+        {static_cast<const uint8_t*>(source), sourceRowBytes, sourceFormat, width, height},
+        {static_cast<uint8_t*>(destination), destinationRowBytes, destinationFormat, width, height}, quality);
+}

@@ -1,0 +1,42 @@
+#pragma once
+
+// An image as an operation walks it: row 0 is the first that is read or written, the row bytes lead on.
+
+#include "frame/PixelFormat.h"
+
+#include <PixelKiln/PixelFormat.h>
+
+#include <cstddef>
+#include <cstdint>
+
+namespace PK {
+
+template <class Byte>
+struct Image {
+    Byte* pixels;
+    ptrdiff_t rowBytes; // of either sign; wide enough for the negative of any row bytes of a caller
+    PK_PixelFormat format;
+    int32_t width;
+    int32_t height;
+
+    Byte* Row(int32_t row) const { return pixels + row * rowBytes; }
+};
+
+using SourceImage = Image<const uint8_t>;
+using DestinationImage = Image<uint8_t>;
+
+/// The widest row whose bytes, at 16 a pixel, can be told in 32 bits.
+inline constexpr int32_t kMaximumWidth = INT32_MAX / 16;
+
+/// The image walked from the bottom of the picture up, whichever way its format lies in memory. Of two images
+/// walked so, row meets row. The height is at least 1.
+template <class Byte>
+Image<Byte> FromBottomOfPicture(const Image<Byte>& image) {
+    if (!PK_IsOriginTopLeft(image.format)) return image;
+    Image<Byte> reversed = image;
+    reversed.pixels = image.Row(image.height - 1);
+    reversed.rowBytes = -image.rowBytes;
+    return reversed;
+}
+
+} // namespace PK
