@@ -1,10 +1,78 @@
 // The matrices from YUV to RGB.
 
+#include "convert/ColourMatrices.h"
 #include "convert/Kernel.h"
 #include "convert/RowGroups.h"
+#include "convert/Samples.h"
+
+namespace PK::PK_TARGET {
+namespace {
+
+template <const YUVToRGBMatrix& kMatrix>
+struct YUVToRGB8 : PixelGroup<4, 4> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        Store(destination, YUV8ToRGB8<kMatrix>(LoadByteChannels(source)));
+    }
+};
+
+template <const YUVToRGBMatrix& kMatrix>
+struct OpaqueYUVToRGB8 : PixelGroup<4, 4> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        Store(destination, YUV8ToRGB8<kMatrix>(LoadByteChannels(source)) | Ints(kOpaque));
+    }
+
+    static constexpr int32_t kOpaque = -0x01000000; // 0xff000000, alpha 255
+};
+
+template <const YUVToRGBMatrix& kMatrix>
+struct YUV8ToRGBFloat : PixelGroup<4, 16> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        Channels bgra = YUVToRGB<kMatrix>(RemoveOffsets(LoadByteChannels(source)));
+        bgra.c3 = bgra.c3 * Floats(kReciprocal255);
+        StoreFloatChannels(destination, bgra);
+    }
+};
+
+template <const YUVToRGBMatrix& kMatrix>
+struct OpaqueYUV8ToRGBFloat : PixelGroup<4, 16> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        Channels bgra = YUVToRGB<kMatrix>(RemoveOffsets(LoadByteChannels(source)));
+        bgra.c3 = Floats(1);
+        StoreFloatChannels(destination, bgra);
+    }
+};
+
+template <const YUVToRGBMatrix& kMatrix>
+struct YUVToRGBFloat : PixelGroup<16, 16> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        StoreFloatChannels(destination, YUVToRGB<kMatrix>(LoadFloatChannels(source)));
+    }
+};
+
+/// The direct kernels exist from SSE2 up: without it the router takes the way over VUYX8uToRGB8uRow.
+constexpr RowKernel FromSSE2(RowKernel body) {
+    return kTarget == Target::plain ? nullptr : body;
+}
+
+} // namespace
+} // namespace PK::PK_TARGET
 
 template <>
 PK::KernelBodies PK::YUVToRGBBodies<PK::PK_TARGET::kTarget>() {
-    static constexpr KernelBody bodies[] = {{Kernel::YUV601ToRGBRow, nullptr}};
+    using namespace PK_TARGET;
+    static constexpr KernelBody bodies[] = {
+        {Kernel::YUV601ToRGBRow, Row<YUVToRGB8<kYUV8ToRGB8_601>>},
+        {Kernel::YUV709ToRGBRow, Row<YUVToRGB8<kYUV8ToRGB8_709>>},
+        {Kernel::YUV601ToRGB32fRow, Row<YUV8ToRGBFloat<kYUV8ToRGB601>>},
+        {Kernel::YUV709ToRGB32fRow, Row<YUV8ToRGBFloat<kYUV8ToRGB709>>},
+        {Kernel::YUV601ToRGBFloat32Row, Row<YUVToRGBFloat<kYUVToRGB601>>},
+        {Kernel::YUV709ToRGBFloat32Row, Row<YUVToRGBFloat<kYUVToRGB709>>},
+        {Kernel::VUYX8uToRGB8uRow_601, Row<OpaqueYUVToRGB8<kYUV8ToRGB8_601>>},
+        {Kernel::VUYX8uToRGB8uRow_709, Row<OpaqueYUVToRGB8<kYUV8ToRGB8_709>>},
+        {Kernel::VUYX8uToRGB32fRow_601, Row<OpaqueYUV8ToRGBFloat<kYUV8ToRGB601>>},
+        {Kernel::VUYX8uToRGB32fRow_709, Row<OpaqueYUV8ToRGBFloat<kYUV8ToRGB709>>},
+        {Kernel::VUYX8uToBGR8uRow_601, FromSSE2(Row<OpaqueYUVToRGB8<kYUV8ToRGB8_601>>)},
+        {Kernel::VUYX8uToBGR8uRow_709, FromSSE2(Row<OpaqueYUVToRGB8<kYUV8ToRGB8_709>>)},
+    };
     return bodies;
 }

@@ -51,4 +51,15 @@ inline F32 AtMost(F32 limit, F32 x) {
     return Min(limit, x);
 }
 
+/// kLanes interleaved four-channel float pixels, one vector a channel.
+inline Channels LoadFloatChannels(const void* source) {
+    Channels channels;
+    LoadFloatChannels(source, channels.c0, channels.c1, channels.c2, channels.c3);
+    return channels;
+}
+
+inline void StoreFloatChannels(void* destination, Channels channels) {
+    StoreFloatChannels(destination, channels.c0, channels.c1, channels.c2, channels.c3);
+}
+
 } // namespace PK::PK_TARGET
