@@ -130,6 +130,12 @@ enum class Kernel : uint8_t {
     RGB10uToBGR15uRow,
     RGB10uToBGR32fRow,
 
+    // Fused: each stands for a run of those above, see Fusion.h. The router never names them.
+    RGBToUYVY601,
+    RGBToUYVY709,
+    StraightRGBToUYVY601,
+    StraightRGBToUYVY709,
+
     None, // no kernel; also the count of kernels
 };
 inline constexpr int kKernelCount = static_cast<int>(Kernel::None);
@@ -170,5 +176,7 @@ template <Target>
 KernelBodies V210Bodies(); // V210.kernels.cpp
 template <Target>
 KernelBodies RGB10Bodies(); // RGB10.kernels.cpp
+template <Target>
+KernelBodies FusedBodies(); // Fused.kernels.cpp
 
 } // namespace PK

@@ -152,6 +152,11 @@ constexpr KernelInfo kRegister[] = {
     {Kernel::RGB10uToBGR8uRow, "RGB10uToBGR8uRow", kRGB10, kBGRX8},
     {Kernel::RGB10uToBGR15uRow, "RGB10uToBGR15uRow", kRGB10, kBGRX15},
     {Kernel::RGB10uToBGR32fRow, "RGB10uToBGR32fRow", kRGB10, kBGRX32f},
+    {Kernel::RGBToUYVY601, "RGBToYUV601Row + Downsample444To422Row", kBGRX8, kUYVY8},
+    {Kernel::RGBToUYVY709, "RGBToYUV709Row + Downsample444To422Row", kBGRX8, kUYVY8_709},
+    {Kernel::StraightRGBToUYVY601, "RGBToYUV601Row + PremultiplyRow + Downsample444To422Row", kBGRA8, kUYVY8},
+    {Kernel::StraightRGBToUYVY709, "RGBToYUV709Row + PremultiplyRow + Downsample444To422Row", kBGRA8,
+     kUYVY8_709},
 };
 // clang-format on
 
@@ -170,7 +175,8 @@ void Enter(BodyTable& table) {
     for (const KernelBodies& bodies :
          {OrderBodies<kTarget>(), PremultiplyBodies<kTarget>(), DepthBodies<kTarget>(),
           RGBToYUVBodies<kTarget>(), YUVToRGBBodies<kTarget>(), YUVToYUVBodies<kTarget>(),
-          ChromaBodies<kTarget>(), TransferBodies<kTarget>(), V210Bodies<kTarget>(), RGB10Bodies<kTarget>()})
+          ChromaBodies<kTarget>(), TransferBodies<kTarget>(), V210Bodies<kTarget>(), RGB10Bodies<kTarget>(),
+          FusedBodies<kTarget>()})
         for (int32_t i = 0; i < bodies.count; ++i)
             table[static_cast<std::size_t>(bodies.first[i].kernel)][static_cast<std::size_t>(kTarget)] =
                 bodies.first[i].run;

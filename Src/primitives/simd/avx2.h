@@ -228,4 +228,19 @@ inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
     return {_mm256_shuffle_epi8(planes, _mm256_broadcastsi128_si256(order))};
 }
 
+/// The lanes of a and b at even places, a first, and those at odd places.
+inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
+    const __m256 lower = _mm256_castsi256_ps(a.v), upper = _mm256_castsi256_ps(b.v);
+    const __m256i evens = _mm256_castps_si256(_mm256_shuffle_ps(lower, upper, _MM_SHUFFLE(2, 0, 2, 0)));
+    const __m256i odds = _mm256_castps_si256(_mm256_shuffle_ps(lower, upper, _MM_SHUFFLE(3, 1, 3, 1)));
+    even.v = _mm256_permute4x64_epi64(evens, _MM_SHUFFLE(3, 1, 2, 0));
+    odd.v = _mm256_permute4x64_epi64(odds, _MM_SHUFFLE(3, 1, 2, 0));
+}
+
+/// The lanes of `lanes` moved up by one, with the last lane of `before` in front.
+inline I32 ShiftInLane(I32 before, I32 lanes) {
+    const __m256i across = _mm256_permute2x128_si256(before.v, lanes.v, 0x21);
+    return {_mm256_alignr_epi8(lanes.v, across, 12)};
+}
+
 } // namespace PK::avx2

@@ -258,4 +258,19 @@ inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
     return pixels;
 }
 
+/// The lanes of a and b at even places, a first, and those at odd places.
+inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
+    for (int i = 0; i < kLanes / 2; ++i) {
+        even.lane[i] = a.lane[2 * i];
+        odd.lane[i] = a.lane[2 * i + 1];
+        even.lane[i + kLanes / 2] = b.lane[2 * i];
+        odd.lane[i + kLanes / 2] = b.lane[2 * i + 1];
+    }
+}
+
+/// The lanes of `lanes` moved up by one, with the last lane of `before` in front.
+inline I32 ShiftInLane(I32 before, I32 lanes) {
+    return {{before.lane[kLanes - 1], lanes.lane[0], lanes.lane[1], lanes.lane[2]}};
+}
+
 } // namespace PK::plain

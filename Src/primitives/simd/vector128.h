@@ -250,4 +250,16 @@ inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
 #endif
 }
 
+/// The lanes of a and b at even places, a first, and those at odd places.
+inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
+    const __m128 lower = _mm_castsi128_ps(a.v), upper = _mm_castsi128_ps(b.v);
+    even.v = _mm_castps_si128(_mm_shuffle_ps(lower, upper, _MM_SHUFFLE(2, 0, 2, 0)));
+    odd.v = _mm_castps_si128(_mm_shuffle_ps(lower, upper, _MM_SHUFFLE(3, 1, 3, 1)));
+}
+
+/// The lanes of `lanes` moved up by one, with the last lane of `before` in front.
+inline I32 ShiftInLane(I32 before, I32 lanes) {
+    return {_mm_or_si128(_mm_slli_si128(lanes.v, 4), _mm_srli_si128(before.v, 12))};
+}
+
 } // namespace PK::PK_TARGET
