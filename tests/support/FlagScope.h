@@ -7,6 +7,7 @@
 #include "frame/DebugSwitches.h"
 
 #include <array>
+#include <cstddef>
 
 namespace PKTest {
 
@@ -20,10 +21,10 @@ inline std::array<uint8_t*, 10> AllFlags() {
 class FlagScope {
 public:
     FlagScope() : fFlags(AllFlags()) {
-        for (size_t i = 0; i < fFlags.size(); ++i) fSaved[i] = *fFlags[i];
+        for (std::size_t i = 0; i < fFlags.size(); ++i) fSaved[i] = *fFlags[i];
     }
     ~FlagScope() {
-        for (size_t i = 0; i < fFlags.size(); ++i) *fFlags[i] = fSaved[i];
+        for (std::size_t i = 0; i < fFlags.size(); ++i) *fFlags[i] = fSaved[i];
         PK::sLargestCacheLevel = fCacheLevel;
         PK::sLargestCacheBytes = fCacheBytes;
     }
