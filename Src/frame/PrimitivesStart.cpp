@@ -24,8 +24,16 @@ bool IsTraced(TraceSite& site) {
 }
 
 std::string WarningLine(const char* statusText) {
-    return "<" + std::to_string(zebcore::threads::GetCurrentThreadID()) + "> <" + kChannel + "> <" +
-           std::to_string(kLevel) + "> ippInit warning: " + statusText + "\n";
+    std::string line = "<";
+    line += std::to_string(zebcore::threads::GetCurrentThreadID());
+    line += "> <";
+    line += kChannel;
+    line += "> <";
+    line += std::to_string(kLevel);
+    line += "> ippInit warning: ";
+    line += statusText;
+    line += '\n';
+    return line;
 }
 
 } // namespace

@@ -26,6 +26,7 @@ uint64_t RecyclerPool::ClassSize(uint64_t size) noexcept {
 }
 
 void* RecyclerPool::Allocate(uint64_t size, uint64_t* actualSize) noexcept {
+    if (size >= kRefusedFrom) return nullptr;
     const uint64_t blockSize = ClassSize(size);
     if (size <= kLargest) {
         const std::lock_guard lock(fMutex);

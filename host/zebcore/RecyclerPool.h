@@ -38,6 +38,7 @@ private:
     static constexpr int kLargestBits = 30;  // 1 GiB; larger blocks are never kept
     static constexpr uint64_t kSmallest = uint64_t{1} << kSmallestBits;
     static constexpr uint64_t kLargest = uint64_t{1} << kLargestBits;
+    static constexpr uint64_t kRefusedFrom = uint64_t{1} << 38; // 256 GiB: a size gone wrong, no image
     static constexpr size_t kClassCount = ((kLargestBits - kSmallestBits) << kStepBits) + 1;
 
     // A kept block; the list runs through the blocks themselves.

@@ -175,7 +175,8 @@ TEST(FormatNames, KnowNothingElse) {
     std::set<uint32_t> named;
     for (const NumberAndName& row : kNames) named.insert(row.number);
     for (uint32_t number = 0; number < 0x4000; ++number) {
-        if (named.count(number) == 0) EXPECT_STREQ(PK_PixelFormatName(number), "Unknown pixel format");
+        if (named.count(number) != 0) continue;
+        EXPECT_STREQ(PK_PixelFormatName(number), "Unknown pixel format");
     }
     EXPECT_STREQ(PK_PixelFormatName(0x01000822), "Unknown pixel format");
     EXPECT_STREQ(PK_PixelFormatName(0xffffffff), "Unknown pixel format");

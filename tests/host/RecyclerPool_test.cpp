@@ -134,6 +134,7 @@ TEST(RecyclerPool, ReportsMemoryThatCannotBeHad) {
     uint64_t actual = 9;
     EXPECT_EQ(pool.Allocate(std::numeric_limits<uint64_t>::max() / 2, &actual), nullptr);
     EXPECT_EQ(pool.Allocate(std::numeric_limits<uint64_t>::max(), &actual), nullptr);
+    EXPECT_EQ(pool.Allocate(uint64_t{1} << 38, &actual), nullptr);
     EXPECT_EQ(actual, 9u);
 }
 
