@@ -19,13 +19,13 @@ struct ChainScratch {
 struct ConversionChain {
     static constexpr int32_t kMaximumSteps = 8;
 
-    int32_t count = 0;                     ///< Steps; 0 means that there is no conversion.
-    Kernel kernels[kMaximumSteps];         ///< What each step does.
-    RowKernel steps[kMaximumSteps];        ///< The body that does it.
-    PK_PixelFormat formats[kMaximumSteps]; ///< The format that each step leaves the row in.
+    int32_t count = 0;                          ///< Steps; 0 means that there is no conversion.
+    Kernel kernels[kMaximumSteps] = {};         ///< What each step does.
+    RowKernel steps[kMaximumSteps] = {};        ///< The body that does it.
+    PK_PixelFormat formats[kMaximumSteps] = {}; ///< The format that each step leaves the row in.
 
-    int32_t passCount = 0;           ///< What runs: neighbouring steps with a joint body are one pass.
-    RowKernel passes[kMaximumSteps]; ///< The passes in order; they give the numbers of the steps.
+    int32_t passCount = 0;                ///< What runs: neighbouring steps with a joint body are one pass.
+    RowKernel passes[kMaximumSteps] = {}; ///< The passes in order; they give the numbers of the steps.
 
     /// Finds the way from source to destination and takes the best bodies that the capability flags allow at
     /// this moment. `count` stays 0 where there is none: for any format that is no raster format of the

@@ -2,9 +2,13 @@
 
 #include "convert/Router.h"
 
+#include "convert/KernelTable.h"
 #include "convert/RasterFormats.h"
 #include "convert/RouterTable.h"
 #include "frame/Capabilities.h"
+#include "frame/PixelFormat.h"
+#include "reference/ReferenceRouter.h"
+#include "support/FlagScope.h"
 
 #include <gtest/gtest.h>
 
@@ -22,18 +26,6 @@ using enum Kernel;
 constexpr int kMaximumSteps = 8;
 constexpr int32_t kRepeating = 1;
 constexpr int32_t kInterpolating = 2;
-
-/// Sets the SSE2 flag for the length of a scope.
-class SSE2Flag {
-public:
-    explicit SSE2Flag(bool on) : fSaved(sCPUHasSSE2) { sCPUHasSSE2 = on; }
-    ~SSE2Flag() { sCPUHasSSE2 = fSaved; }
-    SSE2Flag(const SSE2Flag&) = delete;
-    SSE2Flag& operator=(const SSE2Flag&) = delete;
-
-private:
-    uint8_t fSaved;
-};
 
 struct Step {
     PK_PixelFormat from;
@@ -85,18 +77,21 @@ TEST(Router, FormatsMakeEveryPair) {
 }
 
 TEST(Router, EveryPairHasAChainOfKnownLength) {
-    const SSE2Flag sse2(true);
+    const PKTest::FlagScope flags;
+    sCPUHasSSE2 = 1;
     EXPECT_EQ(CountPairsBySteps(), (std::array{0, 329, 484, 572, 458, 240, 97, 27, 2}));
 }
 
 TEST(Router, WithoutSSE2TwoPairsTakeAStepMore) {
-    const SSE2Flag sse2(false);
+    const PKTest::FlagScope flags;
+    sCPUHasSSE2 = 0;
     EXPECT_EQ(CountPairsBySteps(), (std::array{0, 327, 486, 572, 458, 240, 97, 27, 2}));
 }
 
 TEST(Router, NoChainVisitsAFormatTwiceOrLeavesTheCatalogue) {
-    for (const bool on : {false, true}) {
-        const SSE2Flag sse2(on);
+    const PKTest::FlagScope flags;
+    for (const bool sse2 : {false, true}) {
+        sCPUHasSSE2 = sse2;
         ForEachPair([](PK_PixelFormat source, PK_PixelFormat destination) {
             if (source == destination) return;
             std::set<PK_PixelFormat> seen{source};
@@ -121,6 +116,43 @@ TEST(Router, QualityOnlyChangesHowFloatChromaIsUpsampled) {
               Kernels{Upsample422To444Float32Row_Repeat});
     EXPECT_EQ(KernelsOf(PK_PixelFormat_UYVY_422_32f, PK_PixelFormat_VUYA_4444_32f, 5),
               Kernels{Upsample422To444Float32Row_Interpolate});
+}
+
+TEST(Router, AgreesWithTheRestatedRouter) {
+    const PKTest::FlagScope flags;
+    for (const bool sse2 : {false, true}) {
+        sCPUHasSSE2 = sse2;
+        ForEachPair([sse2](PK_PixelFormat source, PK_PixelFormat destination) {
+            const std::vector<Step> steps = Walk(source, destination);
+            const std::vector<reference::Step> expected =
+                reference::Chain(source, destination, kInterpolating, sse2);
+            ASSERT_EQ(steps.size(), expected.size()) << std::hex << source << " to " << destination;
+            for (size_t i = 0; i < steps.size(); ++i) {
+                EXPECT_EQ(Info(steps[i].kernel).name, expected[i].kernel);
+                EXPECT_EQ(steps[i].to, expected[i].next);
+            }
+        });
+    }
+}
+
+/// What a kernel relies on of a format: how its pixels lie in memory.
+uint32_t LayoutOf(PK_PixelFormat format) {
+    const uint32_t fourChannels = IsPacked4444(format) ? kAlphaMeaningless : kAlphaNone;
+    return (format & (kStructureMask | kDepthMask)) | fourChannels;
+}
+
+TEST(Router, KernelsOnlyMeetRowsOfTheirLayout) {
+    ForEachPair([](PK_PixelFormat source, PK_PixelFormat destination) {
+        for (const Step& step : Walk(source, destination)) {
+            if (source == PK_PixelFormat_RGB_444_10u && destination == source)
+                continue; // copied by pixel size
+            const KernelInfo& info = Info(step.kernel);
+            EXPECT_EQ(LayoutOf(info.source), LayoutOf(step.from))
+                << info.name << std::hex << " " << step.from;
+            EXPECT_EQ(LayoutOf(info.destination), LayoutOf(step.to))
+                << info.name << std::hex << " " << step.to;
+        }
+    });
 }
 
 /// A row of the table by its source and position.
@@ -207,14 +239,13 @@ TEST(Router, FloatYUYVTurnsItsOrderFirst) {
 }
 
 TEST(Router, DirectKernelNeedsSSE2) {
-    {
-        const SSE2Flag sse2(true);
-        EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_BGRA_4444_8u),
-                  Kernels{VUYX8uToBGR8uRow_601});
-        EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYX_4444_8u_709, PK_PixelFormat_BGRX_4444_8u),
-                  Kernels{VUYX8uToBGR8uRow_709});
-    }
-    const SSE2Flag sse2(false);
+    const PKTest::FlagScope flags;
+    sCPUHasSSE2 = 1;
+    EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_BGRA_4444_8u),
+              Kernels{VUYX8uToBGR8uRow_601});
+    EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYX_4444_8u_709, PK_PixelFormat_BGRX_4444_8u),
+              Kernels{VUYX8uToBGR8uRow_709});
+    sCPUHasSSE2 = 0;
     EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_BGRX_4444_8u),
               Kernels{VUYX8uToRGB8uRow_601});
     EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYX_4444_8u_709, PK_PixelFormat_BGRX_4444_8u),

@@ -1,0 +1,162 @@
+// What decoders give and encoders take, by format and size.
+
+#include "convert/Streams.h"
+
+#include <PixelKiln/PixelFormat.h>
+
+#include <gtest/gtest.h>
+
+namespace PK {
+
+bool operator==(const DecodeTarget& a, const DecodeTarget& b) {
+    return a.format == b.format && a.width == b.width && a.height == b.height;
+}
+
+void PrintTo(const DecodeTarget& target, std::ostream* stream) {
+    *stream << std::hex << target.format << std::dec << " " << target.width << " x " << target.height;
+}
+
+namespace {
+
+struct Picture {
+    PK_PixelFormat stream;
+    DecodeTarget native;
+    PK_PixelFormat reduced;
+};
+
+constexpr Picture kPictures[] = {
+    {PK_PixelFormat_NTSCDV50, {PK_PixelFormat_YUYV_422_8u, 720, 480}, PK_PixelFormat_VUYA_4444_8u},
+    {PK_PixelFormat_PALDV50, {PK_PixelFormat_YUYV_422_8u, 720, 576}, PK_PixelFormat_VUYA_4444_8u},
+    {PK_PixelFormat_NTSC_DV100_720p,
+     {PK_PixelFormat_YUYV_422_8u_709, 960, 720},
+     PK_PixelFormat_VUYA_4444_8u_709},
+    {PK_PixelFormat_PAL_DV100_720p,
+     {PK_PixelFormat_YUYV_422_8u_709, 960, 720},
+     PK_PixelFormat_VUYA_4444_8u_709},
+    {PK_PixelFormat_NTSC_DV100_1080i,
+     {PK_PixelFormat_YUYV_422_8u_709, 1280, 1080},
+     PK_PixelFormat_VUYA_4444_8u_709},
+    {PK_PixelFormat_PAL_DV100_1080i,
+     {PK_PixelFormat_YUYV_422_8u_709, 1440, 1080},
+     PK_PixelFormat_VUYA_4444_8u_709},
+};
+
+/// The answer for a wanted size; what the caller wants of formats plays no part.
+DecodeTarget Choose(const Picture& picture, int32_t width, int32_t height, int32_t quality) {
+    DecodeTarget target{};
+    const DecodeTarget stream = {picture.stream, picture.native.width, picture.native.height};
+    EXPECT_EQ(ChooseDecodeTarget(stream, {PK_PixelFormat_BGRA_4444_8u, width, height}, quality, target),
+              PK_Success);
+    return target;
+}
+
+TEST(Streams, DVDecodesToItsNativeFormatAtFullSize) {
+    for (const Picture& picture : kPictures) {
+        const auto& [format, width, height] = picture.native;
+        EXPECT_EQ(Choose(picture, width, height, 0), picture.native);
+        EXPECT_EQ(Choose(picture, width, height, 5), picture.native);
+        EXPECT_EQ(Choose(picture, 2 * width, 2 * height, 2), picture.native);
+        EXPECT_EQ(Choose(picture, width - 1, height, 2), picture.native);
+        EXPECT_EQ(Choose(picture, width, height - 1, 2), picture.native);
+    }
+}
+
+TEST(Streams, DVDecodesOneFieldForFullWidthAndHalfHeight) {
+    for (const Picture& picture : kPictures) {
+        const auto& [format, width, height] = picture.native;
+        const DecodeTarget field = {format, width, height / 2};
+        EXPECT_EQ(Choose(picture, width, height / 2, 0), field);
+        EXPECT_EQ(Choose(picture, width, height / 2, 5), field);
+    }
+}
+
+TEST(Streams, DVDecodesReducedWhereHalfTheSizeIsEnough) {
+    for (const Picture& picture : kPictures) {
+        const auto& [format, width, height] = picture.native;
+        const DecodeTarget reduced = {picture.reduced, width / 2, height / 2};
+        EXPECT_EQ(Choose(picture, width / 2, height / 2, 5), reduced);
+        EXPECT_EQ(Choose(picture, 1, 1, 5), reduced);
+        EXPECT_EQ(Choose(picture, width / 2 + 1, height / 2, 3), picture.native);
+        EXPECT_EQ(Choose(picture, width / 2, height / 2 + 1, 3), picture.native);
+    }
+}
+
+TEST(Streams, DVDecodesReducedForAnySmallerSizeAtLowQuality) {
+    for (const Picture& picture : kPictures) {
+        const auto& [format, width, height] = picture.native;
+        const DecodeTarget reduced = {picture.reduced, width / 2, height / 2};
+        EXPECT_EQ(Choose(picture, width - 1, height - 1, 2), reduced);
+        EXPECT_EQ(Choose(picture, width - 1, height - 1, 3), picture.native);
+    }
+}
+
+TEST(Streams, NoDecodeTargetForWhatIsNoStream) {
+    for (const PK_PixelFormat format : {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_Invalid, 0x0d000821u}) {
+        DecodeTarget target = {1, 2, 3};
+        EXPECT_EQ(ChooseDecodeTarget({format, 720, 480}, {PK_PixelFormat_BGRA_4444_8u, 720, 480}, 2, target),
+                  PK_ErrBadSrcFormat);
+        EXPECT_EQ(target, (DecodeTarget{1, 2, 3}));
+    }
+}
+
+PK_PixelFormat EncodeSource(PK_PixelFormat source, PK_PixelFormat stream) {
+    PK_PixelFormat format = PK_PixelFormat_Invalid;
+    EXPECT_EQ(ChooseEncodeSource(source, stream, 2, format), PK_Success);
+    return format;
+}
+
+TEST(Streams, DV25EncodesFromTheEightBitFormOfItsSource) {
+    for (const PK_PixelFormat stream : {PK_PixelFormat_NTSCDV25, PK_PixelFormat_PALDV25}) {
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_XRGB_4444_15u, stream), PK_PixelFormat_BGRA_4444_8u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_RGB_444_10u, stream), PK_PixelFormat_BGRA_4444_8u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_VUYP_4444_32f_709, stream), PK_PixelFormat_VUYA_4444_8u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_UYVY_422_32f, stream), PK_PixelFormat_UYVY_422_8u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_V210_422_10u, stream), PK_PixelFormat_UYVY_422_8u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_YUYV_422_8u_709, stream), PK_PixelFormat_YUYV_422_8u);
+    }
+}
+
+TEST(Streams, DV50AndDV100EncodeFromTheirNativeFormat) {
+    for (const Picture& picture : kPictures) {
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_BGRA_4444_8u, picture.stream), picture.native.format);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_UYVY_422_8u, picture.stream), picture.native.format);
+    }
+}
+
+TEST(Streams, PlanarEncodesFromAnyRasterFormatInVideoRange) {
+    for (const PK_PixelFormat stream :
+         {PK_PixelFormat_YUV_420_MPEG2_FRAME, PK_PixelFormat_YUV_420_MPEG4_FIELD_709}) {
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_PRGB_4444_15u, stream), PK_PixelFormat_PRGB_4444_15u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_V210_422_10u, stream), PK_PixelFormat_V210_422_10u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_NTSCDV25, stream), PK_PixelFormat_VUYX_4444_8u);
+    }
+}
+
+TEST(Streams, PlanarFullRangeEncodesFromRGB) {
+    for (const PK_PixelFormat stream :
+         {PK_PixelFormat_YUV_420_MPEG2_FIELD_FullRange, PK_PixelFormat_YUV_420_MPEG4_FRAME_FullRange_709}) {
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_UYVY_422_8u, stream), PK_PixelFormat_BGRX_4444_8u);
+        EXPECT_EQ(EncodeSource(PK_PixelFormat_PALDV50, stream), PK_PixelFormat_BGRX_4444_8u);
+    }
+}
+
+TEST(Streams, NoEncodeSourceForWhatIsNoStream) {
+    for (const PK_PixelFormat format : {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_Invalid, 0x0d000821u}) {
+        PK_PixelFormat source = 0x77;
+        EXPECT_EQ(ChooseEncodeSource(PK_PixelFormat_BGRA_4444_8u, format, 2, source), PK_ErrNotSupported);
+        EXPECT_EQ(source, 0x77u);
+    }
+}
+
+TEST(Streams, UnknownKindsHaveNoCodec) {
+    uint8_t bytes[64] = {};
+    const PK_PixelFormat unknown = 0x0d000821;
+    EXPECT_EQ(DecodeStream({bytes, 0, unknown, 8, 1}, 0, {bytes, 32, PK_PixelFormat_BGRA_4444_8u, 8, 1}, 2),
+              PK_ErrNotSupported);
+    EXPECT_EQ(EncodeStream({bytes, 32, PK_PixelFormat_BGRA_4444_8u, 8, 1}, {bytes, 0, unknown, 8, 1}, 2),
+              PK_ErrNotSupported);
+}
+
+} // namespace
+
+} // namespace PK
