@@ -228,4 +228,55 @@ inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
     return {_mm256_shuffle_epi8(planes, _mm256_broadcastsi128_si256(order))};
 }
 
+/// The high 16 bits of the product of each 16-bit half with its counterpart, both without sign.
+inline I32 MultiplyHalvesHigh(I32 a, I32 b) {
+    return {_mm256_mulhi_epu16(a.v, b.v)};
+}
+/// The mean of each 16-bit half and its counterpart, both without sign, rounded up.
+inline I32 AverageHalves(I32 a, I32 b) {
+    return {_mm256_avg_epu16(a.v, b.v)};
+}
+/// The lesser of each 16-bit half and its counterpart; both are below 32768.
+inline I32 MinHalves(I32 a, I32 b) {
+    return {_mm256_min_epi16(a.v, b.v)};
+}
+/// Swaps the two bytes of each 16-bit half.
+inline I32 SwapBytes(I32 a) {
+    const __m128i order = _mm_setr_epi8(1, 0, 3, 2, 5, 4, 7, 6, 9, 8, 11, 10, 13, 12, 15, 14);
+    return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
+}
+/// Reverses the four 16-bit halves of each pair of lanes.
+inline I32 ReverseHalves(I32 a) {
+    const __m128i order = _mm_setr_epi8(6, 7, 4, 5, 2, 3, 0, 1, 14, 15, 12, 13, 10, 11, 8, 9);
+    return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
+}
+/// 2 x kLanes bytes, each to a 16-bit half.
+inline I32 LoadBytesAsHalves(const void* source) {
+    return {_mm256_cvtepu8_epi16(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
+}
+/// The 16-bit halves of two vectors to bytes in their order; the halves are below 32768 and saturate.
+inline I32 PackHalves(I32 a, I32 b) {
+    return {_mm256_permute4x64_epi64(_mm256_packus_epi16(a.v, b.v), _MM_SHUFFLE(3, 1, 2, 0))};
+}
+/// The lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
+    const __m256i bytes = _mm256_packus_epi16(_mm256_packs_epi32(a.v, b.v), _mm256_packs_epi32(c.v, d.v));
+    return {_mm256_permutevar8x32_epi32(bytes, _mm256_setr_epi32(0, 4, 1, 5, 2, 6, 3, 7))};
+}
+/// 2 x kLanes interleaved lanes to those on even and those on odd places, and back.
+inline void LoadLanePairs(const void* source, I32& even, I32& odd) {
+    const F32 a = LoadFloats(source);
+    const F32 b = LoadFloats(static_cast<const float*>(source) + kLanes);
+    const __m256 evens = _mm256_shuffle_ps(a.v, b.v, _MM_SHUFFLE(2, 0, 2, 0));
+    const __m256 odds = _mm256_shuffle_ps(a.v, b.v, _MM_SHUFFLE(3, 1, 3, 1));
+    even.v = _mm256_permute4x64_epi64(_mm256_castps_si256(evens), _MM_SHUFFLE(3, 1, 2, 0));
+    odd.v = _mm256_permute4x64_epi64(_mm256_castps_si256(odds), _MM_SHUFFLE(3, 1, 2, 0));
+}
+inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
+    const __m256i outer = _mm256_unpacklo_epi32(even.v, odd.v), inner = _mm256_unpackhi_epi32(even.v, odd.v);
+    auto* lanes = static_cast<int32_t*>(destination);
+    Store(lanes, I32{_mm256_permute2x128_si256(outer, inner, 0x20)});
+    Store(lanes + kLanes, I32{_mm256_permute2x128_si256(outer, inner, 0x31)});
+}
+
 } // namespace PK::avx2
