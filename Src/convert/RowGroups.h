@@ -42,13 +42,14 @@ void Row(const void* sourceRow, void* destinationRow, int32_t width) {
     if (width > 0) RunTail<Formula>(source, destination, width);
 }
 
-/// A formula on interleaved pixels of which a vector of kLanes samples holds kLanes / 4.
-template <int kSourceSample, int kDestinationSample>
+/// A formula on interleaved samples, four a unit: a pixel, or a pair of pixels for 4:2:2. The group is
+/// kVectors times kLanes samples.
+template <int kSourceSample, int kDestinationSample, int kUnitPixels = 1, int kVectors = 1>
 struct SampleGroup {
-    static constexpr int32_t kPixels = kLanes / 4;
-    static constexpr int32_t kUnit = 1;
-    static constexpr int32_t kSourceBytes = kLanes * kSourceSample;
-    static constexpr int32_t kDestinationBytes = kLanes * kDestinationSample;
+    static constexpr int32_t kPixels = kVectors * kLanes / 4 * kUnitPixels;
+    static constexpr int32_t kUnit = kUnitPixels;
+    static constexpr int32_t kSourceBytes = kVectors * kLanes * kSourceSample;
+    static constexpr int32_t kDestinationBytes = kVectors * kLanes * kDestinationSample;
 };
 
 /// A formula on kLanes pixels, one vector a channel or one lane a pixel.

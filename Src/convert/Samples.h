@@ -16,4 +16,9 @@ inline F32 ExpandVUYA(F32 codes) {
            PixelFloats(kReciprocal224, kReciprocal224, kReciprocal219, kReciprocal255);
 }
 
+/// Limits x to 0 and 1; NaN becomes 0.
+inline F32 LimitToUnit(F32 x) {
+    return Min(Max(x, Floats(0)), Floats(1));
+}
+
 } // namespace PK::PK_TARGET

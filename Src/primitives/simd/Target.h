@@ -46,6 +46,12 @@ inline F32 LoadBytesAsFloats(const void* source) {
     return ToFloat(LoadBytes(source));
 }
 
+/// 2 x kLanes interleaved lanes to those on even and those on odd places.
+inline void LoadLanePairs(const void* source, I32& even, I32& odd) {
+    const auto* lanes = static_cast<const int32_t*>(source);
+    SeparateLanes(LoadInts(lanes), LoadInts(lanes + kLanes), even, odd);
+}
+
 /// Limits x from above, leaving NaN to the conversion that follows, which turns it into INT32_MIN.
 inline F32 AtMost(F32 limit, F32 x) {
     return Min(limit, x);

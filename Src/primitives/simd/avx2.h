@@ -243,4 +243,47 @@ inline I32 ShiftInLane(I32 before, I32 lanes) {
     return {_mm256_alignr_epi8(lanes.v, across, 12)};
 }
 
+/// The high 16 bits of the product of each 16-bit half with its counterpart, both without sign.
+inline I32 MultiplyHalvesHigh(I32 a, I32 b) {
+    return {_mm256_mulhi_epu16(a.v, b.v)};
+}
+/// The mean of each 16-bit half and its counterpart, both without sign, rounded up.
+inline I32 AverageHalves(I32 a, I32 b) {
+    return {_mm256_avg_epu16(a.v, b.v)};
+}
+/// The lesser of each 16-bit half and its counterpart; both are below 32768.
+inline I32 MinHalves(I32 a, I32 b) {
+    return {_mm256_min_epi16(a.v, b.v)};
+}
+/// Swaps the two bytes of each 16-bit half.
+inline I32 SwapBytes(I32 a) {
+    const __m128i order = _mm_setr_epi8(1, 0, 3, 2, 5, 4, 7, 6, 9, 8, 11, 10, 13, 12, 15, 14);
+    return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
+}
+/// Reverses the four 16-bit halves of each pair of lanes.
+inline I32 ReverseHalves(I32 a) {
+    const __m128i order = _mm_setr_epi8(6, 7, 4, 5, 2, 3, 0, 1, 14, 15, 12, 13, 10, 11, 8, 9);
+    return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
+}
+/// 2 x kLanes bytes, each to a 16-bit half.
+inline I32 LoadBytesAsHalves(const void* source) {
+    return {_mm256_cvtepu8_epi16(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
+}
+/// The 16-bit halves of two vectors to bytes in their order; the halves are below 32768 and saturate.
+inline I32 PackHalves(I32 a, I32 b) {
+    return {_mm256_permute4x64_epi64(_mm256_packus_epi16(a.v, b.v), _MM_SHUFFLE(3, 1, 2, 0))};
+}
+/// The lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
+    const __m256i bytes = _mm256_packus_epi16(_mm256_packs_epi32(a.v, b.v), _mm256_packs_epi32(c.v, d.v));
+    return {_mm256_permutevar8x32_epi32(bytes, _mm256_setr_epi32(0, 4, 1, 5, 2, 6, 3, 7))};
+}
+/// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
+inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
+    const __m256i outer = _mm256_unpacklo_epi32(even.v, odd.v), inner = _mm256_unpackhi_epi32(even.v, odd.v);
+    auto* lanes = static_cast<int32_t*>(destination);
+    Store(lanes, I32{_mm256_permute2x128_si256(outer, inner, 0x20)});
+    Store(lanes + kLanes, I32{_mm256_permute2x128_si256(outer, inner, 0x31)});
+}
+
 } // namespace PK::avx2

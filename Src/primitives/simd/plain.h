@@ -273,4 +273,70 @@ inline I32 ShiftInLane(I32 before, I32 lanes) {
     return {{before.lane[kLanes - 1], lanes.lane[0], lanes.lane[1], lanes.lane[2]}};
 }
 
+/// The operation on the two 16-bit halves of each lane.
+template <class Operation>
+inline I32 MapHalves(I32 a, I32 b, Operation operation) {
+    return Map<I32>(a, b, [operation](uint32_t x, uint32_t y) {
+        return (operation(x & 0xffff, y & 0xffff) & 0xffff) | operation(x >> 16, y >> 16) << 16;
+    });
+}
+/// The high 16 bits of the product of each 16-bit half with its counterpart, both without sign.
+inline I32 MultiplyHalvesHigh(I32 a, I32 b) {
+    return MapHalves(a, b, [](uint32_t x, uint32_t y) { return x * y >> 16; });
+}
+/// The mean of each 16-bit half and its counterpart, both without sign, rounded up.
+inline I32 AverageHalves(I32 a, I32 b) {
+    return MapHalves(a, b, [](uint32_t x, uint32_t y) { return (x + y + 1) >> 1; });
+}
+/// The lesser of each 16-bit half and its counterpart; both are below 32768.
+inline I32 MinHalves(I32 a, I32 b) {
+    return MapHalves(a, b, [](uint32_t x, uint32_t y) { return x < y ? x : y; });
+}
+/// Swaps the two bytes of each 16-bit half.
+inline I32 SwapBytes(I32 a) {
+    return (ShiftLeft<8>(a) & Ints(static_cast<int32_t>(0xff00ff00))) | (ShiftRight<8>(a) & Ints(0x00ff00ff));
+}
+/// Reverses the four 16-bit halves of each pair of lanes.
+inline I32 ReverseHalves(I32 a) {
+    const I32 swapped = ShiftLeft<16>(a) | ShiftRight<16>(a);
+    return ShufflePixel<1, 0, 3, 2>(swapped);
+}
+/// 2 x kLanes bytes, each to a 16-bit half.
+inline I32 LoadBytesAsHalves(const void* source) {
+    uint8_t bytes[2 * kLanes];
+    std::memcpy(bytes, source, sizeof bytes);
+    I32 result;
+    for (int i = 0; i < kLanes; ++i)
+        result.lane[i] = static_cast<uint32_t>(bytes[2 * i] | bytes[2 * i + 1] << 16);
+    return result;
+}
+/// The 16-bit halves of two vectors to bytes in their order; the halves are below 32768 and saturate.
+inline I32 PackHalves(I32 a, I32 b) {
+    const auto pack = [](uint32_t x) { return Saturate(x & 0xffff, 255) | Saturate(x >> 16, 255) << 8; };
+    I32 result;
+    for (int i = 0; i < kLanes; ++i) {
+        const uint32_t* pair = i < kLanes / 2 ? a.lane + 2 * i : b.lane + 2 * i - kLanes;
+        result.lane[i] = pack(pair[0]) | pack(pair[1]) << 16;
+    }
+    return result;
+}
+/// The lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
+    I32 result;
+    StoreBytes(result.lane, a);
+    StoreBytes(result.lane + 1, b);
+    StoreBytes(result.lane + 2, c);
+    StoreBytes(result.lane + 3, d);
+    return result;
+}
+/// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
+inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
+    uint32_t lanes[2 * kLanes];
+    for (int i = 0; i < kLanes; ++i) {
+        lanes[2 * i] = even.lane[i];
+        lanes[2 * i + 1] = odd.lane[i];
+    }
+    std::memcpy(destination, lanes, sizeof lanes);
+}
+
 } // namespace PK::plain

@@ -262,4 +262,48 @@ inline I32 ShiftInLane(I32 before, I32 lanes) {
     return {_mm_or_si128(_mm_slli_si128(lanes.v, 4), _mm_srli_si128(before.v, 12))};
 }
 
+/// The high 16 bits of the product of each 16-bit half with its counterpart, both without sign.
+inline I32 MultiplyHalvesHigh(I32 a, I32 b) {
+    return {_mm_mulhi_epu16(a.v, b.v)};
+}
+/// The mean of each 16-bit half and its counterpart, both without sign, rounded up.
+inline I32 AverageHalves(I32 a, I32 b) {
+    return {_mm_avg_epu16(a.v, b.v)};
+}
+/// The lesser of each 16-bit half and its counterpart; both are below 32768.
+inline I32 MinHalves(I32 a, I32 b) {
+    return {_mm_min_epi16(a.v, b.v)};
+}
+/// Swaps the two bytes of each 16-bit half.
+inline I32 SwapBytes(I32 a) {
+#ifdef __SSSE3__
+    return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(1, 0, 3, 2, 5, 4, 7, 6, 9, 8, 11, 10, 13, 12, 15, 14))};
+#else
+    return {_mm_or_si128(_mm_slli_epi16(a.v, 8), _mm_srli_epi16(a.v, 8))};
+#endif
+}
+/// Reverses the four 16-bit halves of each pair of lanes.
+inline I32 ReverseHalves(I32 a) {
+    const __m128i low = _mm_shufflelo_epi16(a.v, _MM_SHUFFLE(0, 1, 2, 3));
+    return {_mm_shufflehi_epi16(low, _MM_SHUFFLE(0, 1, 2, 3))};
+}
+/// 2 x kLanes bytes, each to a 16-bit half.
+inline I32 LoadBytesAsHalves(const void* source) {
+    return {_mm_unpacklo_epi8(_mm_loadl_epi64(static_cast<const __m128i*>(source)), _mm_setzero_si128())};
+}
+/// The 16-bit halves of two vectors to bytes in their order; the halves are below 32768 and saturate.
+inline I32 PackHalves(I32 a, I32 b) {
+    return {_mm_packus_epi16(a.v, b.v)};
+}
+/// The lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
+    return {_mm_packus_epi16(_mm_packs_epi32(a.v, b.v), _mm_packs_epi32(c.v, d.v))};
+}
+/// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
+inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
+    auto* lanes = static_cast<int32_t*>(destination);
+    Store(lanes, I32{_mm_unpacklo_epi32(even.v, odd.v)});
+    Store(lanes + kLanes, I32{_mm_unpackhi_epi32(even.v, odd.v)});
+}
+
 } // namespace PK::PK_TARGET
