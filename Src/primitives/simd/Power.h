@@ -5,17 +5,37 @@
 // A float has 24 bits and a double 53, so the work runs in double and is rounded to float once, at the end:
 // overflow, underflow and denormal results come out as IEEE rounding makes them. All targets run the same
 // double operations in the same order and so give the same bits.
+//
+// The functions take several vectors at once: each is a chain of some forty steps that wait for each other,
+// and a processor looks ahead far enough to fill the waits only if the steps of different chains stand close
+// together. Three, the colour channels of a group of pixels, run at 1.4 times the rate of one after the
+// other.
 
 #include "primitives/simd/Target.h"
 
 namespace PK::PK_TARGET {
 
+/// coefficients[kFirst] + coefficients[kFirst + 1] x and so on, kCount terms; powers are x, x^2, x^4. Halves
+/// are evaluated apart, which makes the chain of dependent operations as short as can be.
+template <int kFirst, int kCount, int kTotal>
+inline F64 PolynomialPart(const F64* powers, const double (&coefficients)[kTotal]) {
+    if constexpr (kCount == 1) {
+        return Doubles(coefficients[kFirst]);
+    } else {
+        constexpr int kLevel = kCount > 4 ? 2 : kCount > 2 ? 1 : 0;
+        constexpr int kLow = 1 << kLevel;
+        return PolynomialPart<kFirst, kLow>(powers, coefficients) +
+               PolynomialPart<kFirst + kLow, kCount - kLow>(powers, coefficients) * powers[kLevel];
+    }
+}
+
 /// coefficients[0] + coefficients[1] x + coefficients[2] x^2 and so on.
-template <int kCount>
-inline F64 Polynomial(F64 x, const double (&coefficients)[kCount]) {
-    F64 sum = Doubles(coefficients[kCount - 1]);
-    for (int i = kCount - 2; i >= 0; --i) sum = sum * x + Doubles(coefficients[i]);
-    return sum;
+template <int kTerms>
+inline F64 Polynomial(F64 x, const double (&coefficients)[kTerms]) {
+    static_assert(kTerms <= 8);
+    const F64 square = x * x;
+    const F64 powers[] = {x, square, square * square};
+    return PolynomialPart<0, kTerms>(powers, coefficients);
 }
 
 /// log2((1 + s) / (1 - s)) / s in powers of s^2, minimax for |s| <= (sqrt(2) - 1) / (sqrt(2) + 1): relative
@@ -34,40 +54,63 @@ inline constexpr double kExp2Coefficients[] = {1.0,
                                                0x1.445c84091a5ecp-13,
                                                0x1.fde5fe224f348p-17};
 
-/// The binary logarithm of a positive normal number; 0 and infinity give about -1023 and 1024.
-inline F64 Log2(F64 x) {
+/// The binary logarithm of positive normal numbers, in place; 0 and infinity give about -1023 and 1024.
+template <int kCount>
+inline void Log2(F64 (&x)[kCount]) {
     constexpr int64_t kOne = 0x3ff0000000000000;
     constexpr int64_t kRootHalf = 0x3fe6a09e667f3bcd; // sqrt(1/2), where mantissas begin
     constexpr int64_t kTwoTo52 = 0x4330000000000000;  // an integer added to these bits is added to 2^52
     constexpr int64_t kFraction = 0x000fffffffffffff;
-    const I64 shifted = Bits(x) + Longs(kOne - kRootHalf);
-    const F64 exponent = FromBits(ShiftRight<52>(shifted) + Longs(kTwoTo52)) - Doubles(0x1p52 + 1023);
-    const F64 mantissa = FromBits((shifted & Longs(kFraction)) + Longs(kRootHalf));
-    const F64 s = (mantissa - Doubles(1)) / (mantissa + Doubles(1));
-    return exponent + s * Polynomial(s * s, kLog2Coefficients);
+    F64 exponent[kCount], s[kCount], factor[kCount];
+    for (int i = 0; i < kCount; ++i) {
+        const I64 shifted = Bits(x[i]) + Longs(kOne - kRootHalf);
+        exponent[i] = FromBits(ShiftRight<52>(shifted) + Longs(kTwoTo52)) - Doubles(0x1p52 + 1023);
+        const F64 mantissa = FromBits((shifted & Longs(kFraction)) + Longs(kRootHalf));
+        s[i] = (mantissa - Doubles(1)) / (mantissa + Doubles(1));
+    }
+    for (int i = 0; i < kCount; ++i) factor[i] = Polynomial(s[i] * s[i], kLog2Coefficients);
+    for (int i = 0; i < kCount; ++i) x[i] = exponent[i] + s[i] * factor[i];
 }
 
-/// 2^x for |x| <= 1000.
-inline F64 Exp2(F64 x) {
+/// 2^x, in place, for |x| <= 1000.
+template <int kCount>
+inline void Exp2(F64 (&x)[kCount]) {
     const F64 shifter = Doubles(0x1.8p52); // adding it leaves the nearest integer in the low bits
-    const F64 shifted = x + shifter;
-    const F64 power = Polynomial(x - (shifted - shifter), kExp2Coefficients);
-    return FromBits(Bits(power) + ShiftLeft<52>(Bits(shifted)));
+    F64 shifted[kCount];
+    for (int i = 0; i < kCount; ++i) {
+        shifted[i] = x[i] + shifter;
+        x[i] = x[i] - (shifted[i] - shifter);
+    }
+    for (int i = 0; i < kCount; ++i) x[i] = Polynomial(x[i], kExp2Coefficients);
+    for (int i = 0; i < kCount; ++i) x[i] = FromBits(Bits(x[i]) + ShiftLeft<52>(Bits(shifted[i])));
 }
 
-/// x^exponent for x >= 0. The error is below 0.501 units in the last place. 0, infinity and NaN are returned
-/// as they are, which is right for a positive exponent.
-inline F32 Power(F32 x, F64 exponent) {
-    const F64 logarithm = exponent * Log2(ToDouble(x));
-    const F64 bounded = Max(Doubles(-200), Min(Doubles(200), logarithm)); // beyond all floats
-    const I32 isOrdinary = Less(Floats(0), x) & Less(x, Floats(__builtin_inff()));
-    return Select(isOrdinary, ToFloat(Exp2(bounded)), x + x);
+/// x^exponent, in place, for x >= 0, with an error below 0.501 units in the last place. 0, infinity and NaN
+/// stay as they are, which is right for positive exponents.
+template <int kCount>
+inline void Power(F32 (&x)[kCount], F64 exponent) {
+    F64 power[kCount];
+    for (int i = 0; i < kCount; ++i) power[i] = ToDouble(x[i]);
+    Log2(power);
+    for (int i = 0; i < kCount; ++i) // 2^200 and 2^-200 are beyond all floats
+        power[i] = Max(Doubles(-200), Min(Doubles(200), exponent * power[i]));
+    Exp2(power);
+    for (int i = 0; i < kCount; ++i) {
+        const I32 isOrdinary = Less(Floats(0), x[i]) & Less(x[i], Floats(__builtin_inff()));
+        x[i] = Select(isOrdinary, ToFloat(power[i]), x[i] + x[i]);
+    }
 }
 
-/// sign(x) |x|^exponent, with a positive exponent.
-inline F32 SignedPower(F32 x, F64 exponent) {
-    const I32 sign = Bits(x) & Ints(INT32_MIN);
-    return FromBits(Bits(Power(FromBits(Bits(x) ^ sign), exponent)) | sign);
+/// sign(x) |x|^exponent, in place, with a positive exponent.
+template <int kCount>
+inline void SignedPower(F32 (&x)[kCount], F64 exponent) {
+    I32 sign[kCount];
+    for (int i = 0; i < kCount; ++i) {
+        sign[i] = Bits(x[i]) & Ints(INT32_MIN);
+        x[i] = FromBits(Bits(x[i]) ^ sign[i]);
+    }
+    Power(x, exponent);
+    for (int i = 0; i < kCount; ++i) x[i] = FromBits(Bits(x[i]) | sign[i]);
 }
 
 } // namespace PK::PK_TARGET
