@@ -286,4 +286,68 @@ inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     Store(lanes + kLanes, I32{_mm256_permute2x128_si256(outer, inner, 0x31)});
 }
 
+inline I32 Lookup(const uint32_t* table, I32 index) {
+    return {_mm256_i32gather_epi32(reinterpret_cast<const int*>(table), index.v, 4)};
+}
+
+/// Two registers, so that there is a double for each float lane: `low` for the first half of the lanes.
+struct F64 {
+    __m256d low, high;
+};
+
+struct I64 {
+    __m256i low, high;
+};
+
+inline F64 Doubles(double x) {
+    return {_mm256_set1_pd(x), _mm256_set1_pd(x)};
+}
+inline I64 Longs(int64_t x) {
+    return {_mm256_set1_epi64x(x), _mm256_set1_epi64x(x)};
+}
+inline F64 operator+(F64 a, F64 b) {
+    return {_mm256_add_pd(a.low, b.low), _mm256_add_pd(a.high, b.high)};
+}
+inline F64 operator-(F64 a, F64 b) {
+    return {_mm256_sub_pd(a.low, b.low), _mm256_sub_pd(a.high, b.high)};
+}
+inline F64 operator*(F64 a, F64 b) {
+    return {_mm256_mul_pd(a.low, b.low), _mm256_mul_pd(a.high, b.high)};
+}
+inline F64 operator/(F64 a, F64 b) {
+    return {_mm256_div_pd(a.low, b.low), _mm256_div_pd(a.high, b.high)};
+}
+inline F64 Min(F64 a, F64 b) {
+    return {_mm256_min_pd(a.low, b.low), _mm256_min_pd(a.high, b.high)};
+}
+inline F64 Max(F64 a, F64 b) {
+    return {_mm256_max_pd(a.low, b.low), _mm256_max_pd(a.high, b.high)};
+}
+inline I64 operator+(I64 a, I64 b) {
+    return {_mm256_add_epi64(a.low, b.low), _mm256_add_epi64(a.high, b.high)};
+}
+inline I64 operator&(I64 a, I64 b) {
+    return {_mm256_and_si256(a.low, b.low), _mm256_and_si256(a.high, b.high)};
+}
+template <int kBits>
+inline I64 ShiftLeft(I64 a) {
+    return {_mm256_slli_epi64(a.low, kBits), _mm256_slli_epi64(a.high, kBits)};
+}
+template <int kBits>
+inline I64 ShiftRight(I64 a) {
+    return {_mm256_srli_epi64(a.low, kBits), _mm256_srli_epi64(a.high, kBits)};
+}
+inline I64 Bits(F64 a) {
+    return {_mm256_castpd_si256(a.low), _mm256_castpd_si256(a.high)};
+}
+inline F64 FromBits(I64 a) {
+    return {_mm256_castsi256_pd(a.low), _mm256_castsi256_pd(a.high)};
+}
+inline F64 ToDouble(F32 a) {
+    return {_mm256_cvtps_pd(_mm256_castps256_ps128(a.v)), _mm256_cvtps_pd(_mm256_extractf128_ps(a.v, 1))};
+}
+inline F32 ToFloat(F64 a) {
+    return {_mm256_set_m128(_mm256_cvtpd_ps(a.high), _mm256_cvtpd_ps(a.low))};
+}
+
 } // namespace PK::avx2

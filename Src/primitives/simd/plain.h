@@ -339,4 +339,68 @@ inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     std::memcpy(destination, lanes, sizeof lanes);
 }
 
+inline I32 Lookup(const uint32_t* table, I32 index) {
+    return Map<I32>(index, [table](uint32_t i) { return table[i]; });
+}
+
+struct F64 {
+    double lane[kLanes];
+};
+
+struct I64 {
+    uint64_t lane[kLanes];
+};
+
+inline F64 Doubles(double x) {
+    return {{x, x, x, x}};
+}
+inline I64 Longs(int64_t x) {
+    const auto bits = static_cast<uint64_t>(x);
+    return {{bits, bits, bits, bits}};
+}
+inline F64 operator+(F64 a, F64 b) {
+    return Map<F64>(a, b, [](double x, double y) { return x + y; });
+}
+inline F64 operator-(F64 a, F64 b) {
+    return Map<F64>(a, b, [](double x, double y) { return x - y; });
+}
+inline F64 operator*(F64 a, F64 b) {
+    return Map<F64>(a, b, [](double x, double y) { return x * y; });
+}
+inline F64 operator/(F64 a, F64 b) {
+    return Map<F64>(a, b, [](double x, double y) { return x / y; });
+}
+inline F64 Min(F64 a, F64 b) {
+    return Map<F64>(a, b, [](double x, double y) { return x < y ? x : y; });
+}
+inline F64 Max(F64 a, F64 b) {
+    return Map<F64>(a, b, [](double x, double y) { return x > y ? x : y; });
+}
+inline I64 operator+(I64 a, I64 b) {
+    return Map<I64>(a, b, [](uint64_t x, uint64_t y) { return x + y; });
+}
+inline I64 operator&(I64 a, I64 b) {
+    return Map<I64>(a, b, [](uint64_t x, uint64_t y) { return x & y; });
+}
+template <int kBits>
+inline I64 ShiftLeft(I64 a) {
+    return Map<I64>(a, [](uint64_t x) { return x << kBits; });
+}
+template <int kBits>
+inline I64 ShiftRight(I64 a) {
+    return Map<I64>(a, [](uint64_t x) { return x >> kBits; });
+}
+inline I64 Bits(F64 a) {
+    return LoadVector<I64>(&a);
+}
+inline F64 FromBits(I64 a) {
+    return LoadVector<F64>(&a);
+}
+inline F64 ToDouble(F32 a) {
+    return Map<F64>(a, [](float x) { return static_cast<double>(x); });
+}
+inline F32 ToFloat(F64 a) {
+    return Map<F32>(a, [](double x) { return static_cast<float>(x); });
+}
+
 } // namespace PK::plain

@@ -306,4 +306,71 @@ inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     Store(lanes + kLanes, I32{_mm_unpackhi_epi32(even.v, odd.v)});
 }
 
+inline I32 Lookup(const uint32_t* table, I32 index) {
+    uint32_t i[kLanes];
+    Store(i, index);
+    return PixelInts(static_cast<int32_t>(table[i[0]]), static_cast<int32_t>(table[i[1]]),
+                     static_cast<int32_t>(table[i[2]]), static_cast<int32_t>(table[i[3]]));
+}
+
+/// Two registers, so that there is a double for each float lane: `low` for the first half of the lanes.
+struct F64 {
+    __m128d low, high;
+};
+
+struct I64 {
+    __m128i low, high;
+};
+
+inline F64 Doubles(double x) {
+    return {_mm_set1_pd(x), _mm_set1_pd(x)};
+}
+inline I64 Longs(int64_t x) {
+    return {_mm_set1_epi64x(x), _mm_set1_epi64x(x)};
+}
+inline F64 operator+(F64 a, F64 b) {
+    return {_mm_add_pd(a.low, b.low), _mm_add_pd(a.high, b.high)};
+}
+inline F64 operator-(F64 a, F64 b) {
+    return {_mm_sub_pd(a.low, b.low), _mm_sub_pd(a.high, b.high)};
+}
+inline F64 operator*(F64 a, F64 b) {
+    return {_mm_mul_pd(a.low, b.low), _mm_mul_pd(a.high, b.high)};
+}
+inline F64 operator/(F64 a, F64 b) {
+    return {_mm_div_pd(a.low, b.low), _mm_div_pd(a.high, b.high)};
+}
+inline F64 Min(F64 a, F64 b) {
+    return {_mm_min_pd(a.low, b.low), _mm_min_pd(a.high, b.high)};
+}
+inline F64 Max(F64 a, F64 b) {
+    return {_mm_max_pd(a.low, b.low), _mm_max_pd(a.high, b.high)};
+}
+inline I64 operator+(I64 a, I64 b) {
+    return {_mm_add_epi64(a.low, b.low), _mm_add_epi64(a.high, b.high)};
+}
+inline I64 operator&(I64 a, I64 b) {
+    return {_mm_and_si128(a.low, b.low), _mm_and_si128(a.high, b.high)};
+}
+template <int kBits>
+inline I64 ShiftLeft(I64 a) {
+    return {_mm_slli_epi64(a.low, kBits), _mm_slli_epi64(a.high, kBits)};
+}
+template <int kBits>
+inline I64 ShiftRight(I64 a) {
+    return {_mm_srli_epi64(a.low, kBits), _mm_srli_epi64(a.high, kBits)};
+}
+inline I64 Bits(F64 a) {
+    return {_mm_castpd_si128(a.low), _mm_castpd_si128(a.high)};
+}
+inline F64 FromBits(I64 a) {
+    return {_mm_castsi128_pd(a.low), _mm_castsi128_pd(a.high)};
+}
+inline F64 ToDouble(F32 a) {
+    return {_mm_cvtps_pd(a.v), _mm_cvtps_pd(_mm_movehl_ps(a.v, a.v))};
+}
+inline F32 ToFloat(F64 a) {
+    return {_mm_movelh_ps(_mm_cvtpd_ps(a.low), _mm_cvtpd_ps(a.high))};
+}
+
 } // namespace PK::PK_TARGET
