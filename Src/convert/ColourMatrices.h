@@ -103,7 +103,13 @@ inline Channels ToFloat(IntChannels codes) {
     return {ToFloat(codes.c0), ToFloat(codes.c1), ToFloat(codes.c2), ToFloat(codes.c3)};
 }
 
-/// V, U, Y, A codes as floats, with chroma counted from 128 and luma from 16.
+/// V, U, Y, A codes with chroma counted from 128 and luma from 16.
+inline Channels RemoveOffsets(Channels vuya) {
+    return {vuya.c0 - Floats(128), vuya.c1 - Floats(128), vuya.c2 - Floats(16), vuya.c3};
+}
+
+/// The same from integers, for results that are codes again: faster, and all that can differ is the sign of a
+/// zero when rounding is set downwards.
 inline Channels RemoveOffsets(IntChannels vuya) {
     return ToFloat(IntChannels{vuya.c0 - Ints(128), vuya.c1 - Ints(128), vuya.c2 - Ints(16), vuya.c3});
 }

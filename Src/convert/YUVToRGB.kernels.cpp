@@ -27,7 +27,7 @@ struct OpaqueYUVToRGB8 : PixelGroup<4, 4> {
 template <const YUVToRGBMatrix& kMatrix>
 struct YUV8ToRGBFloat : PixelGroup<4, 16> {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        Channels bgra = YUVToRGB<kMatrix>(RemoveOffsets(LoadByteChannels(source)));
+        Channels bgra = YUVToRGB<kMatrix>(RemoveOffsets(ToFloat(LoadByteChannels(source))));
         bgra.c3 = bgra.c3 * Floats(kReciprocal255);
         StoreFloatChannels(destination, bgra);
     }
@@ -36,7 +36,7 @@ struct YUV8ToRGBFloat : PixelGroup<4, 16> {
 template <const YUVToRGBMatrix& kMatrix>
 struct OpaqueYUV8ToRGBFloat : PixelGroup<4, 16> {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        Channels bgra = YUVToRGB<kMatrix>(RemoveOffsets(LoadByteChannels(source)));
+        Channels bgra = YUVToRGB<kMatrix>(RemoveOffsets(ToFloat(LoadByteChannels(source))));
         bgra.c3 = Floats(1);
         StoreFloatChannels(destination, bgra);
     }
