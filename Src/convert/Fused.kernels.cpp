@@ -8,14 +8,36 @@
 namespace PK::PK_TARGET {
 namespace {
 
+/// The matrix on bytes stays within bytes, so that nothing needs clamping here.
 template <const RGBToYUVMatrix& kMatrix>
-struct OpaqueRGB {
-    static I32 Pixels(const uint8_t* source) { return RGB8ToYUV8<kMatrix>(LoadByteChannels(source)); }
-};
+inline YUVPixels ToYUV(IntChannels bgra) {
+    const Channels vuya = AddOffsets(RGBToYUV<kMatrix>(ToFloat(bgra)));
+    return {Nearest(vuya.c1) | ShiftLeft<16>(Nearest(vuya.c0)), Nearest(vuya.c2)};
+}
 
 template <const RGBToYUVMatrix& kMatrix>
+struct OpaqueRGB {
+    static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
+        first = ToYUV<kMatrix>(LoadByteChannels(source));
+        second = ToYUV<kMatrix>(LoadByteChannels(source + 4 * kLanes));
+    }
+};
+
+/// Straight alpha is multiplied in on the way.
+template <const RGBToYUVMatrix& kMatrix>
 struct StraightRGB {
-    static I32 Pixels(const uint8_t* source) { return PremultiplyVUYA(OpaqueRGB<kMatrix>::Pixels(source)); }
+    static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
+        OpaqueRGB<kMatrix>::Load(source, first, second);
+        const I32 firstAlpha = ShiftRight<24>(LoadInts(source));
+        const I32 secondAlpha = ShiftRight<24>(LoadInts(source + 4 * kLanes));
+        first.chroma = ScaleHalves(first.chroma, InBothHalves(firstAlpha), ChromaZero());
+        second.chroma = ScaleHalves(second.chroma, InBothHalves(secondAlpha), ChromaZero());
+
+        const I32 alphas = firstAlpha | ShiftLeft<16>(secondAlpha);
+        const I32 lumas = ScaleHalves(first.luma | ShiftLeft<16>(second.luma), alphas, LumaZero());
+        first.luma = lumas & Ints(0xffff);
+        second.luma = ShiftRight<16>(lumas);
+    }
 };
 
 } // namespace

@@ -11,7 +11,7 @@ namespace {
 struct PremultiplyBGRA8 : PixelGroup<4, 4> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 pixels = LoadInts(source);
-        const I32 colour = ScaleBytes<0, 0>(pixels, InBothHalves(ShiftRight<24>(pixels)));
+        const I32 colour = ScaleBytes(pixels, ShiftRight<24>(pixels));
         Store(destination, Select(Ints(0x00ffffff), colour, pixels));
     }
 };
@@ -19,14 +19,20 @@ struct PremultiplyBGRA8 : PixelGroup<4, 4> {
 struct PremultiplyARGB8 : PixelGroup<4, 4> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 pixels = LoadInts(source);
-        const I32 colour = ScaleBytes<0, 0>(pixels, InBothHalves(pixels & Ints(0xff)));
+        const I32 colour = ScaleBytes(pixels, pixels & Ints(0xff));
         Store(destination, Select(Ints(0xff), pixels, colour));
     }
 };
 
+/// Chroma is scaled about 128 and luma about 16.
 struct PremultiplyVUYA8 : PixelGroup<4, 4> {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        Store(destination, PremultiplyVUYA(LoadInts(source)));
+        const I32 pixels = LoadInts(source);
+        const I32 low = Ints(0x00ff00ff);
+        const I32 alpha = InBothHalves(ShiftRight<24>(pixels));
+        const I32 vAndY = ScaleHalves(pixels & low, alpha, Ints(0x00100080));
+        const I32 u = ScaleHalves(ShiftRight<8>(pixels) & low, alpha, ChromaZero());
+        Store(destination, Select(Ints(0x00ffffff), vAndY | ShiftLeft<8>(u), pixels));
     }
 };
 
