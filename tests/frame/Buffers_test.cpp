@@ -228,6 +228,10 @@ TEST(Buffers, PlaneOffsetsWrapIn32Bits) {
     ASSERT_EQ(PK_GetPlanarBuffers(&byte, 0, 65536, 32768, planes, rowBytes), PK_Success);
     EXPECT_EQ(static_cast<int64_t>(Address(planes[1]) - Address(&byte)), -2147483648LL);
     EXPECT_EQ(static_cast<int64_t>(Address(planes[2]) - Address(&byte)), -2147483648LL + 536870912);
+    // Y takes 2^32 bytes, which is 0; U and V take 32768 x 65536, which is -2^31 before it is halved
+    ASSERT_EQ(PK_GetPlanarBuffers(&byte, 0, 65536, 65536, planes, rowBytes), PK_Success);
+    EXPECT_EQ(planes[1], &byte);
+    EXPECT_EQ(static_cast<int64_t>(Address(planes[2]) - Address(&byte)), -1073741824);
 }
 
 TEST(Buffers, PlanesOfImpossibleArgumentsAreRefused) {

@@ -6,7 +6,10 @@
 
 #include <gtest/gtest.h>
 #include <string>
+#include <sys/ptrace.h>
+#include <sys/wait.h>
 #include <thread>
+#include <unistd.h>
 
 using namespace zebcore;
 
@@ -81,6 +84,22 @@ TEST_F(HostTrace, TellsAnErrorAndReturns) {
                        "error 7 (category 8, level 1): No key\n");
     config::ThrowError(0, "quiet", 7, 8, false, none, none, none, none);
     EXPECT_EQ(sTraced.find("quiet"), std::string::npos);
+}
+
+TEST(HostDebugger, IsSeenOnceItIsThere) {
+    constexpr int kSeen = 0, kMissed = 1, kImagined = 2, kForbidden = 3;
+    const pid_t child = fork();
+    ASSERT_GE(child, 0);
+    if (child == 0) {
+        if (debug::IsDebuggerAttached()) _exit(kImagined);
+        if (ptrace(PTRACE_TRACEME, 0, nullptr, nullptr) != 0) _exit(kForbidden);
+        _exit(debug::IsDebuggerAttached() ? kSeen : kMissed);
+    }
+    int status = 0;
+    ASSERT_EQ(waitpid(child, &status, 0), child);
+    ASSERT_TRUE(WIFEXITED(status));
+    if (WEXITSTATUS(status) == kForbidden) GTEST_SKIP() << "this system lets nobody trace";
+    EXPECT_EQ(WEXITSTATUS(status), kSeen);
 }
 
 TEST(HostThreads, HaveDifferentNumbers) {
