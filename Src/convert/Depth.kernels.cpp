@@ -77,10 +77,13 @@ struct ExpandWords : SampleGroup<2, 4> {
 };
 
 /// Truncated(c x 32768 + 0.5), c limited to 0 and 1.
-struct PackWords : SampleGroup<4, 2> {
+inline I32 RoundToWords(const uint8_t* values) {
+    return Truncate(LimitToUnit(LoadFloats(values)) * Floats(32768) + Floats(0.5f));
+}
+
+struct PackWords : SampleGroup<4, 2, 1, 2> {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        const F32 values = LimitToUnit(LoadFloats(source));
-        StoreWords(destination, Truncate(values * Floats(32768) + Floats(0.5f)));
+        Store(destination, PackLanesToHalves(RoundToWords(source), RoundToWords(source + sizeof(F32))));
     }
 };
 

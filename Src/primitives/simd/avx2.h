@@ -278,6 +278,10 @@ inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
     const __m256i bytes = _mm256_packus_epi16(_mm256_packs_epi32(a.v, b.v), _mm256_packs_epi32(c.v, d.v));
     return {_mm256_permutevar8x32_epi32(bytes, _mm256_setr_epi32(0, 4, 1, 5, 2, 6, 3, 7))};
 }
+/// The lanes of two vectors, each from 0 to 65535, to 16-bit halves in their order.
+inline I32 PackLanesToHalves(I32 a, I32 b) {
+    return {_mm256_permute4x64_epi64(_mm256_packus_epi32(a.v, b.v), _MM_SHUFFLE(3, 1, 2, 0))};
+}
 /// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
 inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     const __m256i outer = _mm256_unpacklo_epi32(even.v, odd.v), inner = _mm256_unpackhi_epi32(even.v, odd.v);

@@ -329,6 +329,13 @@ inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
     StoreBytes(result.lane + 3, d);
     return result;
 }
+/// The lanes of two vectors, each from 0 to 65535, to 16-bit halves in their order.
+inline I32 PackLanesToHalves(I32 a, I32 b) {
+    I32 result;
+    StoreWords(result.lane, a);
+    StoreWords(result.lane + kLanes / 2, b);
+    return result;
+}
 /// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
 inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     uint32_t lanes[2 * kLanes];

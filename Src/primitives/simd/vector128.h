@@ -299,6 +299,16 @@ inline I32 PackHalves(I32 a, I32 b) {
 inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
     return {_mm_packus_epi16(_mm_packs_epi32(a.v, b.v), _mm_packs_epi32(c.v, d.v))};
 }
+/// The lanes of two vectors, each from 0 to 65535, to 16-bit halves in their order.
+inline I32 PackLanesToHalves(I32 a, I32 b) {
+#ifdef __SSE4_1__
+    return {_mm_packus_epi32(a.v, b.v)};
+#else
+    // Sign-extending the low halves first makes the saturating pack exact.
+    return {_mm_packs_epi32(_mm_srai_epi32(_mm_slli_epi32(a.v, 16), 16),
+                            _mm_srai_epi32(_mm_slli_epi32(b.v, 16), 16))};
+#endif
+}
 /// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
 inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     auto* lanes = static_cast<int32_t*>(destination);
