@@ -8,7 +8,10 @@ namespace {
 
 /// The chroma of 8-bit pixels, U in the low and V in the high half.
 inline I32 ChromaOfPixels(I32 vuya) {
-    return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
+    if constexpr (kHasByteShuffle)
+        return HalvesAt<1, 0, 5, 4, 9, 8, 13, 12>(vuya) & Ints(0x00ff00ff);
+    else
+        return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
 }
 
 /// (c[i-1] + 2 c[i] + c[i+1] + 2) >> 2. At the row's first pixel c[i-1] is c[i].
@@ -47,9 +50,8 @@ struct Downsample32f : Neighbours<1, 16, 1, 0> {
         const F32 even = LoadFloatBlocks(source, 32);
         const F32 odd = LoadFloatBlocks(source + 16, 32);
         const F32 vu = (previous + Floats(2) * even + odd) * Floats(0.25f);
-        const F32 luma =
-            Select(PixelInts(0, -1, 0, 0), ShufflePixel<2, 2, 2, 2>(even), ShufflePixel<2, 2, 2, 2>(odd));
-        Store(destination, Select(PixelInts(-1, 0, -1, 0), ShufflePixel<1, 1, 0, 0>(vu), luma));
+        const F32 luma = BlendBlocks<0b0010>(ShufflePixel<2, 2, 2, 2>(even), ShufflePixel<2, 2, 2, 2>(odd));
+        Store(destination, BlendBlocks<0b0101>(ShufflePixel<1, 1, 0, 0>(vu), luma));
     }
 
     /// A pixel that makes a pair alone: its chroma is not filtered, and the second luma is 0.
@@ -73,7 +75,7 @@ void DownsampleRow(const void* source, void* destination, int32_t width) {
 /// U, Y0, V, Y1 with a pair a block, to the even or the odd pixel's V, U, Y and an opaque alpha.
 template <int kLuma>
 inline F32 PixelsOfPairs(F32 uyvy) {
-    return Select(PixelInts(-1, -1, -1, 0), ShufflePixel<2, 0, kLuma, 3>(uyvy), Floats(1));
+    return BlendBlocks<0b0111>(ShufflePixel<2, 0, kLuma, 3>(uyvy), Floats(1));
 }
 
 struct FloatPairs {
@@ -100,7 +102,7 @@ struct Interpolate32f : FloatPairs, Neighbours<2, 16, 1, 2> {
         const F32 pairs = LoadFloats(source);
         const F32 inner = Floats(9) * (pairs + LoadFloats(source + 16));
         const F32 between = (inner - LoadFloats(source - 16) - LoadFloats(source + 32)) * Floats(0.0625f);
-        StorePixels(destination, pairs, Select(PixelInts(-1, 0, -1, 0), between, pairs));
+        StorePixels(destination, pairs, BlendBlocks<0b0101>(between, pairs));
     }
 };
 

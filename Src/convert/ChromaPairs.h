@@ -29,28 +29,23 @@ inline I32 AverageChroma(I32 a, I32 b) {
 }
 
 /// V, U, Y and an opaque alpha.
-inline IntChannels EvenPixels(PixelPairs pairs) {
-    const I32 half = Ints(0xffff);
-    return {ShiftRight<16>(pairs.chroma), pairs.chroma & half, pairs.luma & half, Ints(255)};
-}
-
-inline IntChannels OddPixels(PixelPairs pairs) {
-    const I32 half = Ints(0xffff);
-    return {ShiftRight<16>(pairs.chroma), pairs.chroma & half, ShiftRight<16>(pairs.luma), Ints(255)};
+inline IntChannels OpaqueChannels(I32 chroma, I32 luma) {
+    return {ShiftRight<16>(chroma), chroma & Ints(0xffff), luma, Ints(255)};
 }
 
 /// The even pixel has the chroma of its pair, the odd one the average with the next pair. Pixel::Pack makes
-/// the destination's four bytes from the channels.
+/// the destination's four bytes from chroma in halves and a pixel's luma.
 template <class Pixel, bool kRoundUp>
 inline void UpsampleInBlocks(PixelPairs pairs, I32 nextChroma, I32& low, I32& high) {
     const I32 between = AverageChroma<kRoundUp>(pairs.chroma, nextChroma);
-    InterleaveInBlocks(Pixel::Pack(EvenPixels(pairs)), Pixel::Pack(OddPixels({between, pairs.luma})), low,
-                       high);
+    InterleaveInBlocks(Pixel::Pack(pairs.chroma, pairs.luma & Ints(0xffff)),
+                       Pixel::Pack(between, ShiftRight<16>(pairs.luma)), low, high);
 }
 
 struct PixelVUYX {
-    static I32 Pack(IntChannels vuyx) {
-        return vuyx.c0 | ShiftLeft<8>(vuyx.c1) | ShiftLeft<16>(vuyx.c2) | ShiftLeft<24>(vuyx.c3);
+    static I32 Pack(I32 chroma, I32 luma) {
+        const I32 vu = MultiplyAddHalves(chroma, Ints(0x100 | 1 << 16)); // 256 U + V
+        return vu | ShiftLeft<16>(luma) | Ints(-0x1000000);
     }
 };
 

@@ -10,28 +10,30 @@ namespace {
 constexpr int32_t kGroups = kLanes / 4; // of six pixels in a vector
 
 // Sample s of a group stands in word s / 3 at bit 10 (s % 3), that is in the 16 bits from byte
-// 4 (s / 3) + s % 3 on, at bit 0, 2 or 4 of them. A multiplication moves it to bit 4, where the bits of its
-// neighbours are cut off.
-constexpr int32_t kFrom0 = 16, kFrom2 = 4, kFrom4 = 1;
+// 4 (s / 3) + s % 3 on, at bit 0, 2 or 4 of them. A multiplication moves it to bit kBit; what stands around
+// it are bits of its neighbours.
 
-/// The even samples of a group, two a lane, to kBits bits each: the chroma of its three pairs. The fourth
-/// lane is meaningless.
-template <int kBits>
-inline I32 EvenSamples(I32 words) {
-    const I32 raised =
-        MultiplyHalves(HalvesAt<0, 2, 5, 8, 10, 13, 0, 0>(words),
-                       PixelInts(kFrom0 | kFrom4 << 16, kFrom2 | kFrom0 << 16, kFrom4 | kFrom2 << 16, 0));
-    return ShiftRight<14 - kBits>(raised) & Ints(((1 << kBits) - 1) * 0x10001);
+/// The even samples of a group, two a lane: the chroma of its three pairs. The fourth lane is meaningless.
+template <int kBit>
+inline I32 EvenSamplesAt(I32 words) {
+    constexpr int32_t from0 = 1 << kBit, from2 = from0 >> 2, from4 = from0 >> 4;
+    return MultiplyHalves(HalvesAt<0, 2, 5, 8, 10, 13, 0, 0>(words),
+                          PixelInts(from0 | from4 << 16, from2 | from0 << 16, from4 | from2 << 16, 0));
 }
 
 /// The odd samples likewise: the lumas of the pairs. Of words that start one word later, they are the chroma
 /// of the pairs that follow.
+template <int kBit>
+inline I32 OddSamplesAt(I32 words) {
+    constexpr int32_t from0 = 1 << kBit, from2 = from0 >> 2, from4 = from0 >> 4;
+    return MultiplyHalves(HalvesAt<1, 4, 6, 9, 12, 14, 0, 0>(words),
+                          PixelInts(from2 | from0 << 16, from4 | from2 << 16, from0 | from4 << 16, 0));
+}
+
+/// Samples at bit 4, cut down to their kBits highest bits.
 template <int kBits>
-inline I32 OddSamples(I32 words) {
-    const I32 raised =
-        MultiplyHalves(HalvesAt<1, 4, 6, 9, 12, 14, 0, 0>(words),
-                       PixelInts(kFrom2 | kFrom0 << 16, kFrom4 | kFrom2 << 16, kFrom0 | kFrom4 << 16, 0));
-    return ShiftRight<14 - kBits>(raised) & Ints(((1 << kBits) - 1) * 0x10001);
+inline I32 HighBits(I32 samplesAt4) {
+    return ShiftRight<14 - kBits>(samplesAt4) & Ints(((1 << kBits) - 1) * 0x10001);
 }
 
 struct UYVY8ToV210 : NoNeighbours {
@@ -58,7 +60,8 @@ struct V210ToUYVY8 : V210Source, NoNeighbours {
 
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 words = LoadInts(source);
-        StoreThrees(destination, EvenSamples<8>(words) | ShiftLeft<8>(OddSamples<8>(words)));
+        StoreThrees(destination,
+                    Select(Ints(0x00ff00ff), ShiftRight<6>(EvenSamplesAt<4>(words)), OddSamplesAt<6>(words)));
     }
 };
 
@@ -72,10 +75,11 @@ struct V210ToPixels : V210Source, Neighbours<2, 0, 0, 1> {
 
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 words = LoadInts(source);
-        const I32 nextChroma = OddSamples<kBits>(LoadInts(source + 4));
+        const I32 nextChroma = HighBits<kBits>(OddSamplesAt<4>(LoadInts(source + 4)));
         I32 low, high;
-        UpsampleInBlocks<Pixel, false>({EvenSamples<kBits>(words), OddSamples<kBits>(words)}, nextChroma, low,
-                                       high);
+        UpsampleInBlocks<Pixel, false>(
+            {HighBits<kBits>(EvenSamplesAt<4>(words)), HighBits<kBits>(OddSamplesAt<4>(words))}, nextChroma,
+            low, high);
         StoreSixes(destination, low, high);
     }
 
@@ -98,7 +102,7 @@ struct V210ToPixels : V210Source, Neighbours<2, 0, 0, 1> {
 
 template <const YUVToYUVMatrix& kMatrix>
 struct PixelOtherVUYX {
-    static I32 Pack(IntChannels vuyx) { return YUV8ToYUV8<kMatrix>(vuyx); }
+    static I32 Pack(I32 chroma, I32 luma) { return YUV8ToYUV8<kMatrix>(OpaqueChannels(chroma, luma)); }
 };
 
 /// From 10-bit codes to 8-bit codes.
@@ -107,7 +111,8 @@ constexpr YUVToRGBMatrix kYUV10ToRGB8_709 = {0.291096f, 0.5281f, -0.0533122f, -0
 
 template <const YUVToRGBMatrix& kMatrix>
 struct PixelBGRXFrom10 {
-    static I32 Pack(IntChannels vuyx) {
+    static I32 Pack(I32 chroma, I32 luma) {
+        const IntChannels vuyx = OpaqueChannels(chroma, luma);
         const Channels centred =
             ToFloat(IntChannels{vuyx.c0 - Ints(512), vuyx.c1 - Ints(512), vuyx.c2 - Ints(64), vuyx.c3});
         return PackCodes(YUVToRGB<kMatrix>(centred), vuyx.c3);
@@ -157,16 +162,14 @@ struct UYVY32fToV210 : NoNeighbours {
         const I32 a = CodesFromUYVY(LoadFloatBlocks(source, 48));
         const I32 b = CodesFromUYVY(LoadFloatBlocks(source + 16, 48));
         const I32 c = CodesFromUYVY(LoadFloatBlocks(source + 32, 48));
-        const I32 lane0 = PixelInts(-1, 0, 0, 0), lane01 = PixelInts(-1, -1, 0, 0);
-        const I32 lane1 = PixelInts(0, -1, 0, 0), lane12 = PixelInts(0, -1, -1, 0);
-        const I32 lane3 = PixelInts(0, 0, 0, -1);
         // Of the samples 0 to 11, those at bit 0 are 0, 3, 6, 9; at bit 10, 1, 4, 7, 10; at bit 20 the rest.
-        const I32 low =
-            Select(lane01, ShufflePixel<0, 3, 3, 3>(a), Select(lane3, ShufflePixel<1, 1, 1, 1>(c), b));
-        const I32 middle = Select(lane0, ShufflePixel<1, 1, 1, 1>(a),
-                                  Select(lane12, ShufflePixel<0, 0, 3, 3>(b), ShufflePixel<2, 2, 2, 2>(c)));
-        const I32 high =
-            Select(lane0, ShufflePixel<2, 2, 2, 2>(a), Select(lane1, b, ShufflePixel<0, 0, 0, 3>(c)));
+        const I32 low = BlendBlocks<0b0011>(ShufflePixel<0, 3, 3, 3>(a),
+                                            BlendBlocks<0b1000>(ShufflePixel<1, 1, 1, 1>(c), b));
+        const I32 middle = BlendBlocks<0b0001>(
+            ShufflePixel<1, 1, 1, 1>(a),
+            BlendBlocks<0b0110>(ShufflePixel<0, 0, 3, 3>(b), ShufflePixel<2, 2, 2, 2>(c)));
+        const I32 high = BlendBlocks<0b0001>(ShufflePixel<2, 2, 2, 2>(a),
+                                             BlendBlocks<0b0010>(b, ShufflePixel<0, 0, 0, 3>(c)));
         Store(destination, low | ShiftLeft<10>(middle) | ShiftLeft<20>(high));
     }
 };

@@ -9,7 +9,7 @@ namespace {
 
 template <const YUVToRGBMatrix& kMatrix>
 struct PixelBGRX {
-    static I32 Pack(IntChannels vuyx) { return YUV8ToRGB8<kMatrix>(vuyx); }
+    static I32 Pack(I32 chroma, I32 luma) { return YUV8ToRGB8<kMatrix>(OpaqueChannels(chroma, luma)); }
 };
 
 template <const YUVToRGBMatrix& kMatrix>

@@ -410,4 +410,19 @@ inline I32 HalvesAt(I32 a) {
     return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
 }
 
+/// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
+inline I32 MultiplyAddHalves(I32 a, I32 b) {
+    return {_mm256_madd_epi16(a.v, b.v)};
+}
+
+/// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
+template <int kMask>
+inline F32 BlendBlocks(F32 a, F32 b) {
+    return {_mm256_blend_ps(b.v, a.v, kMask * 0x11)};
+}
+template <int kMask>
+inline I32 BlendBlocks(I32 a, I32 b) {
+    return {_mm256_blend_epi32(b.v, a.v, kMask * 0x11)};
+}
+
 } // namespace PK::avx2

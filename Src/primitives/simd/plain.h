@@ -456,4 +456,26 @@ inline I32 HalvesAt(I32 a) {
     return LoadInts(halves);
 }
 
+/// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
+inline I32 MultiplyAddHalves(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) {
+        const auto low = static_cast<int16_t>(x) * static_cast<int16_t>(y);
+        const auto high = static_cast<int16_t>(x >> 16) * static_cast<int16_t>(y >> 16);
+        return static_cast<uint32_t>(low) + static_cast<uint32_t>(high);
+    });
+}
+
+/// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
+template <int kMask>
+inline I32 BlendBlocks(I32 a, I32 b) {
+    I32 result = b;
+    for (int i = 0; i < kLanes; ++i)
+        if (kMask >> i & 1) result.lane[i] = a.lane[i];
+    return result;
+}
+template <int kMask>
+inline F32 BlendBlocks(F32 a, F32 b) {
+    return FromBits(BlendBlocks<kMask>(Bits(a), Bits(b)));
+}
+
 } // namespace PK::plain

@@ -435,4 +435,23 @@ inline I32 HalvesAt(I32 a) {
 #endif
 }
 
+/// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
+inline I32 MultiplyAddHalves(I32 a, I32 b) {
+    return {_mm_madd_epi16(a.v, b.v)};
+}
+
+/// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
+template <int kMask>
+inline F32 BlendBlocks(F32 a, F32 b) {
+#ifdef __SSE4_1__
+    return {_mm_blend_ps(b.v, a.v, kMask)};
+#else
+    return Select(PixelInts(-(kMask & 1), -(kMask >> 1 & 1), -(kMask >> 2 & 1), -(kMask >> 3 & 1)), a, b);
+#endif
+}
+template <int kMask>
+inline I32 BlendBlocks(I32 a, I32 b) {
+    return Bits(BlendBlocks<kMask>(FromBits(a), FromBits(b)));
+}
+
 } // namespace PK::PK_TARGET
