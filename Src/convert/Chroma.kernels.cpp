@@ -1,10 +1,124 @@
-// Chroma resampling between 4:4:4 and 4:2:2.
+// Chroma resampling between 4:4:4 and 4:2:2. The chroma of a pair stands at its even pixel.
 
+#include "convert/ChromaPairs.h"
 #include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+
+namespace PK::PK_TARGET {
+namespace {
+
+/// The chroma of 8-bit pixels, U in the low and V in the high half.
+inline I32 ChromaOfPixels(I32 vuya) {
+    if constexpr (kHasByteShuffle)
+        return HalvesAt<1, 0, 5, 4, 9, 8, 13, 12>(vuya) & Ints(0x00ff00ff);
+    else
+        return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
+}
+
+/// (c[i-1] + 2 c[i] + c[i+1] + 2) >> 2. At the row's first pixel c[i-1] is c[i].
+struct Downsample8u : Neighbours<1, 4, 1, 0> {
+    static constexpr int32_t kPixels = 2 * kLanes;
+    static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 2;
+    static constexpr int32_t kSourceBytes = 8 * kLanes, kDestinationBytes = 4 * kLanes;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        I32 even, odd, previous, same;
+        DeinterleaveInBlocks(LoadIntBlocks(source, 32), LoadIntBlocks(source + 16, 32), even, odd);
+        DeinterleaveInBlocks(LoadIntBlocks(source - 4, 32), LoadIntBlocks(source + 12, 32), previous, same);
+        const I32 centre = ChromaOfPixels(even);
+        const I32 sum = ChromaOfPixels(previous) + centre + centre + ChromaOfPixels(odd) + Ints(0x00020002);
+        const I32 chroma = ShiftRight<2>(sum) & Ints(0x00ff00ff);
+        const I32 luma = (ShiftRight<8>(even) & Ints(0xff00)) | (ShiftLeft<8>(odd) & Ints(-0x1000000));
+        Store(destination, chroma | luma);
+    }
+
+    /// A pixel that makes a pair alone: its chroma is not filtered, and its luma stands for both.
+    static void LonePixel(const uint8_t* vuya, uint8_t* uyvy) {
+        const uint8_t pair[4] = {vuya[1], vuya[2], vuya[0], vuya[2]};
+        std::memcpy(uyvy, pair, sizeof pair);
+    }
+};
+
+/// (c[i-1] + 2 c[i] + c[i+1]) x 0.25. At the row's first pixel c[i-1] is c[i], whose sum with 2 c[i] is 3
+/// c[i] rounded once.
+struct Downsample32f : Neighbours<1, 16, 1, 0> {
+    static constexpr int32_t kPixels = kLanes / 2;
+    static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 2;
+    static constexpr int32_t kSourceBytes = 8 * kLanes, kDestinationBytes = 4 * kLanes;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const F32 previous = LoadFloatBlocks(source - 16, 32);
+        const F32 even = LoadFloatBlocks(source, 32);
+        const F32 odd = LoadFloatBlocks(source + 16, 32);
+        const F32 vu = (previous + Floats(2) * even + odd) * Floats(0.25f);
+        const F32 luma = BlendBlocks<0b0010>(ShufflePixel<2, 2, 2, 2>(even), ShufflePixel<2, 2, 2, 2>(odd));
+        Store(destination, BlendBlocks<0b0101>(ShufflePixel<1, 1, 0, 0>(vu), luma));
+    }
+
+    /// A pixel that makes a pair alone: its chroma is not filtered, and the second luma is 0.
+    static void LonePixel(const uint8_t* source, uint8_t* destination) {
+        float vuya[4];
+        std::memcpy(vuya, source, sizeof vuya);
+        const float uyvy[4] = {vuya[1], vuya[2], vuya[0], 0};
+        std::memcpy(destination, uyvy, sizeof uyvy);
+    }
+};
+
+template <class Downsample>
+void DownsampleRow(const void* source, void* destination, int32_t width) {
+    const int32_t paired = width & ~1;
+    WindowRow<Downsample>(source, destination, paired);
+    if (paired < width)
+        Downsample::LonePixel(static_cast<const uint8_t*>(source) + SourceBytes<Downsample>(paired),
+                              static_cast<uint8_t*>(destination) + DestinationBytes<Downsample>(paired));
+}
+
+/// U, Y0, V, Y1 with a pair a block, to the even or the odd pixel's V, U, Y and an opaque alpha.
+template <int kLuma>
+inline F32 PixelsOfPairs(F32 uyvy) {
+    return BlendBlocks<0b0111>(ShufflePixel<2, 0, kLuma, 3>(uyvy), Floats(1));
+}
+
+struct FloatPairs {
+    static constexpr int32_t kPixels = kLanes / 2;
+    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 1;
+    static constexpr int32_t kSourceBytes = 4 * kLanes, kDestinationBytes = 8 * kLanes;
+};
+
+inline void StorePixels(uint8_t* destination, F32 evenPairs, F32 oddPairs) {
+    StoreBlocks(destination, 32, PixelsOfPairs<1>(evenPairs));
+    StoreBlocks(destination + 16, 32, PixelsOfPairs<3>(oddPairs));
+}
+
+struct Repeat32f : FloatPairs, NoNeighbours {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const F32 pairs = LoadFloats(source);
+        StorePixels(destination, pairs, pairs);
+    }
+};
+
+/// The odd pixel's chroma is (9 (c[k] + c[k+1]) - c[k-1] - c[k+2]) x 0.0625 over the pairs k.
+struct Interpolate32f : FloatPairs, Neighbours<2, 16, 1, 2> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const F32 pairs = LoadFloats(source);
+        const F32 inner = Floats(9) * (pairs + LoadFloats(source + 16));
+        const F32 between = (inner - LoadFloats(source - 16) - LoadFloats(source + 32)) * Floats(0.0625f);
+        StorePixels(destination, pairs, BlendBlocks<0b0101>(between, pairs));
+    }
+};
+
+} // namespace
+} // namespace PK::PK_TARGET
 
 template <>
 PK::KernelBodies PK::ChromaBodies<PK::PK_TARGET::kTarget>() {
-    static constexpr KernelBody bodies[] = {{Kernel::Downsample444To422Row, nullptr}};
+    using namespace PK_TARGET;
+    static constexpr KernelBody bodies[] = {
+        {Kernel::Downsample444To422Row, DownsampleRow<Downsample8u>},
+        {Kernel::Downsample444To422Float32Row, DownsampleRow<Downsample32f>},
+        {Kernel::Upsample422To444Row_UYVY, WindowRow<UpsamplePairs<false, PixelVUYX>>},
+        {Kernel::Upsample422To444Row_YUYV, WindowRow<UpsamplePairs<true, PixelVUYX>>},
+        {Kernel::Upsample422To444Float32Row_Repeat, WindowRow<Repeat32f>},
+        {Kernel::Upsample422To444Float32Row_Interpolate, WindowRow<Interpolate32f>},
+    };
     return bodies;
 }

@@ -171,6 +171,8 @@ KernelBodies YUVToYUVBodies(); // YUVToYUV.kernels.cpp
 template <Target>
 KernelBodies ChromaBodies(); // Chroma.kernels.cpp
 template <Target>
+KernelBodies YUV422ToBGRBodies(); // YUV422ToBGR.kernels.cpp
+template <Target>
 KernelBodies TransferBodies(); // Transfer.kernels.cpp
 template <Target>
 KernelBodies V210Bodies(); // V210.kernels.cpp

@@ -175,8 +175,8 @@ void Enter(BodyTable& table) {
     for (const KernelBodies& bodies :
          {OrderBodies<kTarget>(), PremultiplyBodies<kTarget>(), DepthBodies<kTarget>(),
           RGBToYUVBodies<kTarget>(), YUVToRGBBodies<kTarget>(), YUVToYUVBodies<kTarget>(),
-          ChromaBodies<kTarget>(), TransferBodies<kTarget>(), V210Bodies<kTarget>(), RGB10Bodies<kTarget>(),
-          FusedBodies<kTarget>()})
+          ChromaBodies<kTarget>(), YUV422ToBGRBodies<kTarget>(), TransferBodies<kTarget>(),
+          V210Bodies<kTarget>(), RGB10Bodies<kTarget>(), FusedBodies<kTarget>()})
         for (int32_t i = 0; i < bodies.count; ++i)
             table[static_cast<std::size_t>(bodies.first[i].kernel)][static_cast<std::size_t>(kTarget)] =
                 bodies.first[i].run;

@@ -1,10 +1,194 @@
-// Ten-bit packed 4:2:2.
+// Ten-bit packed 4:2:2: six pixels in four words, three samples a word, in the order of UYVY.
 
+#include "convert/ChromaPairs.h"
+#include "convert/ColourMatrices.h"
 #include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+
+namespace PK::PK_TARGET {
+namespace {
+
+constexpr int32_t kGroups = kLanes / 4; // of six pixels in a vector
+
+// Sample s of a group stands in word s / 3 at bit 10 (s % 3), that is in the 16 bits from byte
+// 4 (s / 3) + s % 3 on, at bit 0, 2 or 4 of them. A multiplication moves it to bit kBit; what stands around
+// it are bits of its neighbours.
+
+/// The even samples of a group, two a lane: the chroma of its three pairs. The fourth lane is meaningless.
+template <int kBit>
+inline I32 EvenSamplesAt(I32 words) {
+    constexpr int32_t from0 = 1 << kBit, from2 = from0 >> 2, from4 = from0 >> 4;
+    return MultiplyHalves(HalvesAt<0, 2, 5, 8, 10, 13, 0, 0>(words),
+                          PixelInts(from0 | from4 << 16, from2 | from0 << 16, from4 | from2 << 16, 0));
+}
+
+/// The odd samples likewise: the lumas of the pairs. Of words that start one word later, they are the chroma
+/// of the pairs that follow.
+template <int kBit>
+inline I32 OddSamplesAt(I32 words) {
+    constexpr int32_t from0 = 1 << kBit, from2 = from0 >> 2, from4 = from0 >> 4;
+    return MultiplyHalves(HalvesAt<1, 4, 6, 9, 12, 14, 0, 0>(words),
+                          PixelInts(from2 | from0 << 16, from4 | from2 << 16, from0 | from4 << 16, 0));
+}
+
+/// Samples at bit 4, cut down to their kBits highest bits.
+template <int kBits>
+inline I32 HighBits(I32 samplesAt4) {
+    return ShiftRight<14 - kBits>(samplesAt4) & Ints(((1 << kBits) - 1) * 0x10001);
+}
+
+struct UYVY8ToV210 : NoNeighbours {
+    static constexpr int32_t kPixels = 6 * kGroups;
+    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 6;
+    static constexpr int32_t kSourceBytes = 12 * kGroups, kDestinationBytes = 16 * kGroups;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const I32 samples = HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(LoadThrees(source)); // three bytes a lane
+        const I32 outer = MultiplyHalves(samples & Ints(0x00ff00ff), Ints(4 | 64 << 16));
+        Store(destination, outer | ShiftLeft<4>(samples & Ints(0xff00)));
+    }
+};
+
+struct V210Source {
+    static constexpr int32_t kPixels = 6 * kGroups;
+    static constexpr int32_t kSourceUnit = 6;
+    static constexpr int32_t kSourceBytes = 16 * kGroups;
+};
+
+struct V210ToUYVY8 : V210Source, NoNeighbours {
+    static constexpr int32_t kDestinationUnit = 2;
+    static constexpr int32_t kDestinationBytes = 12 * kGroups;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const I32 words = LoadInts(source);
+        StoreThrees(destination,
+                    Select(Ints(0x00ff00ff), ShiftRight<6>(EvenSamplesAt<4>(words)), OddSamplesAt<6>(words)));
+    }
+};
+
+/// To pixels of four bytes, with the truncated average of chroma at the odd pixel, from samples of kBits
+/// bits.
+template <int kBits, class Pixel>
+struct V210ToPixels : V210Source, Neighbours<2, 0, 0, 1> {
+    static constexpr int32_t kBytesAfter = 4; // the next pair's chroma
+    static constexpr int32_t kDestinationUnit = 1;
+    static constexpr int32_t kDestinationBytes = 24 * kGroups;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const I32 words = LoadInts(source);
+        const I32 nextChroma = HighBits<kBits>(OddSamplesAt<4>(LoadInts(source + 4)));
+        I32 low, high;
+        UpsampleInBlocks<Pixel, false>(
+            {HighBits<kBits>(EvenSamplesAt<4>(words)), HighBits<kBits>(OddSamplesAt<4>(words))}, nextChroma,
+            low, high);
+        StoreSixes(destination, low, high);
+    }
+
+    /// The chroma of one pair over that of another.
+    static void Repeat(uint8_t* window, int32_t from, int32_t to) {
+        CopySample(window, 4 * from, 4 * to);
+        CopySample(window, 4 * from + 2, 4 * to + 2);
+    }
+
+    static void CopySample(uint8_t* window, int32_t from, int32_t to) {
+        uint32_t source, destination;
+        std::memcpy(&source, window + from / 3 * 4, sizeof source);
+        std::memcpy(&destination, window + to / 3 * 4, sizeof destination);
+        const uint32_t sample = source >> (10 * (from % 3)) & 0x3ff;
+        const int32_t shift = 10 * (to % 3);
+        destination = (destination & ~(0x3ffu << shift)) | sample << shift;
+        std::memcpy(window + to / 3 * 4, &destination, sizeof destination);
+    }
+};
+
+template <const YUVToYUVMatrix& kMatrix>
+struct PixelOtherVUYX {
+    static I32 Pack(I32 chroma, I32 luma) { return YUV8ToYUV8<kMatrix>(OpaqueChannels(chroma, luma)); }
+};
+
+/// From 10-bit codes to 8-bit codes.
+constexpr YUVToRGBMatrix kYUV10ToRGB8_601 = {0.291096f, 0.504308f, -0.0979404f, -0.203242f, 0.399007f};
+constexpr YUVToRGBMatrix kYUV10ToRGB8_709 = {0.291096f, 0.5281f, -0.0533122f, -0.133227f, 0.448185f};
+
+template <const YUVToRGBMatrix& kMatrix>
+struct PixelBGRXFrom10 {
+    static I32 Pack(I32 chroma, I32 luma) {
+        const IntChannels vuyx = OpaqueChannels(chroma, luma);
+        const Channels centred =
+            ToFloat(IntChannels{vuyx.c0 - Ints(512), vuyx.c1 - Ints(512), vuyx.c2 - Ints(64), vuyx.c3});
+        return PackCodes(YUVToRGB<kMatrix>(centred), vuyx.c3);
+    }
+};
+
+constexpr float kChromaFromCode = 0.0011160715f, kLumaFromCode = 0.0011415525f; // 1 / 896, 1 / 876
+
+/// The samples of a vector stand at bit 10 x k0 to 10 x k3 of their lanes. They become floats where they
+/// stand, since powers of two are exact, and the factors put them right.
+template <int k0, int k1, int k2, int k3>
+inline F32 UYVYFromCodes(I32 words) {
+    constexpr int32_t mask = 0x3ff;
+    constexpr int32_t at0 = 1 << 10 * k0, at1 = 1 << 10 * k1, at2 = 1 << 10 * k2, at3 = 1 << 10 * k3;
+    const F32 codes = ToFloat(words & PixelInts(mask * at0, mask * at1, mask * at2, mask * at3));
+    return (codes - PixelFloats(512.0f * at0, 64.0f * at1, 512.0f * at2, 64.0f * at3)) *
+           PixelFloats(kChromaFromCode / at0, kLumaFromCode / at1, kChromaFromCode / at2,
+                       kLumaFromCode / at3);
+}
+
+struct V210ToUYVY32f : V210Source, NoNeighbours {
+    static constexpr int32_t kDestinationUnit = 2;
+    static constexpr int32_t kDestinationBytes = 48 * kGroups;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const I32 words = LoadInts(source);
+        StoreBlocks(destination, 48, UYVYFromCodes<0, 1, 2, 0>(ShufflePixel<0, 0, 0, 1>(words)));
+        StoreBlocks(destination + 16, 48, UYVYFromCodes<1, 2, 0, 1>(ShufflePixel<1, 1, 2, 2>(words)));
+        StoreBlocks(destination + 32, 48, UYVYFromCodes<2, 0, 1, 2>(ShufflePixel<2, 3, 3, 3>(words)));
+    }
+};
+
+/// nearest(896 c + 512.5) for chroma and nearest(876 y + 64.5) for luma, clamped to 0 to 1023. The half is
+/// deliberate, although the conversion rounds by itself.
+inline I32 CodesFromUYVY(F32 uyvy) {
+    const F32 codes = PixelFloats(896, 876, 896, 876) * uyvy + PixelFloats(512.5f, 64.5f, 512.5f, 64.5f);
+    return Max(Nearest(AtMost(Floats(1023), codes)), Ints(0));
+}
+
+struct UYVY32fToV210 : NoNeighbours {
+    static constexpr uint8_t kPadding = 0xbf; // floats of about -1.5, which give codes of 0
+    static constexpr int32_t kPixels = 6 * kGroups;
+    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 6;
+    static constexpr int32_t kSourceBytes = 48 * kGroups, kDestinationBytes = 16 * kGroups;
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const I32 a = CodesFromUYVY(LoadFloatBlocks(source, 48));
+        const I32 b = CodesFromUYVY(LoadFloatBlocks(source + 16, 48));
+        const I32 c = CodesFromUYVY(LoadFloatBlocks(source + 32, 48));
+        // Of the samples 0 to 11, those at bit 0 are 0, 3, 6, 9; at bit 10, 1, 4, 7, 10; at bit 20 the rest.
+        const I32 low = BlendBlocks<0b0011>(ShufflePixel<0, 3, 3, 3>(a),
+                                            BlendBlocks<0b1000>(ShufflePixel<1, 1, 1, 1>(c), b));
+        const I32 middle = BlendBlocks<0b0001>(
+            ShufflePixel<1, 1, 1, 1>(a),
+            BlendBlocks<0b0110>(ShufflePixel<0, 0, 3, 3>(b), ShufflePixel<2, 2, 2, 2>(c)));
+        const I32 high = BlendBlocks<0b0001>(ShufflePixel<2, 2, 2, 2>(a),
+                                             BlendBlocks<0b0010>(b, ShufflePixel<0, 0, 0, 3>(c)));
+        Store(destination, low | ShiftLeft<10>(middle) | ShiftLeft<20>(high));
+    }
+};
+
+} // namespace
+} // namespace PK::PK_TARGET
 
 template <>
 PK::KernelBodies PK::V210Bodies<PK::PK_TARGET::kTarget>() {
-    static constexpr KernelBody bodies[] = {{Kernel::UYVY8uToV210Row, nullptr}};
+    using namespace PK_TARGET;
+    static constexpr KernelBody bodies[] = {
+        {Kernel::UYVY8uToV210Row, WindowRow<UYVY8ToV210>},
+        {Kernel::V210ToUYVY8uRow, WindowRow<V210ToUYVY8>},
+        {Kernel::V210ToVUY8uRow, WindowRow<V210ToPixels<8, PixelVUYX>>},
+        {Kernel::V210709ToVUY601_8uRow, WindowRow<V210ToPixels<8, PixelOtherVUYX<kYUV709To601>>>},
+        {Kernel::V210ToBGR8uRow_601, WindowRow<V210ToPixels<10, PixelBGRXFrom10<kYUV10ToRGB8_601>>>},
+        {Kernel::V210ToBGR8uRow_709, WindowRow<V210ToPixels<10, PixelBGRXFrom10<kYUV10ToRGB8_709>>>},
+        {Kernel::V210ToUYVY32fRow, WindowRow<V210ToUYVY32f>},
+        {Kernel::UYVY32fToV210Row, WindowRow<UYVY32fToV210>},
+    };
     return bodies;
 }

@@ -354,4 +354,79 @@ inline F32 ToFloat(F64 a) {
     return {_mm256_set_m128(_mm256_cvtpd_ps(a.high), _mm256_cvtpd_ps(a.low))};
 }
 
+// Blocks of four lanes: the pieces of which a wider vector is made.
+
+/// The block i is loaded from, or stored to, i x stride bytes further on.
+inline I32 LoadIntBlocks(const void* source, int32_t stride) {
+    const auto* second = static_cast<const uint8_t*>(source) + stride;
+    return {
+        _mm256_loadu2_m128i(reinterpret_cast<const __m128i*>(second), static_cast<const __m128i*>(source))};
+}
+inline F32 LoadFloatBlocks(const void* source, int32_t stride) {
+    return FromBits(LoadIntBlocks(source, stride));
+}
+inline void StoreBlocks(void* destination, int32_t stride, I32 a) {
+    auto* second = static_cast<uint8_t*>(destination) + stride;
+    _mm_storeu_si128(static_cast<__m128i*>(destination), _mm256_castsi256_si128(a.v));
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(second), _mm256_extracti128_si256(a.v, 1));
+}
+inline void StoreBlocks(void* destination, int32_t stride, F32 a) {
+    StoreBlocks(destination, stride, Bits(a));
+}
+
+/// In each block: a0 b0 a1 b1 and a2 b2 a3 b3.
+inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm256_unpacklo_epi32(a.v, b.v)};
+    high = {_mm256_unpackhi_epi32(a.v, b.v)};
+}
+/// In each block: a0 a2 b0 b2 and a1 a3 b1 b3.
+inline void DeinterleaveInBlocks(I32 a, I32 b, I32& even, I32& odd) {
+    const __m256 first = _mm256_castsi256_ps(a.v), second = _mm256_castsi256_ps(b.v);
+    even = {_mm256_castps_si256(_mm256_shuffle_ps(first, second, _MM_SHUFFLE(2, 0, 2, 0)))};
+    odd = {_mm256_castps_si256(_mm256_shuffle_ps(first, second, _MM_SHUFFLE(3, 1, 3, 1)))};
+}
+
+/// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.
+inline I32 LoadThrees(const void* source) {
+    const I32 blocks = LoadIntBlocks(source, 8); // the second ends with the last of the 24 bytes
+    const __m256i order = _mm256_setr_epi32(0, 1, 2, 7, 5, 6, 7, 7);
+    return {_mm256_blend_epi32(_mm256_permutevar8x32_epi32(blocks.v, order), _mm256_setzero_si256(), 0x88)};
+}
+inline void StoreThrees(void* destination, I32 a) {
+    const __m256i order = _mm256_setr_epi32(0, 1, 2, 4, 5, 6, 6, 6);
+    const __m256i lanes = _mm256_permutevar8x32_epi32(a.v, order);
+    _mm_storeu_si128(static_cast<__m128i*>(destination), _mm256_castsi256_si128(lanes));
+    _mm_storel_epi64(static_cast<__m128i*>(destination) + 1, _mm256_extracti128_si256(lanes, 1));
+}
+/// Six lanes a block: four of `low` and the first two of `high`.
+inline void StoreSixes(void* destination, I32 low, I32 high) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    StoreBlocks(bytes, 24, low);
+    _mm_storel_epi64(reinterpret_cast<__m128i*>(bytes + 16), _mm256_castsi256_si128(high.v));
+    _mm_storel_epi64(reinterpret_cast<__m128i*>(bytes + 40), _mm256_extracti128_si256(high.v, 1));
+}
+
+/// The 16 bits that start at each of eight byte offsets in a block.
+template <int k0, int k1, int k2, int k3, int k4, int k5, int k6, int k7>
+inline I32 HalvesAt(I32 a) {
+    const __m128i order = _mm_setr_epi8(k0, k0 + 1, k1, k1 + 1, k2, k2 + 1, k3, k3 + 1, k4, k4 + 1, k5,
+                                        k5 + 1, k6, k6 + 1, k7, k7 + 1);
+    return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
+}
+
+/// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
+inline I32 MultiplyAddHalves(I32 a, I32 b) {
+    return {_mm256_madd_epi16(a.v, b.v)};
+}
+
+/// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
+template <int kMask>
+inline F32 BlendBlocks(F32 a, F32 b) {
+    return {_mm256_blend_ps(b.v, a.v, kMask * 0x11)};
+}
+template <int kMask>
+inline I32 BlendBlocks(I32 a, I32 b) {
+    return {_mm256_blend_epi32(b.v, a.v, kMask * 0x11)};
+}
+
 } // namespace PK::avx2

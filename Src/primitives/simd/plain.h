@@ -410,4 +410,79 @@ inline F32 ToFloat(F64 a) {
     return Map<F32>(a, [](double x) { return static_cast<float>(x); });
 }
 
+// Blocks of four lanes: the pieces of which a wider vector is made.
+
+/// The block i is loaded from, or stored to, i x stride bytes further on.
+inline I32 LoadIntBlocks(const void* source, [[maybe_unused]] int32_t stride) {
+    return LoadInts(source);
+}
+inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int32_t stride) {
+    return LoadFloats(source);
+}
+inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, I32 a) {
+    Store(destination, a);
+}
+inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, F32 a) {
+    Store(destination, a);
+}
+
+/// In each block: a0 b0 a1 b1 and a2 b2 a3 b3.
+inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {{a.lane[0], b.lane[0], a.lane[1], b.lane[1]}};
+    high = {{a.lane[2], b.lane[2], a.lane[3], b.lane[3]}};
+}
+/// In each block: a0 a2 b0 b2 and a1 a3 b1 b3.
+inline void DeinterleaveInBlocks(I32 a, I32 b, I32& even, I32& odd) {
+    even = {{a.lane[0], a.lane[2], b.lane[0], b.lane[2]}};
+    odd = {{a.lane[1], a.lane[3], b.lane[1], b.lane[3]}};
+}
+
+/// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.
+inline I32 LoadThrees(const void* source) {
+    I32 result = Ints(0);
+    std::memcpy(&result, source, 12);
+    return result;
+}
+inline void StoreThrees(void* destination, I32 a) {
+    std::memcpy(destination, &a, 12);
+}
+/// Six lanes a block: four of `low` and the first two of `high`.
+inline void StoreSixes(void* destination, I32 low, I32 high) {
+    Store(destination, low);
+    std::memcpy(static_cast<uint8_t*>(destination) + 16, &high, 8);
+}
+
+/// The 16 bits that start at each of eight byte offsets in a block.
+template <int... kOffsets>
+inline I32 HalvesAt(I32 a) {
+    uint8_t bytes[16];
+    Store(bytes, a);
+    const int offsets[8] = {kOffsets...};
+    uint16_t halves[8];
+    for (int i = 0; i < 8; ++i) std::memcpy(&halves[i], bytes + offsets[i], 2);
+    return LoadInts(halves);
+}
+
+/// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
+inline I32 MultiplyAddHalves(I32 a, I32 b) {
+    return Map<I32>(a, b, [](uint32_t x, uint32_t y) {
+        const auto low = static_cast<int16_t>(x) * static_cast<int16_t>(y);
+        const auto high = static_cast<int16_t>(x >> 16) * static_cast<int16_t>(y >> 16);
+        return static_cast<uint32_t>(low) + static_cast<uint32_t>(high);
+    });
+}
+
+/// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
+template <int kMask>
+inline I32 BlendBlocks(I32 a, I32 b) {
+    I32 result = b;
+    for (int i = 0; i < kLanes; ++i)
+        if (kMask >> i & 1) result.lane[i] = a.lane[i];
+    return result;
+}
+template <int kMask>
+inline F32 BlendBlocks(F32 a, F32 b) {
+    return FromBits(BlendBlocks<kMask>(Bits(a), Bits(b)));
+}
+
 } // namespace PK::plain

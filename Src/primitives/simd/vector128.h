@@ -383,4 +383,85 @@ inline F32 ToFloat(F64 a) {
     return {_mm_movelh_ps(_mm_cvtpd_ps(a.low), _mm_cvtpd_ps(a.high))};
 }
 
+// Blocks of four lanes: the pieces of which a wider vector is made.
+
+/// The block i is loaded from, or stored to, i x stride bytes further on.
+inline I32 LoadIntBlocks(const void* source, [[maybe_unused]] int32_t stride) {
+    return LoadInts(source);
+}
+inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int32_t stride) {
+    return LoadFloats(source);
+}
+inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, I32 a) {
+    Store(destination, a);
+}
+inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, F32 a) {
+    Store(destination, a);
+}
+
+/// In each block: a0 b0 a1 b1 and a2 b2 a3 b3.
+inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm_unpacklo_epi32(a.v, b.v)};
+    high = {_mm_unpackhi_epi32(a.v, b.v)};
+}
+/// In each block: a0 a2 b0 b2 and a1 a3 b1 b3.
+inline void DeinterleaveInBlocks(I32 a, I32 b, I32& even, I32& odd) {
+    const __m128 first = _mm_castsi128_ps(a.v), second = _mm_castsi128_ps(b.v);
+    even = {_mm_castps_si128(_mm_shuffle_ps(first, second, _MM_SHUFFLE(2, 0, 2, 0)))};
+    odd = {_mm_castps_si128(_mm_shuffle_ps(first, second, _MM_SHUFFLE(3, 1, 3, 1)))};
+}
+
+/// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.
+inline I32 LoadThrees(const void* source) {
+    int32_t third;
+    std::memcpy(&third, static_cast<const uint8_t*>(source) + 8, sizeof third);
+    return {
+        _mm_unpacklo_epi64(_mm_loadl_epi64(static_cast<const __m128i*>(source)), _mm_cvtsi32_si128(third))};
+}
+inline void StoreThrees(void* destination, I32 a) {
+    _mm_storel_epi64(static_cast<__m128i*>(destination), a.v);
+    const int32_t third = _mm_cvtsi128_si32(_mm_unpackhi_epi64(a.v, a.v));
+    std::memcpy(static_cast<uint8_t*>(destination) + 8, &third, sizeof third);
+}
+/// Six lanes a block: four of `low` and the first two of `high`.
+inline void StoreSixes(void* destination, I32 low, I32 high) {
+    Store(destination, low);
+    _mm_storel_epi64(static_cast<__m128i*>(destination) + 1, high.v);
+}
+
+/// The 16 bits that start at each of eight byte offsets in a block.
+template <int k0, int k1, int k2, int k3, int k4, int k5, int k6, int k7>
+inline I32 HalvesAt(I32 a) {
+#ifdef __SSSE3__
+    return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(k0, k0 + 1, k1, k1 + 1, k2, k2 + 1, k3, k3 + 1, k4, k4 + 1,
+                                                k5, k5 + 1, k6, k6 + 1, k7, k7 + 1))};
+#else
+    uint8_t bytes[16];
+    Store(bytes, a);
+    const int offsets[8] = {k0, k1, k2, k3, k4, k5, k6, k7};
+    int16_t halves[8];
+    for (int i = 0; i < 8; ++i) std::memcpy(&halves[i], bytes + offsets[i], 2);
+    return LoadInts(halves);
+#endif
+}
+
+/// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
+inline I32 MultiplyAddHalves(I32 a, I32 b) {
+    return {_mm_madd_epi16(a.v, b.v)};
+}
+
+/// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
+template <int kMask>
+inline F32 BlendBlocks(F32 a, F32 b) {
+#ifdef __SSE4_1__
+    return {_mm_blend_ps(b.v, a.v, kMask)};
+#else
+    return Select(PixelInts(-(kMask & 1), -(kMask >> 1 & 1), -(kMask >> 2 & 1), -(kMask >> 3 & 1)), a, b);
+#endif
+}
+template <int kMask>
+inline I32 BlendBlocks(I32 a, I32 b) {
+    return Bits(BlendBlocks<kMask>(FromBits(a), FromBits(b)));
+}
+
 } // namespace PK::PK_TARGET

@@ -1,0 +1,33 @@
+// 8-bit 4:2:2 to 8-bit BGR in one pass: chroma resampling followed by the matrix.
+
+#include "convert/ChromaPairs.h"
+#include "convert/ColourMatrices.h"
+#include "convert/Kernel.h"
+
+namespace PK::PK_TARGET {
+namespace {
+
+template <const YUVToRGBMatrix& kMatrix>
+struct PixelBGRX {
+    static I32 Pack(I32 chroma, I32 luma) { return YUV8ToRGB8<kMatrix>(OpaqueChannels(chroma, luma)); }
+};
+
+template <const YUVToRGBMatrix& kMatrix>
+using UYVYToBGR = UpsamplePairs<false, PixelBGRX<kMatrix>>;
+template <const YUVToRGBMatrix& kMatrix>
+using YUYVToBGR = UpsamplePairs<true, PixelBGRX<kMatrix>>;
+
+} // namespace
+} // namespace PK::PK_TARGET
+
+template <>
+PK::KernelBodies PK::YUV422ToBGRBodies<PK::PK_TARGET::kTarget>() {
+    using namespace PK_TARGET;
+    static constexpr KernelBody bodies[] = {
+        {Kernel::UYVY601ToBGR8uRow, WindowRow<UYVYToBGR<kYUV8ToRGB8_601>>},
+        {Kernel::UYVY709ToBGR8uRow, WindowRow<UYVYToBGR<kYUV8ToRGB8_709>>},
+        {Kernel::YUYV601ToBGR8uRow, WindowRow<YUYVToBGR<kYUV8ToRGB8_601>>},
+        {Kernel::YUYV709ToBGR8uRow, WindowRow<YUYVToBGR<kYUV8ToRGB8_709>>},
+    };
+    return bodies;
+}
