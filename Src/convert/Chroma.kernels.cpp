@@ -1,40 +1,22 @@
 // Chroma resampling between 4:4:4 and 4:2:2. The chroma of a pair stands at its even pixel.
 
 #include "convert/ChromaPairs.h"
+#include "convert/DownsampleRow.h"
 #include "convert/Kernel.h"
 
 namespace PK::PK_TARGET {
 namespace {
 
-/// The chroma of 8-bit pixels, U in the low and V in the high half.
-inline I32 ChromaOfPixels(I32 vuya) {
-    if constexpr (kHasByteShuffle)
-        return HalvesAt<1, 0, 5, 4, 9, 8, 13, 12>(vuya) & Ints(0x00ff00ff);
-    else
-        return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
-}
-
-/// (c[i-1] + 2 c[i] + c[i+1] + 2) >> 2. At the row's first pixel c[i-1] is c[i].
-struct Downsample8u : Neighbours<1, 4, 1, 0> {
-    static constexpr int32_t kPixels = 2 * kLanes;
-    static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 2;
-    static constexpr int32_t kSourceBytes = 8 * kLanes, kDestinationBytes = 4 * kLanes;
-
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        I32 even, odd, previous, same;
-        DeinterleaveInBlocks(LoadIntBlocks(source, 32), LoadIntBlocks(source + 16, 32), even, odd);
-        DeinterleaveInBlocks(LoadIntBlocks(source - 4, 32), LoadIntBlocks(source + 12, 32), previous, same);
-        const I32 centre = ChromaOfPixels(even);
-        const I32 sum = ChromaOfPixels(previous) + centre + centre + ChromaOfPixels(odd) + Ints(0x00020002);
-        const I32 chroma = ShiftRight<2>(sum) & Ints(0x00ff00ff);
-        const I32 luma = (ShiftRight<8>(even) & Ints(0xff00)) | (ShiftLeft<8>(odd) & Ints(-0x1000000));
-        Store(destination, chroma | luma);
+struct PackedVUYA {
+    static YUVPixels Pixels(I32 vuya) {
+        const I32 u = ShiftRight<8>(vuya) & Ints(0xff);
+        const I32 v = ShiftLeft<16>(vuya) & Ints(0xff0000);
+        return {u | v, ShiftRight<16>(vuya) & Ints(0xff)};
     }
 
-    /// A pixel that makes a pair alone: its chroma is not filtered, and its luma stands for both.
-    static void LonePixel(const uint8_t* vuya, uint8_t* uyvy) {
-        const uint8_t pair[4] = {vuya[1], vuya[2], vuya[0], vuya[2]};
-        std::memcpy(uyvy, pair, sizeof pair);
+    static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
+        first = Pixels(LoadInts(source));
+        second = Pixels(LoadInts(source + 4 * kLanes));
     }
 };
 
@@ -63,13 +45,13 @@ struct Downsample32f : Neighbours<1, 16, 1, 0> {
     }
 };
 
-template <class Downsample>
-void DownsampleRow(const void* source, void* destination, int32_t width) {
+void DownsampleRow32f(const void* source, void* destination, int32_t width) {
     const int32_t paired = width & ~1;
-    WindowRow<Downsample>(source, destination, paired);
+    WindowRow<Downsample32f>(source, destination, paired);
     if (paired < width)
-        Downsample::LonePixel(static_cast<const uint8_t*>(source) + SourceBytes<Downsample>(paired),
-                              static_cast<uint8_t*>(destination) + DestinationBytes<Downsample>(paired));
+        Downsample32f::LonePixel(static_cast<const uint8_t*>(source) + SourceBytes<Downsample32f>(paired),
+                                 static_cast<uint8_t*>(destination) +
+                                     DestinationBytes<Downsample32f>(paired));
 }
 
 /// U, Y0, V, Y1 with a pair a block, to the even or the odd pixel's V, U, Y and an opaque alpha.
@@ -113,8 +95,8 @@ template <>
 PK::KernelBodies PK::ChromaBodies<PK::PK_TARGET::kTarget>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
-        {Kernel::Downsample444To422Row, DownsampleRow<Downsample8u>},
-        {Kernel::Downsample444To422Float32Row, DownsampleRow<Downsample32f>},
+        {Kernel::Downsample444To422Row, DownsampleRow<PackedVUYA>},
+        {Kernel::Downsample444To422Float32Row, DownsampleRow32f},
         {Kernel::Upsample422To444Row_UYVY, WindowRow<UpsamplePairs<false, PixelVUYX>>},
         {Kernel::Upsample422To444Row_YUYV, WindowRow<UpsamplePairs<true, PixelVUYX>>},
         {Kernel::Upsample422To444Float32Row_Repeat, WindowRow<Repeat32f>},
