@@ -75,18 +75,22 @@ inline void Log2(F64 (&x)[kCount]) {
 /// 2^x, in place, for |x| <= 1000.
 template <int kCount>
 inline void Exp2(F64 (&x)[kCount]) {
-    const F64 shifter = Doubles(0x1.8p52); // adding it leaves the nearest integer in the low bits
-    F64 shifted[kCount];
+    // Adding this leaves x in fixed point with 26 bits behind the point; cutting those off rounds x to the
+    // nearest integer under every rounding mode.
+    constexpr double kShifter = 0x1.8p26;
+    constexpr int64_t kInteger = -(int64_t{1} << 26);
+    I64 shifted[kCount];
     for (int i = 0; i < kCount; ++i) {
-        shifted[i] = x[i] + shifter;
-        x[i] = x[i] - (shifted[i] - shifter);
+        shifted[i] = Bits(x[i] + Doubles(kShifter + 0.5)) & Longs(kInteger);
+        x[i] = x[i] - (FromBits(shifted[i]) - Doubles(kShifter));
     }
     for (int i = 0; i < kCount; ++i) x[i] = Polynomial(x[i], kExp2Coefficients);
-    for (int i = 0; i < kCount; ++i) x[i] = FromBits(Bits(x[i]) + ShiftLeft<52>(Bits(shifted[i])));
+    for (int i = 0; i < kCount; ++i) x[i] = FromBits(Bits(x[i]) + ShiftLeft<26>(shifted[i]));
 }
 
-/// x^exponent, in place, for x >= 0, with an error below 0.501 units in the last place. 0, infinity and NaN
-/// stay as they are, which is right for positive exponents.
+/// x^exponent, in place, for x >= 0, with an error below 0.501 units in the last place (1.001 where the
+/// rounding mode is not the nearest). 0, infinity and NaN stay as they are, which is right for positive
+/// exponents.
 template <int kCount>
 inline void Power(F32 (&x)[kCount], F64 exponent) {
     F64 power[kCount];

@@ -4,15 +4,15 @@
 // this header, Targets.h, the fixed-width integer and memory headers, and nothing of the standard library: an
 // inline function of the library compiled for AVX2 might be the copy that the linker keeps for all.
 //
-// Every target has the same two types and the same functions on them:
+// Every target has the same types and the same functions on them:
 //
 //   F32, I32                 kLanes lanes of float or 32-bit integer; kLanes is a multiple of four, so that a
 //                            vector holds whole interleaved four-channel float pixels
+//   F64, I64                 a double or 64-bit integer for each lane, where 24 bits are not enough
 //   Floats, Ints             one value in every lane; PixelFloats, PixelInts: four values, repeated
-//   Min, Max                 the first operand where it is less (greater), else the second: NaN yields the
-//   second Nearest, Truncate        to integers, by the current rounding mode or towards zero; out of range
-//   and NaN
-//                            give INT32_MIN
+//   Min, Max                 the first operand where it is less (greater), else the second, so for NaN too
+//   Nearest, Truncate        to integers, by the current rounding mode or towards zero; out of range and
+//                            NaN give INT32_MIN
 //   Select(mask, a, b)       a where the mask's bits are set, else b
 //   ...Pixel...              work on each block of four lanes, that is on each interleaved pixel
 //   LoadBytes, StoreBytes    kLanes bytes to and from lanes; stores saturate

@@ -150,6 +150,9 @@ inline I32 Truncate(F32 a) {
 inline F32 Lookup(const float* table, I32 index) {
     return {_mm256_i32gather_ps(table, index.v, 4)};
 }
+inline I32 Lookup(const uint32_t* table, I32 index) {
+    return {_mm256_i32gather_epi32(reinterpret_cast<const int*>(table), index.v, 4)};
+}
 
 inline I32 LoadBytes(const void* source) {
     return {_mm256_cvtepu8_epi32(_mm_loadl_epi64(static_cast<const __m128i*>(source)))};
@@ -288,10 +291,6 @@ inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     auto* lanes = static_cast<int32_t*>(destination);
     Store(lanes, I32{_mm256_permute2x128_si256(outer, inner, 0x20)});
     Store(lanes + kLanes, I32{_mm256_permute2x128_si256(outer, inner, 0x31)});
-}
-
-inline I32 Lookup(const uint32_t* table, I32 index) {
-    return {_mm256_i32gather_epi32(reinterpret_cast<const int*>(table), index.v, 4)};
 }
 
 /// Two registers, so that there is a double for each float lane: `low` for the first half of the lanes.

@@ -179,6 +179,9 @@ inline I32 Truncate(F32 a) {
 inline F32 Lookup(const float* table, I32 index) {
     return Map<F32>(index, [table](uint32_t i) { return table[i]; });
 }
+inline I32 Lookup(const uint32_t* table, I32 index) {
+    return Map<I32>(index, [table](uint32_t i) { return table[i]; });
+}
 
 template <class Element>
 inline I32 LoadElements(const void* source) {
@@ -344,10 +347,6 @@ inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
         lanes[2 * i + 1] = odd.lane[i];
     }
     std::memcpy(destination, lanes, sizeof lanes);
-}
-
-inline I32 Lookup(const uint32_t* table, I32 index) {
-    return Map<I32>(index, [table](uint32_t i) { return table[i]; });
 }
 
 struct F64 {

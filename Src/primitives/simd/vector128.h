@@ -172,6 +172,12 @@ inline F32 Lookup(const float* table, I32 index) {
     Store(i, index);
     return {_mm_setr_ps(table[i[0]], table[i[1]], table[i[2]], table[i[3]])};
 }
+inline I32 Lookup(const uint32_t* table, I32 index) {
+    uint32_t i[kLanes];
+    Store(i, index);
+    return PixelInts(static_cast<int32_t>(table[i[0]]), static_cast<int32_t>(table[i[1]]),
+                     static_cast<int32_t>(table[i[2]]), static_cast<int32_t>(table[i[3]]));
+}
 
 inline I32 LoadBytes(const void* source) {
     int32_t bytes;
@@ -314,13 +320,6 @@ inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
     auto* lanes = static_cast<int32_t*>(destination);
     Store(lanes, I32{_mm_unpacklo_epi32(even.v, odd.v)});
     Store(lanes + kLanes, I32{_mm_unpackhi_epi32(even.v, odd.v)});
-}
-
-inline I32 Lookup(const uint32_t* table, I32 index) {
-    uint32_t i[kLanes];
-    Store(i, index);
-    return PixelInts(static_cast<int32_t>(table[i[0]]), static_cast<int32_t>(table[i[1]]),
-                     static_cast<int32_t>(table[i[2]]), static_cast<int32_t>(table[i[3]]));
 }
 
 /// Two registers, so that there is a double for each float lane: `low` for the first half of the lanes.
