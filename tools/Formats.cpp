@@ -1,6 +1,7 @@
 #include "Formats.h"
 
 #include "Failure.h"
+#include "Terminal.h"
 
 #include <algorithm>
 #include <cctype>
@@ -63,21 +64,24 @@ size_t EditDistance(std::string_view a, std::string_view b) {
     return row[b.size()];
 }
 
-// Names that hold the text come first, then those that the fewest typing errors lead to.
-std::string Suggestions(const std::string& lower) {
+// A question with up to three names: those that hold the text first, then those that few typing errors lead
+// to. Empty if none is near.
+std::string DidYouMean(const std::string& lower) {
     constexpr size_t kCount = 3;
+    const size_t near = std::max<size_t>(2, lower.size() / 3);
     std::vector<std::pair<size_t, std::string>> ranked;
     for (const PK_PixelFormat format : Catalogue()) {
         const std::string name = FormatName(format);
         const bool holds = Lower(name).find(lower) != std::string::npos;
-        ranked.emplace_back(holds ? 0 : EditDistance(lower, Lower(name)), name);
+        const size_t distance = holds ? 0 : EditDistance(lower, Lower(name));
+        if (distance <= near) ranked.emplace_back(distance, name);
     }
+    if (ranked.empty()) return "";
     std::stable_sort(ranked.begin(), ranked.end(),
                      [](const auto& a, const auto& b) { return a.first < b.first; });
-    std::string text;
-    for (size_t i = 0; i < kCount; ++i)
-        text += (i == 0 ? "" : i + 1 == kCount ? " or " : ", ") + ranked[i].second;
-    return text;
+    std::vector<std::string> names;
+    for (size_t i = 0; i < std::min(kCount, ranked.size()); ++i) names.push_back(ranked[i].second);
+    return "; did you mean " + Join(names, " or ");
 }
 
 } // namespace
@@ -111,8 +115,8 @@ PK_PixelFormat ParseFormat(const std::string& text) {
     if (isNumber)
         throw Failure(kExitUsage, "no pixel format has the number " + text +
                                       "; 'pixelkiln formats' lists those that exist");
-    throw Failure(kExitUsage, "there is no pixel format '" + text + "'; did you mean " + Suggestions(lower) +
-                                  "? 'pixelkiln formats' lists all");
+    throw Failure(kExitUsage, "there is no pixel format '" + text + "'" + DidYouMean(lower) +
+                                  "; 'pixelkiln formats' lists all");
 }
 
 bool IsRaster(PK_PixelFormat format) {
