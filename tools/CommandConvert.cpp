@@ -151,7 +151,6 @@ void RunConvert(const ConvertOptions& options) {
         ConvertRawFrames(plan, options.input, frame, output);
 
     const int64_t count = output.Finish();
-    if (count == 0) throw Failure(kExitFile, "'" + options.input + "' holds no frame");
     if (options.quiet || options.output == "-") return;
     Print(options.input + " -> " + options.output + ": " + std::to_string(count) +
           (count == 1 ? " frame " : " frames ") + std::to_string(frame.Width()) + "x" +

@@ -73,10 +73,12 @@ bool RawReader::Read(Frame& frame) {
         if (!std::feof(fFile.get())) got += static_cast<int64_t>(std::fread(first, 1, bytes, fFile.get()));
         if (std::ferror(fFile.get())) ThrowFileFailure("cannot read '" + fName + "'", errno);
     });
+    if (got == 0 && fFramesRead == 0) throw Failure(kExitFile, "'" + fName + "' holds no frame");
     if (got != 0 && got != wanted)
         throw Failure(kExitFile, "'" + fName + "' ends within a frame, " + std::to_string(got) +
                                      " bytes into " + std::to_string(wanted) +
                                      "; check --size, --from and --packed");
+    ++fFramesRead;
     return got != 0;
 }
 

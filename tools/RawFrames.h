@@ -29,7 +29,7 @@ public:
     /// Frames in the file; 0 if that shows only at its end, as with a pipe.
     int64_t FrameCount() const { return fFrameCount; }
 
-    /// False at the end of the file.
+    /// False at the end of the file. A file without any frame is a failure.
     bool Read(Frame& frame);
 
 private:
@@ -43,6 +43,7 @@ private:
     RowPacking fPacking;
     std::unique_ptr<FILE, CloseFile> fFile;
     int64_t fFrameCount = 0;
+    int64_t fFramesRead = 0;
 };
 
 void WriteRaw(const Frame& frame, RowPacking packing, OutputFile& file);

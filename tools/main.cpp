@@ -131,7 +131,7 @@ int Run(int count, char** words) {
     CLI::App program(
         "Pixel formats of video: list them, convert between them, and see what a conversion does");
     program.set_version_flag("--version", "pixelkiln " PIXELKILN_VERSION);
-    program.require_subcommand(1);
+    program.require_subcommand(0, 1);
     program.footer(kExitCodes);
     AddListings(program);
     AddExplain(program);
@@ -142,7 +142,9 @@ int Run(int count, char** words) {
     } catch (const CLI::ParseError& error) {
         return program.exit(error) == 0 ? kExitOK : kExitUsage;
     }
-    return kExitOK;
+    if (!program.get_subcommands().empty()) return kExitOK;
+    std::fputs(program.help().c_str(), stderr);
+    return kExitUsage;
 }
 
 } // namespace

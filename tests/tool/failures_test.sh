@@ -41,6 +41,7 @@ expect 3 "with --packed it would fit" convert in/packed.raw out/x.png "${v210[@]
 expect 3 "without --packed it would fit" convert in/frame.raw out/x.png "${v210[@]}" --packed
 expect 3 "has 0 bytes" convert in/empty.raw out/x.png "${v210[@]}"
 expect 3 "No such file" convert in/missing.raw out/x.png "${v210[@]}"
+expect 3 "'standard input' holds no frame" convert - out/x.raw "${v210[@]}" --to UYVY_422_8u < /dev/null
 checks=$((checks + 1))
 said=$(cat in/long.raw | "$program" convert - out/x.raw "${v210[@]}" --to UYVY_422_8u 2>&1)
 [ $? -eq 3 ] && [[ $said == *"ends within a frame, 1000 bytes into $frame"* ]] || fail "a pipe that ends early: $said"

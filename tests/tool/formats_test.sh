@@ -13,7 +13,7 @@ expect 0 "PixelKiln   0." info
 is "chain of ARGB to VUYA" "$("$program" explain ARGB_4444_8u VUYA_4444_8u | awk 'NR > 2 {print $2, $4}' | tr '\n' ';')" \
     "SwapOrderRow BGRA_4444_8u;RGBToYUV601Row VUYA_4444_8u;"
 is "chain of BGRA to RGB 10-bit" "$("$program" explain BGRA_4444_8u RGB_444_10u | awk 'NR > 2 {print $2}' | tr '\n' ';')" \
-    "BGRA8uToBGRP32fRow;BGR32fToRGB10uRow;"
+    "ExpandTo32fRow;PremultiplyRow;BGR32fToRGB10uRow;"
 expect 0 "SwapOrderRow" explain bgra_4444_8u 0x1004
 expect 1 "NTSCDV25 is a stream" explain BGRA_4444_8u NTSCDV25
 
@@ -25,7 +25,7 @@ expect 2 "no pixel format has the number 0x4g" explain 0x4g BGRA_4444_8u
 
 expect 0 "Exit codes" --help
 expect 0 "--packed" convert --help
-expect 2 "subcommand" 
+expect 2 "Subcommands:"
 expect 2 "nosuch" nosuch
 expect 2 "DST is required" explain BGRA_4444_8u
 expect 2 "quality" explain BGRA_4444_8u BGRP_4444_8u --quality 6
