@@ -41,7 +41,8 @@ void RunCompare(const CompareOptions& options) {
     Print("size                " + SizeText(first) + "\nPSNR                " + PsnrText(difference.psnr) +
           "\nlargest difference  " + StepsText(difference.largestColour) + " of 255" +
           "\n  in alpha          " + StepsText(difference.largestAlpha) + " of 255\ndiffering pixels    " +
-          std::to_string(difference.differingPixels) + " of " + std::to_string(pixels) + "\n");
+          std::to_string(difference.differingPixels) + " of " + std::to_string(pixels) +
+          (difference.differingPixels == 0 ? ", identical\n" : "\n"));
     const double largest = std::max(difference.largestColour, difference.largestAlpha);
     if (options.limit >= 0 && largest > options.limit)
         throw Failure(kExitFailed, "the largest difference is " + StepsText(largest) +

@@ -16,7 +16,7 @@ namespace tool {
 namespace {
 
 constexpr PK_PixelFormat kPictureFormat = PK_PixelFormat_BGRA_4444_8u;
-constexpr int kAmplification = 16; // makes a difference of a few steps visible
+constexpr int kAmplification = 32; // makes a difference of a few steps visible
 
 constexpr PK_PixelFormat kStops[] = {
     PK_PixelFormat_VUYA_4444_8u,      PK_PixelFormat_VUYA_4444_8u_709, PK_PixelFormat_UYVY_422_8u,
@@ -39,6 +39,14 @@ void MakeFolder(const std::string& folder) {
     if (error) ThrowFileFailure("cannot make the folder '" + folder + "'", error.value());
 }
 
+std::string DifferenceText(const Difference& difference) {
+    if (difference.differingPixels == 0) return "identical";
+    char text[96];
+    std::snprintf(text, sizeof(text), "largest difference %.0f of 255, PSNR %s", difference.largestColour,
+                  PsnrText(difference.psnr).c_str());
+    return text;
+}
+
 // Takes the picture to a format and back; writes what came back and tells of the way.
 Tile Visit(const Frame& picture, PK_PixelFormat stop, const std::filesystem::path& folder, size_t number) {
     const Frame there = Converted(picture, stop, kDefaultQuality);
@@ -49,11 +57,9 @@ Tile Visit(const Frame& picture, PK_PixelFormat stop, const std::filesystem::pat
 
     const auto chainThere = DescribeChain(kPictureFormat, stop, kDefaultQuality);
     const auto chainBack = DescribeChain(stop, kPictureFormat, kDefaultQuality);
-    const Difference difference = MeasureDifference(picture, back);
-    char caption[160];
-    std::snprintf(
-        caption, sizeof(caption), "largest difference %.0f of 255, PSNR %s; %zu steps there, %zu back",
-        difference.largestColour, PsnrText(difference.psnr).c_str(), chainThere.size(), chainBack.size());
+    const std::string caption = DifferenceText(MeasureDifference(picture, back)) +
+                                "; steps: " + std::to_string(chainThere.size()) + " there, " +
+                                std::to_string(chainBack.size()) + " back";
     Print(Bold(FormatName(stop)) + "  " + caption + "\n" + ChainText(kPictureFormat, stop, chainThere) +
           ChainText(stop, kPictureFormat, chainBack));
 

@@ -60,7 +60,7 @@ Frame DifferencePicture(const Frame& a, const Frame& b, int factor) {
 }
 
 std::string PsnrText(double psnr) {
-    if (std::isinf(psnr)) return psnr > 0 ? "identical" : "not a number";
+    if (std::isinf(psnr)) return psnr > 0 ? "infinite" : "not a number";
     char text[32];
     std::snprintf(text, sizeof(text), "%.1f dB", psnr);
     return text;

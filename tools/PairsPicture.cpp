@@ -14,17 +14,16 @@ constexpr int kTop = 212;  // heading and the names of the columns
 constexpr int kLegendHeight = 64;
 constexpr int kMargin = 24;
 
-// Classes of the largest difference, from blue for none to red; light and dark also tell them apart without
-// colour.
+// Classes of the largest difference, from green for none to red; the digits stay legible on all.
 struct Class {
     double upTo; // steps of 8 bits
     const char* name;
     const char* colour;
 };
 constexpr Class kClasses[] = {
-    {0, "none", "#2f6f9f"},   {0.1, "to 0.1", "#6ba6c9"}, {0.5, "to 0.5", "#a9cfe0"},
-    {1, "to 1", "#dcecef"},   {2, "to 2", "#fdf3cd"},     {4, "to 4", "#fbd98b"},
-    {16, "to 16", "#f4ab5f"}, {64, "to 64", "#dd6e47"},   {1e300, "above 64", "#a83240"},
+    {0, "none", "#a9d8c0"},   {0.1, "to 0.1", "#cfe8d2"}, {0.5, "to 0.5", "#e9f2d6"},
+    {1, "to 1", "#fdf6d2"},   {2, "to 2", "#fce6a4"},     {4, "to 4", "#f9cd7c"},
+    {16, "to 16", "#f2a766"}, {64, "to 64", "#e57d5a"},   {1e300, "above 64", "#cf5252"},
 };
 constexpr const char* kNoWayColour = "#ffffff";
 
@@ -61,17 +60,15 @@ std::string RowOfCells(const PairTable& table, size_t row) {
     return text;
 }
 
-// The steps of a row's pairs as one text, each digit with a place of its own; x where there is no way.
+// The steps of a row's pairs as one text, each digit in a place of its own; x where there is no way.
 std::string RowOfSteps(const PairTable& table, size_t row) {
-    std::string places;
     std::string digits;
     for (size_t column = 0; column < table.formats.size(); ++column) {
         const size_t steps = table.At(row, column).stepsThere;
-        places += Number(kLeft + column * kCell + kCell / 2) + " ";
-        digits += steps == 0 ? "x" : Number(steps); // a chain has at most eight steps
+        digits += "<tspan x='" + Number(kLeft + column * kCell + kCell / 2) + "'>" +
+                  (steps == 0 ? "x" : Number(steps)) + "</tspan>";
     }
-    return "<text class='s' y='" + Number(kTop + row * kCell + kCell - 4) + "' x='" + places + "'>" + digits +
-           "</text>\n";
+    return "<text class='s' y='" + Number(kTop + row * kCell + kCell - 4) + "'>" + digits + "</text>\n";
 }
 
 std::string Names(const PairTable& table) {
