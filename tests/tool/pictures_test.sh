@@ -1,0 +1,23 @@
+# The commands that draw.
+. "$(dirname "$0")/expect.sh"
+
+expect 0 "2 pictures" sheet sheet.png "$media/coffee.png" "$media/chelsea.png"
+expect 0 "identical" compare sheet.png sheet.png
+
+expect 0 "demo/sheet.png shows all 12" demo "$media/chelsea.png" demo
+is "pictures of the demonstration" "$(ls -A demo | wc -l)" 13
+for picture in demo/[01]*.png; do
+    expect 0 "size                451x300" compare "$media/chelsea.png" "$picture" --limit 255
+done
+expect 0 "identical" compare "$media/chelsea.png" demo/08-BGRA_4444_15u.png --limit 0
+
+expect 0 "2209 pairs of 47 formats" pairs pairs.csv
+is "lines of numbers" "$(wc -l < pairs.csv)" 2210
+is "pairs without a way" "$(awk -F, '$3 == 0' pairs.csv | wc -l)" 0
+is "a format by way of itself" "$(awk -F, 'NR > 1 && $1 == $2 && $5 != 0' pairs.csv | wc -l)" 0
+is "8 bits by way of float" "$(grep '^BGRA_4444_8u,BGRA_4444_32f,' pairs.csv)" "BGRA_4444_8u,BGRA_4444_32f,1,1,0"
+expect 0 "2209 pairs" pairs pairs.svg --quality 0
+is "cells in the picture" "$(grep -o '>[1-8]</tspan>' pairs.svg | wc -l)" 2209
+is "start and end" "$(head -c 4 pairs.svg)$(tail -c 7 pairs.svg)" "<svg</svg>"
+
+finish

@@ -1,0 +1,91 @@
+// pixelkiln demo: one photograph through a dozen formats and back, and what that did to it.
+
+#include "Chains.h"
+#include "Commands.h"
+#include "Difference.h"
+#include "Failure.h"
+#include "Formats.h"
+#include "Png.h"
+#include "Sheet.h"
+#include "Terminal.h"
+
+#include <cstdio>
+#include <filesystem>
+
+namespace tool {
+namespace {
+
+constexpr PK_PixelFormat kPictureFormat = PK_PixelFormat_BGRA_4444_8u;
+constexpr int kAmplification = 32; // makes a difference of a few steps visible
+
+constexpr PK_PixelFormat kStops[] = {
+    PK_PixelFormat_VUYA_4444_8u,      PK_PixelFormat_VUYA_4444_8u_709, PK_PixelFormat_UYVY_422_8u,
+    PK_PixelFormat_YUYV_422_8u_709,   PK_PixelFormat_V210_422_10u,     PK_PixelFormat_V210_422_10u_709,
+    PK_PixelFormat_RGB_444_10u,       PK_PixelFormat_BGRA_4444_15u,    PK_PixelFormat_PRGB_4444_32f,
+    PK_PixelFormat_VUYA_4444_32f_709, PK_PixelFormat_UYVY_422_32f,     PK_PixelFormat_BGRA_4444_32f_Linear,
+};
+
+std::string ChainText(PK_PixelFormat from, PK_PixelFormat to, const std::vector<ChainStep>& chain) {
+    std::string text = FormatName(from);
+    for (const ChainStep& step : chain)
+        text += Dim(" -" + step.kernel + "-> ") +
+                (step.leaves == to ? Bold(FormatName(to)) : FormatName(step.leaves));
+    return "  " + text + "\n";
+}
+
+void MakeFolder(const std::string& folder) {
+    std::error_code error;
+    std::filesystem::create_directories(folder, error);
+    if (error) ThrowFileFailure("cannot make the folder '" + folder + "'", error.value());
+}
+
+std::string DifferenceText(const Difference& difference) {
+    if (difference.differingPixels == 0) return "identical";
+    char text[96];
+    std::snprintf(text, sizeof(text), "largest difference %.0f of 255, PSNR %s", difference.largestColour,
+                  PsnrText(difference.psnr).c_str());
+    return text;
+}
+
+// Takes the picture to a format and back; writes what came back and tells of the way.
+Tile Visit(const Frame& picture, PK_PixelFormat stop, const std::filesystem::path& folder, size_t number) {
+    const Frame there = Converted(picture, stop, kDefaultQuality);
+    Frame back = Converted(there, kPictureFormat, kDefaultQuality);
+    char prefix[16];
+    std::snprintf(prefix, sizeof(prefix), "%02zu-", number);
+    WritePng(back, (folder / (prefix + FormatName(stop) + ".png")).string());
+
+    const auto chainThere = DescribeChain(kPictureFormat, stop, kDefaultQuality);
+    const auto chainBack = DescribeChain(stop, kPictureFormat, kDefaultQuality);
+    const std::string caption = DifferenceText(MeasureDifference(picture, back)) +
+                                "; steps: " + std::to_string(chainThere.size()) + " there, " +
+                                std::to_string(chainBack.size()) + " back";
+    Print(Bold(FormatName(stop)) + "  " + caption + "\n" + ChainText(kPictureFormat, stop, chainThere) +
+          ChainText(stop, kPictureFormat, chainBack));
+
+    Tile tile;
+    tile.title = FormatName(stop);
+    tile.caption = caption;
+    tile.pictures.push_back(std::move(back));
+    tile.pictures.push_back(DifferencePicture(picture, tile.pictures.front(), kAmplification));
+    return tile;
+}
+
+} // namespace
+
+void RunDemo(const DemoOptions& options) {
+    const Frame picture = Converted(ReadPng(options.image), kPictureFormat, kDefaultQuality);
+    MakeFolder(options.folder);
+    const std::filesystem::path folder(options.folder);
+    std::vector<Tile> tiles;
+    for (const PK_PixelFormat stop : kStops) tiles.push_back(Visit(picture, stop, folder, tiles.size() + 1));
+    const std::string sheet = (folder / "sheet.png").string();
+    WriteSheet(tiles,
+               std::filesystem::path(options.image).filename().string() +
+                   " to each format and back; on the right the difference, " +
+                   std::to_string(kAmplification) + " times as bright",
+               sheet);
+    Print("\n" + sheet + " shows all " + std::to_string(tiles.size()) + " side by side\n");
+}
+
+} // namespace tool
