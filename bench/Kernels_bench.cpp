@@ -1,6 +1,8 @@
 // Every body of every row kernel on one row that stays in cache: what the instructions cost without memory.
 //
-//   pixelkiln_kernel_bench --benchmark_filter=Premultiply
+//   pixelkiln_kernel_bench [--markdown] --benchmark_filter=Premultiply
+
+#include "KernelTableReporter.h"
 
 #include "convert/KernelTable.h"
 
@@ -9,6 +11,7 @@
 
 #include <benchmark/benchmark.h>
 
+#include <cstring>
 #include <string>
 #include <vector>
 
@@ -21,7 +24,8 @@ constexpr int32_t kWidth = 1920;
 std::vector<uint8_t> MakeRow(PK_PixelFormat format) {
     std::vector<uint8_t> row(static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, kWidth)));
     const bool isFloat = (format & 0x100) != 0;
-    for (size_t i = 0; i < row.size(); ++i) row[i] = static_cast<uint8_t>(isFloat && i % 4 == 3 ? 0x3e : i * 37);
+    for (size_t i = 0; i < row.size(); ++i)
+        row[i] = static_cast<uint8_t>(isFloat && i % 4 == 3 ? 0x3e : i * 37);
     return row;
 }
 
@@ -37,6 +41,10 @@ void RunBody(benchmark::State& state, Kernel kernel, Target target) {
     state.SetBytesProcessed(state.iterations() * static_cast<int64_t>(source.size() + destination.size()));
 }
 
+std::string FormatName(PK_PixelFormat format) {
+    return format == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u" : PK_PixelFormatName(format);
+}
+
 void RegisterAll() {
     for (int i = 0; i < kKernelCount; ++i)
         for (int j = 0; j < kTargetCount; ++j) {
@@ -44,10 +52,24 @@ void RegisterAll() {
             const auto target = static_cast<Target>(j);
             if (!IsEnabled(target) || !Body(kernel, target)) continue;
             const KernelInfo& info = Info(kernel);
-            const std::string name = std::string(info.name) + "/" + PK_PixelFormatName(info.source) + "/" +
-                                     PK_PixelFormatName(info.destination) + "/" + TargetName(target);
+            const std::string name = std::string(info.name) + "/" + FormatName(info.source) + "/" +
+                                     FormatName(info.destination) + "/" + TargetName(target);
             benchmark::RegisterBenchmark(name.c_str(), RunBody, kernel, target)->MinTime(0.05);
         }
+}
+
+std::vector<std::string> TargetNames() {
+    std::vector<std::string> names;
+    for (int i = 0; i < kTargetCount; ++i) names.push_back(TargetName(static_cast<Target>(i)));
+    return names;
+}
+
+void RunAll(bool asMarkdown) {
+    KernelTableReporter table(TargetNames());
+    if (asMarkdown)
+        benchmark::RunSpecifiedBenchmarks(&table);
+    else
+        benchmark::RunSpecifiedBenchmarks();
 }
 
 } // namespace
@@ -55,9 +77,10 @@ void RegisterAll() {
 int main(int argc, char** argv) {
     PK_Initialize();
     benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 2;
+    const bool asMarkdown = argc == 2 && std::strcmp(argv[1], "--markdown") == 0;
+    if (!asMarkdown && benchmark::ReportUnrecognizedArguments(argc, argv)) return 2;
     RegisterAll();
-    benchmark::RunSpecifiedBenchmarks();
+    RunAll(asMarkdown);
     benchmark::Shutdown();
     PK_Terminate();
     return 0;

@@ -1,0 +1,148 @@
+// Whole frames through the exported interface, each work against memcpy and against the peers that this build
+// found, as a Markdown table.
+//
+//   pixelkiln_frame_bench [PART_OF_A_NAME]
+
+#include "frames/Peer.h"
+#include "frames/Timing.h"
+#include "frames/Works.h"
+
+#include <PixelKiln/PixelKiln.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstring>
+
+namespace FrameBench {
+
+std::vector<Peer>& AllPeers() {
+    static std::vector<Peer> peers;
+    return peers;
+}
+
+namespace {
+
+constexpr int kRounds = 15;
+constexpr double kMegapixels = kWidth * kHeight * 1e-6;
+constexpr double kLevel = 0.97; // what the noise of a quiet machine leaves of 1
+
+struct PeerResult {
+    std::string name;
+    Likeness likeness;
+    double seconds;
+    std::string difference;
+};
+
+struct Result {
+    double seconds;
+    double memcpySeconds;
+    double bytes;
+    std::vector<PeerResult> peers; // the fastest first
+};
+
+void ConvertFrame(const Image& source, const Image& destination) {
+    const PK_Result result =
+        PK_Convert(source.bytes.get(), source.rowBytes, source.format, destination.bytes.get(),
+                   destination.rowBytes, destination.format, kWidth, kHeight, 1);
+    if (result == PK_Success) return;
+    std::fprintf(stderr, "%s to %s failed: %d\n", PK_PixelFormatName(source.format),
+                 PK_PixelFormatName(destination.format), result);
+    std::exit(1);
+}
+
+std::string DifferenceText(const Peer& peer, const Image& ours, const Image& theirs) {
+    if (peer.likeness != Likeness::Same) return "-";
+    char text[32];
+    std::snprintf(text, sizeof text, "%.3g", LargestDifference(ours, theirs));
+    return text;
+}
+
+std::vector<Peer> PeersOf(const Work& work) {
+    std::vector<Peer> peers;
+    for (const Peer& peer : AllPeers())
+        if (peer.source == work.source && peer.destination == work.destination) peers.push_back(peer);
+    return peers;
+}
+
+Result Measure(const Work& work) {
+    const Image source = MakePicture(work.source);
+    const Image destination(work.destination);
+    const size_t bytes = source.packedBytes + destination.packedBytes;
+    const Bytes copyFrom = Allocate(bytes / 2);
+    const Bytes copyTo = Allocate(bytes / 2);
+
+    const std::vector<Peer> peers = PeersOf(work);
+    std::vector<Image> peerDestinations;
+    std::vector<Run> contenders = {
+        [&] { ConvertFrame(source, destination); },
+        [&] { std::memcpy(copyTo.get(), copyFrom.get(), bytes / 2); },
+    };
+    peerDestinations.reserve(peers.size());
+    for (const Peer& peer : peers) {
+        peerDestinations.emplace_back(work.destination);
+        contenders.push_back(peer.prepare(source, peerDestinations.back()));
+    }
+    const std::vector<double> seconds = MeasureInTurns(contenders, kRounds);
+
+    Result result = {seconds[0], seconds[1], static_cast<double>(bytes), {}};
+    for (size_t i = 0; i < peers.size(); ++i)
+        result.peers.push_back({peers[i].name, peers[i].likeness, seconds[i + 2],
+                                DifferenceText(peers[i], destination, peerDestinations[i])});
+    std::sort(result.peers.begin(), result.peers.end(),
+              [](const PeerResult& a, const PeerResult& b) { return a.seconds < b.seconds; });
+    return result;
+}
+
+const PeerResult* FastestWholePeer(const Result& result) {
+    for (const PeerResult& peer : result.peers)
+        if (peer.likeness != Likeness::Part) return &peer;
+    return nullptr;
+}
+
+const char* MetOrMissed(double share, double aim) {
+    return share >= aim ? "met" : "**missed**";
+}
+
+const char* Verdict(Aim aim, const Result& result) {
+    const double shareOfMemcpy = result.memcpySeconds / result.seconds;
+    if (aim == Aim::Copy) return MetOrMissed(shareOfMemcpy, 0.95);
+    if (aim == Aim::ByteMove) return MetOrMissed(shareOfMemcpy, 0.8);
+    const PeerResult* const peer = FastestWholePeer(result);
+    return peer == nullptr ? "-" : MetOrMissed(peer->seconds / result.seconds, kLevel);
+}
+
+void PrintPeer(const PeerResult& peer, double ourSeconds) {
+    std::printf(" %s | %.0f | %.2f | %s |\n", peer.name.c_str(), kMegapixels / peer.seconds,
+                peer.seconds / ourSeconds, peer.difference.c_str());
+}
+
+void Print(const Work& work, const Result& result) {
+    std::printf("| %s | %.0f | %.1f | %.2f | %s |", work.name, kMegapixels / result.seconds,
+                result.bytes / result.seconds * 1e-9, result.memcpySeconds / result.seconds,
+                Verdict(work.aim, result));
+    if (result.peers.empty()) std::printf(" - | - | - | - |\n");
+    for (size_t i = 0; i < result.peers.size(); ++i) {
+        if (i != 0) std::printf("| | | | | |");
+        PrintPeer(result.peers[i], result.seconds);
+    }
+    std::fflush(stdout);
+}
+
+void PrintAll(const char* partOfName) {
+    std::puts("| Conversion | Mpixel/s | GB/s | Share of memcpy | Aim | Peer | Peer Mpixel/s | Ratio | "
+              "Difference |");
+    std::puts("|---|--:|--:|--:|---|---|--:|--:|--:|");
+    for (const Work& work : kWorks)
+        if (std::strstr(work.name, partOfName) != nullptr) Print(work, Measure(work));
+}
+
+} // namespace
+
+} // namespace FrameBench
+
+int main(int argc, char** argv) {
+    PK_Initialize();
+    FrameBench::PrintAll(argc > 1 ? argv[1] : "");
+    PK_Terminate();
+    return 0;
+}
