@@ -21,7 +21,8 @@ constexpr int32_t kWidth = 1920;
 std::vector<uint8_t> MakeRow(PK_PixelFormat format) {
     std::vector<uint8_t> row(static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, kWidth)));
     const bool isFloat = (format & 0x100) != 0;
-    for (size_t i = 0; i < row.size(); ++i) row[i] = static_cast<uint8_t>(isFloat && i % 4 == 3 ? 0x3e : i * 37);
+    for (size_t i = 0; i < row.size(); ++i)
+        row[i] = static_cast<uint8_t>(isFloat && i % 4 == 3 ? 0x3e : i * 37);
     return row;
 }
 
