@@ -8,11 +8,14 @@ namespace PK::PK_TARGET {
 namespace {
 
 struct PackedVUYA {
-    static YUVPixels Pixels(I32 vuya) {
-        const I32 u = ShiftRight<8>(vuya) & Ints(0xff);
-        const I32 v = ShiftLeft<16>(vuya) & Ints(0xff0000);
-        return {u | v, ShiftRight<16>(vuya) & Ints(0xff)};
+    static I32 Chroma(I32 vuya) {
+        if constexpr (kHasByteShuffle)
+            return HalvesAt<1, 0, 5, 4, 9, 8, 13, 12>(vuya) & Ints(0x00ff00ff);
+        else
+            return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
     }
+
+    static YUVPixels Pixels(I32 vuya) { return {Chroma(vuya), ShiftRight<16>(vuya) & Ints(0xff)}; }
 
     static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
         first = Pixels(LoadInts(source));
@@ -46,7 +49,7 @@ struct Downsample32f : Neighbours<1, 16, 1, 0> {
 };
 
 void DownsampleRow32f(const void* source, void* destination, int32_t width) {
-    const int32_t paired = width & ~1;
+    const int32_t paired = width / 2 * 2;
     WindowRow<Downsample32f>(source, destination, paired);
     if (paired < width)
         Downsample32f::LonePixel(static_cast<const uint8_t*>(source) + SourceBytes<Downsample32f>(paired),

@@ -14,11 +14,11 @@ namespace PK {
 /// - 4:2:0 planar: the three planes in one block.
 /// - Any other stream: as many bytes as the row bytes of both images tell.
 ///
-/// \return PK_Success, also with nothing done for a raster of height below 1 or width 0; PK_ErrBadSrcFormat
-/// for
-///         a format that is neither a raster format of the catalogue nor a stream; PK_ErrSizeMismatch for an
-///         unknown stream with different row bytes; PK_ErrFailed for a width below 0 or above kMaximumWidth
-///         (DV ignores it), negative row bytes of an unknown stream, or a null pointer.
+/// \return PK_Success, also with nothing done for a raster of height below 1 or width 0;
+///         PK_ErrBadSrcFormat for a format that is neither a raster format of the catalogue nor a stream;
+///         PK_ErrSizeMismatch for an unknown stream with different row bytes;
+///         PK_ErrFailed for a null pointer, a negative width of a raster or of 4:2:0, a raster wider than
+///         kMaximumWidth, or negative row bytes of an unknown stream.
 PK_Result CopySameFormat(const SourceImage& source, const DestinationImage& destination) noexcept;
 
 } // namespace PK

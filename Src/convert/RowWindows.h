@@ -35,7 +35,7 @@ struct Neighbours {
 using NoNeighbours = Neighbours<1, 0, 0, 0>;
 
 /// The bytes of `pixels` pixels, of which `unit` cannot be parted.
-inline int64_t UnitBytes(int64_t pixels, int32_t unit, int32_t bytesPerUnit) {
+constexpr int64_t UnitBytes(int64_t pixels, int32_t unit, int32_t bytesPerUnit) {
     return (pixels + unit - 1) / unit * bytesPerUnit;
 }
 
@@ -51,34 +51,49 @@ int64_t DestinationBytes(int64_t pixels) {
                      Formula::kDestinationBytes * Formula::kDestinationUnit / Formula::kPixels);
 }
 
-/// A window of the source that is complete only by repetition or padding. `pixelsLeft` counts from the
-/// group's first pixel to the end of the row.
+/// Fills the neighbours that a window lacks with the first and the last of the row. `pixelsLeft` counts from
+/// the group's first pixel to the end of the row.
 template <class Formula>
-void EndGroup(const uint8_t* source, uint8_t* destination, bool isFirst, int64_t pixelsLeft) {
-    constexpr int32_t kWindowBytes = Formula::kBytesBefore + Formula::kSourceBytes + Formula::kBytesAfter;
-    constexpr int32_t kWindowUnits =
-        Formula::kNeighboursBefore + Formula::kPixels / Formula::kNeighbourPixels + Formula::kNeighboursAfter;
-    alignas(32) uint8_t window[kWindowBytes];
-    std::memset(window, Formula::kPadding, sizeof window);
-    const int64_t lacking = isFirst ? Formula::kBytesBefore : 0;
-    const int64_t left = Formula::kBytesBefore + SourceBytes<Formula>(pixelsLeft);
-    const int64_t end = left < kWindowBytes ? left : kWindowBytes;
-    std::memcpy(window + lacking, source - (Formula::kBytesBefore - lacking),
-                static_cast<size_t>(end - lacking));
-
+void RepeatEnds(uint8_t* window, bool isFirst, int64_t pixelsLeft) {
+    constexpr int32_t kGroupUnits = Formula::kPixels / Formula::kNeighbourPixels;
+    constexpr int32_t kUnits = Formula::kNeighboursBefore + kGroupUnits + Formula::kNeighboursAfter;
     if (isFirst)
         for (int32_t i = Formula::kNeighboursBefore; i > 0; --i) Formula::Repeat(window, i, i - 1);
-    const int64_t units = UnitBytes(pixelsLeft, Formula::kNeighbourPixels, 1);
-    for (int64_t i = 0; i < Formula::kNeighboursAfter; ++i) {
-        const int64_t next = Formula::kNeighboursBefore + units + i;
-        if (next < kWindowUnits)
-            Formula::Repeat(window, static_cast<int32_t>(next - 1), static_cast<int32_t>(next));
+    const int64_t end = Formula::kNeighboursBefore + UnitBytes(pixelsLeft, Formula::kNeighbourPixels, 1);
+    for (int64_t i = end; i < kUnits && i < end + Formula::kNeighboursAfter; ++i)
+        Formula::Repeat(window, static_cast<int32_t>(i - 1), static_cast<int32_t>(i));
+}
+
+/// Where a group stands in its rows, and the pixels from there to their end.
+template <class Formula>
+struct Position {
+    const uint8_t* source;
+    uint8_t* destination;
+    int64_t pixelsLeft;
+
+    void Advance() {
+        source += Formula::kSourceBytes;
+        destination += Formula::kDestinationBytes;
+        pixelsLeft -= Formula::kPixels;
     }
+};
+
+/// A group whose window is complete only by repetition or padding.
+template <class Formula>
+void EndGroup(Position<Formula> at, bool isFirst) {
+    alignas(32) uint8_t window[Formula::kBytesBefore + Formula::kSourceBytes + Formula::kBytesAfter];
+    std::memset(window, Formula::kPadding, sizeof window);
+    const int64_t before = isFirst ? 0 : Formula::kBytesBefore;
+    const int64_t left = SourceBytes<Formula>(at.pixelsLeft);
+    const int64_t wanted = Formula::kSourceBytes + Formula::kBytesAfter;
+    std::memcpy(window + Formula::kBytesBefore - before, at.source - before,
+                static_cast<size_t>(before + (left < wanted ? left : wanted)));
+    RepeatEnds<Formula>(window, isFirst, at.pixelsLeft);
 
     alignas(32) uint8_t to[Formula::kDestinationBytes];
     Formula::Group(window + Formula::kBytesBefore, to);
-    const int64_t pixels = pixelsLeft < Formula::kPixels ? pixelsLeft : Formula::kPixels;
-    std::memcpy(destination, to, static_cast<size_t>(DestinationBytes<Formula>(pixels)));
+    const int64_t pixels = at.pixelsLeft < Formula::kPixels ? at.pixelsLeft : Formula::kPixels;
+    std::memcpy(at.destination, to, static_cast<size_t>(DestinationBytes<Formula>(pixels)));
 }
 
 /// The pixels that must be left so that a group finds its own source bytes and those after it in the row.
@@ -96,17 +111,15 @@ void WindowRow(const void* sourceRow, void* destinationRow, int32_t width) {
     static_assert(Formula::kPixels % Formula::kDestinationUnit == 0);
     static_assert(Formula::kSourceBytes >= Formula::kBytesBefore,
                   "only the first group lacks what is before");
-    const auto* source = static_cast<const uint8_t*>(sourceRow);
-    auto* destination = static_cast<uint8_t*>(destinationRow);
-    for (int64_t left = width; left > 0; left -= Formula::kPixels) {
-        const bool isFirst = Formula::kBytesBefore > 0 && source == sourceRow;
-        if (left >= PixelsOfWholeGroup<Formula>() && !isFirst)
-            Formula::Group(source, destination);
-        else
-            EndGroup<Formula>(source, destination, isFirst, left);
-        source += Formula::kSourceBytes;
-        destination += Formula::kDestinationBytes;
+    Position<Formula> at = {static_cast<const uint8_t*>(sourceRow), static_cast<uint8_t*>(destinationRow),
+                            width};
+    if (Formula::kBytesBefore > 0 && width > 0) {
+        EndGroup(at, true);
+        at.Advance();
     }
+    for (; at.pixelsLeft >= PixelsOfWholeGroup<Formula>(); at.Advance())
+        Formula::Group(at.source, at.destination);
+    for (; at.pixelsLeft > 0; at.Advance()) EndGroup(at, false);
 }
 
 } // namespace PK::PK_TARGET

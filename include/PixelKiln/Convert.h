@@ -24,7 +24,8 @@ extern "C" {
 /// format the first row is the one at the pointer, and row n lies n times the row bytes further on. No
 /// alignment is asked for. Of each row exactly PK_PixelFormatPackedRowBytes are read or written: an odd width
 /// of a 4:2:2 format goes to the end of its last pair, a width of V210 to the end of its last group of six
-/// pixels. For a stream the row bytes are ignored. Source and destination must not overlap.
+/// pixels. A stream of DV or 4:2:0 ignores its row bytes; one of an unknown kind can only be copied, as a
+/// block of that many bytes. Source and destination must not overlap.
 ///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on
 /// different destinations. PK_Initialize must have been called. During the call MXCSR has the flush-to-zero
@@ -52,8 +53,7 @@ extern "C" {
 ///  - PK_ErrOutOfMemory: no memory for a picture between decoding, conversion and encoding, or for rows above
 ///    16384 pixels.
 ///  - PK_ErrFailed: a null pointer, a negative width, a width too great, a negative height where a stream is
-///  to
-///    be written, or no way between the formats.
+///    to be written, negative row bytes of a stream of unknown kind, or no way between the formats.
 ///  - whatever a decoder or encoder reports.
 ///
 /// Arguments are checked before memory is touched. After a failure of a codec or a lack of memory the

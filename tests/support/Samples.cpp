@@ -2,6 +2,7 @@
 
 #include "frame/PixelFormat.h"
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <cstdlib>
@@ -126,6 +127,31 @@ std::string FirstDifference(PK_PixelFormat format, size_t bytes, const uint8_t* 
         return FirstDifferenceOf<uint32_t>(bytes, expected, actual, same);
     default:
         return FirstDifferenceOf<uint8_t>(bytes, expected, actual, same);
+    }
+}
+
+std::string FirstDifferenceBeyond(PK_PixelFormat format, size_t bytes, const uint8_t* expected,
+                                  const uint8_t* actual) {
+    const auto nearCodes = [](int a, int b) { return std::abs(a - b) <= 1; };
+    switch (format & kDepthMask) {
+    case kDepth32f:
+        return FirstDifferenceOf<float>(bytes, expected, actual, [](float a, float b) {
+            const float scale = std::max({1.0f, std::abs(a), std::abs(b)});
+            return std::abs(a - b) <= 4e-6f * scale || a == b || (std::isnan(a) && std::isnan(b));
+        });
+    case kDepth15u:
+        return FirstDifferenceOf<uint16_t>(bytes, expected, actual, nearCodes);
+    case kDepth10u: {
+        const int firstBit = IsYUV(format) ? 0 : 2;
+        return FirstDifferenceOf<uint32_t>(bytes, expected, actual, [=](uint32_t a, uint32_t b) {
+            const auto sample = [](uint32_t word, int bit) { return static_cast<int>(word >> bit & 1023); };
+            for (int bit = firstBit; bit < firstBit + 30; bit += 10)
+                if (!nearCodes(sample(a, bit), sample(b, bit))) return false;
+            return true;
+        });
+    }
+    default:
+        return FirstDifferenceOf<uint8_t>(bytes, expected, actual, nearCodes);
     }
 }
 

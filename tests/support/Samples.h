@@ -23,4 +23,9 @@ void FillOrdinarySamples(PK_PixelFormat format, uint8_t* row, size_t bytes, Rand
 std::string FirstDifference(PK_PixelFormat format, size_t bytes, const uint8_t* expected,
                             const uint8_t* actual, int64_t ulps = 0);
 
+/// As FirstDifference, for results behind a computation that is not exact to the bit: codes may differ by 1
+/// and floats by 4e-6 of the larger of 1 and their value.
+std::string FirstDifferenceBeyond(PK_PixelFormat format, size_t bytes, const uint8_t* expected,
+                                  const uint8_t* actual);
+
 } // namespace PKTest

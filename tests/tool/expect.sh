@@ -4,6 +4,8 @@ set -u
 program=$(realpath "$1")
 media=$(realpath "$2")
 pictures=$(realpath "$3")
+# For builds with sanitizers.
+export LSAN_OPTIONS="suppressions=$(realpath "$(dirname "$0")")/leaks.supp:print_suppressions=0"
 scratch=$(mktemp -d)
 trap 'rm -rf "$scratch"' EXIT
 chmod 755 "$scratch"

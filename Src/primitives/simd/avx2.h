@@ -356,13 +356,9 @@ inline F32 ToFloat(F64 a) {
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
 /// The block i is loaded from, or stored to, i x stride bytes further on.
-inline I32 LoadIntBlocks(const void* source, int32_t stride) {
-    const auto* second = static_cast<const uint8_t*>(source) + stride;
-    return {
-        _mm256_loadu2_m128i(reinterpret_cast<const __m128i*>(second), static_cast<const __m128i*>(source))};
-}
 inline F32 LoadFloatBlocks(const void* source, int32_t stride) {
-    return FromBits(LoadIntBlocks(source, stride));
+    const auto* second = static_cast<const uint8_t*>(source) + stride;
+    return {_mm256_loadu2_m128(reinterpret_cast<const float*>(second), static_cast<const float*>(source))};
 }
 inline void StoreBlocks(void* destination, int32_t stride, I32 a) {
     auto* second = static_cast<uint8_t*>(destination) + stride;
@@ -378,16 +374,10 @@ inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm256_unpacklo_epi32(a.v, b.v)};
     high = {_mm256_unpackhi_epi32(a.v, b.v)};
 }
-/// In each block: a0 a2 b0 b2 and a1 a3 b1 b3.
-inline void DeinterleaveInBlocks(I32 a, I32 b, I32& even, I32& odd) {
-    const __m256 first = _mm256_castsi256_ps(a.v), second = _mm256_castsi256_ps(b.v);
-    even = {_mm256_castps_si256(_mm256_shuffle_ps(first, second, _MM_SHUFFLE(2, 0, 2, 0)))};
-    odd = {_mm256_castps_si256(_mm256_shuffle_ps(first, second, _MM_SHUFFLE(3, 1, 3, 1)))};
-}
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.
 inline I32 LoadThrees(const void* source) {
-    const I32 blocks = LoadIntBlocks(source, 8); // the second ends with the last of the 24 bytes
+    const I32 blocks = Bits(LoadFloatBlocks(source, 8)); // the second ends with the last of the 24 bytes
     const __m256i order = _mm256_setr_epi32(0, 1, 2, 7, 5, 6, 7, 7);
     return {_mm256_blend_epi32(_mm256_permutevar8x32_epi32(blocks.v, order), _mm256_setzero_si256(), 0x88)};
 }

@@ -412,9 +412,6 @@ inline F32 ToFloat(F64 a) {
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
 /// The block i is loaded from, or stored to, i x stride bytes further on.
-inline I32 LoadIntBlocks(const void* source, [[maybe_unused]] int32_t stride) {
-    return LoadInts(source);
-}
 inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int32_t stride) {
     return LoadFloats(source);
 }
@@ -429,11 +426,6 @@ inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, F32 
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {{a.lane[0], b.lane[0], a.lane[1], b.lane[1]}};
     high = {{a.lane[2], b.lane[2], a.lane[3], b.lane[3]}};
-}
-/// In each block: a0 a2 b0 b2 and a1 a3 b1 b3.
-inline void DeinterleaveInBlocks(I32 a, I32 b, I32& even, I32& odd) {
-    even = {{a.lane[0], a.lane[2], b.lane[0], b.lane[2]}};
-    odd = {{a.lane[1], a.lane[3], b.lane[1], b.lane[3]}};
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.

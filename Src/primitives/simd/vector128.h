@@ -385,9 +385,6 @@ inline F32 ToFloat(F64 a) {
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
 /// The block i is loaded from, or stored to, i x stride bytes further on.
-inline I32 LoadIntBlocks(const void* source, [[maybe_unused]] int32_t stride) {
-    return LoadInts(source);
-}
 inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int32_t stride) {
     return LoadFloats(source);
 }
@@ -402,12 +399,6 @@ inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, F32 
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm_unpacklo_epi32(a.v, b.v)};
     high = {_mm_unpackhi_epi32(a.v, b.v)};
-}
-/// In each block: a0 a2 b0 b2 and a1 a3 b1 b3.
-inline void DeinterleaveInBlocks(I32 a, I32 b, I32& even, I32& odd) {
-    const __m128 first = _mm_castsi128_ps(a.v), second = _mm_castsi128_ps(b.v);
-    even = {_mm_castps_si128(_mm_shuffle_ps(first, second, _MM_SHUFFLE(2, 0, 2, 0)))};
-    odd = {_mm_castps_si128(_mm_shuffle_ps(first, second, _MM_SHUFFLE(3, 1, 3, 1)))};
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.
