@@ -16,7 +16,7 @@ struct Difference {
     int64_t differingPixels = 0;
 };
 
-/// \param a, b  both BGRA_4444_8u or both BGRA_4444_32f, of one size.
+/// \param a,  b  both BGRA_4444_8u or both BGRA_4444_32f, of one size.
 Difference MeasureDifference(const Frame& a, const Frame& b);
 
 /// The differences of two BGRA_4444_8u pictures as an opaque picture, `factor` times as bright.

@@ -28,7 +28,8 @@ private:
 /// The reader of our output has gone; nothing is left to say to it.
 class BrokenPipe {};
 
-/// Throws for a failed system call on a file. \param what  such as "cannot write 'x.png'".
+/// Throws for a failed system call on a file.
+/// \param what  such as "cannot write 'x.png'".
 [[noreturn]] void ThrowFileFailure(const std::string& what, int error);
 
 } // namespace tool

@@ -1,6 +1,7 @@
 #include "NumberedName.h"
 
-#include <algorithm>
+#include "Failure.h"
+
 #include <charconv>
 
 namespace tool {
@@ -13,8 +14,11 @@ NumberedName::NumberedName(const std::string& name) : fName(name) {
     if (end == std::string::npos || name[end] != 'd') return;
     fStart = start;
     fLength = end + 1 - start;
-    std::from_chars(name.data() + start + 1, name.data() + end, fDigits);
-    fDigits = std::min(fDigits, kMaximalDigits);
+    const auto digits = std::from_chars(name.data() + start + 1, name.data() + end, fDigits);
+    if (digits.ec == std::errc::result_out_of_range || fDigits > kMaximalDigits)
+        throw Failure(kExitUsage, "'" + name + "' asks for numbers of more than 20 digits; use fewer");
+    if (name.find('%', end) != std::string::npos)
+        throw Failure(kExitUsage, "'" + name + "' has more than one place for a number; leave one");
 }
 
 std::string NumberedName::At(int64_t index) const {

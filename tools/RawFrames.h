@@ -22,8 +22,8 @@ int64_t RawFrameBytes(const Frame& frame, RowPacking packing);
 
 class RawReader {
 public:
-    /// \param like  a frame of the format and size that the file holds.
-    /// A regular file of any other length than a whole number of such frames is refused here.
+    /// \param like  a frame of the format and size that the file holds. A regular file of any other length
+    ///              than a whole number of such frames is refused here.
     RawReader(const std::string& name, const Frame& like, RowPacking packing);
 
     /// Frames in the file; 0 if that shows only at its end, as with a pipe.

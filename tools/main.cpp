@@ -4,6 +4,7 @@
 #include "Commands.h"
 #include "Failure.h"
 #include "OutputFile.h"
+#include "Terminal.h"
 
 #include <CLI/CLI.hpp>
 #include <PixelKiln/PixelKiln.h>
@@ -11,7 +12,9 @@
 #include <csignal>
 #include <cstdio>
 #include <exception>
+#include <iostream>
 #include <memory>
+#include <sstream>
 
 namespace {
 
@@ -106,7 +109,7 @@ void AddPictures(CLI::App& program) {
     compare.app
         ->add_option("--limit", compare.options->limit,
                      "Fail if any sample differs by more, in steps of 1/255")
-        ->check(CLI::NonNegativeNumber);
+        ->check(CLI::Range(0.0, 255.0)); // refuses not-a-number too
 
     const Command<SheetOptions> sheet(program, "sheet", "Draw pictures side by side", RunSheet);
     sheet.app->add_option("OUT", sheet.options->output, "PNG file to write")->required();
@@ -140,7 +143,10 @@ int Run(int count, char** words) {
     try {
         program.parse(count, words);
     } catch (const CLI::ParseError& error) {
-        return program.exit(error) == 0 ? kExitOK : kExitUsage;
+        std::ostringstream said; // so that a full disk is noticed as with every other output
+        const int code = program.exit(error, said, std::cerr);
+        Print(said.str());
+        return code == 0 ? kExitOK : kExitUsage;
     }
     if (!program.get_subcommands().empty()) return kExitOK;
     std::fputs(program.help().c_str(), stderr);

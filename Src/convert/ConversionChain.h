@@ -27,8 +27,8 @@ struct ConversionChain {
     int32_t passCount = 0;                ///< What runs: neighbouring steps with a joint body are one pass.
     RowKernel passes[kMaximumSteps] = {}; ///< The passes in order; they give the numbers of the steps.
 
-    /// Finds the way from source to destination and takes the best bodies that the capability flags allow at
-    /// this moment. `count` stays 0 where there is none: for any format that is no raster format of the
+    /// Finds the way from source to destination and takes the best bodies that the capability flags allow
+    /// at this moment. `count` stays 0 where there is none: for any format that is no raster format of the
     /// catalogue, above all.
     /// \param quality  render quality, 0 to 5.
     void Build(PK_PixelFormat source, PK_PixelFormat destination, int32_t quality) noexcept;
@@ -37,8 +37,8 @@ struct ConversionChain {
     /// \param source       row in the source format; neither aligned nor overlapping the destination.
     /// \param destination  row in the destination format. Only the bytes of its pixels are written.
     /// \param width        pixels, 0 to kMaximumWidth.
-    /// \return PK_Success; PK_ErrFailed for an empty chain and PK_ErrOutOfMemory if a row above 16384 pixels
-    ///         found no scratch, both with nothing written.
+    /// \return PK_Success; PK_ErrFailed for an empty chain and PK_ErrOutOfMemory if a row above 16384
+    ///         pixels found no scratch, both with nothing written.
     PK_Result ConvertRow(const void* source, void* destination, int32_t width) const noexcept;
 
     /// Converts one row through scratch that WithScratch gave for this width or a greater one. The chain is

@@ -70,13 +70,15 @@ struct Premultiply32f : SampleGroup<4, 4> {
     }
 };
 
+// A host may have unmasked floating-point exceptions, and alpha 0 is ordinary: so nothing here divides by it.
+
 /// nearest((c - zero) x (255 / a) + zero), clamped by the pack; a pixel of alpha 0 becomes all zeros.
 inline I32 UnpremultiplyChannel(I32 channel, F32 factor, float zero) {
     return Nearest((ToFloat(channel) - Floats(zero)) * factor + Floats(zero));
 }
 
 inline I32 Unpremultiply(IntChannels pixel, float chromaZero, float lumaZero) {
-    const F32 factor = Floats(255) / ToFloat(pixel.c3);
+    const F32 factor = Floats(255) / Max(ToFloat(pixel.c3), Floats(1));
     const I32 result = PackByteChannels(UnpremultiplyChannel(pixel.c0, factor, chromaZero),
                                         UnpremultiplyChannel(pixel.c1, factor, chromaZero),
                                         UnpremultiplyChannel(pixel.c2, factor, lumaZero), pixel.c3);
@@ -109,7 +111,8 @@ struct Unpremultiply15u : SampleGroup<2, 2> {
         const I32 samples = LoadWords(source);
         const F32 values = ToFloat(samples);
         const F32 alpha = BroadcastAlpha<kAlphaFirst>(values);
-        const I32 scaled = Min(Nearest(values * (Floats(32768) / alpha)), Ints(32768));
+        const F32 factor = Floats(32768) / Max(alpha, Floats(1));
+        const I32 scaled = Min(Nearest(values * factor), Ints(32768));
         const I32 colour = scaled & Less(Floats(0), alpha);
         StoreWords(destination, Select(AlphaMask<kAlphaFirst>(), samples, colour));
     }
@@ -121,8 +124,10 @@ struct Unpremultiply32f : SampleGroup<4, 4> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const F32 pixels = LoadFloats(source);
         const F32 alpha = BroadcastAlpha<kAlphaFirst>(pixels);
-        const F32 scaled = Select(AlphaMask<kAlphaFirst>(), pixels, pixels * ReciprocalEstimate(alpha));
-        Store(destination, Select(Less(alpha, Floats(8e-6f)), Floats(0), scaled));
+        const F32 least = Floats(8e-6f);
+        const F32 factor = ReciprocalEstimate(Max(least, alpha)); // NaN stays
+        const F32 scaled = Select(AlphaMask<kAlphaFirst>(), pixels, pixels * factor);
+        Store(destination, Select(Less(alpha, least), Floats(0), scaled));
     }
 };
 

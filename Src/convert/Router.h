@@ -18,8 +18,8 @@ struct ConversionStep {
 /// \param destination  format it is to end in; the same as `current` gives a copy.
 /// \param quality      render quality, 0 to 5; above 1, float 4:2:2 chroma is interpolated.
 /// \param step         receives the next kernel; Kernel::None on failure.
-/// \return PK_Success; PK_ErrBadSrcFormat or PK_ErrBadDstFormat for a format that is no raster format of the
-///         catalogue, or at which the rules end; PK_ErrFailed where no kernel serves.
+/// \return PK_Success; PK_ErrBadSrcFormat or PK_ErrBadDstFormat for a format that is no raster format of
+///         the catalogue, or at which the rules end; PK_ErrFailed where no kernel serves.
 ///
 /// Reads the SSE2 capability flag: one direct kernel is on offer only with it.
 PK_Result ChooseConversionStep(PK_PixelFormat current, PK_PixelFormat destination, int32_t quality,

@@ -12,7 +12,8 @@ inline constexpr float kReciprocal219 = 0x1.2b404ap-8f; // 0x3b95a025, 1 / 219
 
 /// Interleaved V, U, Y, A codes to float: chroma about 0, luma and alpha from 0 to 1.
 inline F32 ExpandVUYA(F32 codes) {
-    return (codes - PixelFloats(128, 128, 16, 0)) *
+    // Added, not subtracted: alpha minus 0 would be -0 at code 0 when rounding down.
+    return (codes + PixelFloats(-128, -128, -16, 0)) *
            PixelFloats(kReciprocal224, kReciprocal224, kReciprocal219, kReciprocal255);
 }
 

@@ -16,11 +16,11 @@ struct DecodeTarget {
 
 /// Decides what to decode to. Decoders stop at a reduced size where that is what is wanted, or, at a render
 /// quality below 3, where the wanted size is smaller than the picture.
-/// \param stream   format and size of the stream.
-/// \param wanted   format and size that the caller is after.
-/// \param target   receives the answer; untouched on failure.
-/// \return PK_Success; PK_ErrBadSrcFormat for a format that is no stream of the catalogue; PK_ErrNotSupported
-///         for a stream whose decoder is not there.
+/// \param stream  format and size of the stream.
+/// \param wanted  format and size that the caller is after.
+/// \param target  receives the answer; untouched on failure.
+/// \return PK_Success; PK_ErrBadSrcFormat for a format that is no stream of the catalogue;
+///         PK_ErrNotSupported for a stream whose decoder is not there.
 PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wanted, int32_t quality,
                              DecodeTarget& target) noexcept;
 

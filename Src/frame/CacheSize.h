@@ -12,8 +12,8 @@ extern uint64_t sLargestCacheBytes;
 /// Bytes of the largest unified cache, as the last start of the library found it.
 uint64_t LargestCacheBytes() noexcept;
 
-/// Asks the system and stores level and size; where the system does not tell, values that fit the capability
-/// flags as they stand.
+/// Asks the system and stores level and size; where the system does not tell, values that fit the
+/// capability flags as they stand.
 /// \param systemValue  sysconf, or what stands for it.
 void DetectCache(long (*systemValue)(int)) noexcept;
 

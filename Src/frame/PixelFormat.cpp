@@ -23,6 +23,7 @@ int64_t PlanarSize(int64_t width, int64_t height) {
 } // namespace
 
 int32_t BytesPerPixel(PK_PixelFormat format) noexcept {
+    if (format == PK_PixelFormat_Invalid) return 0; // though its bits are those of 8-bit samples
     const bool fourChannels = IsPacked4444(format);
     switch (format & kDepthMask) {
     case kDepth8u:

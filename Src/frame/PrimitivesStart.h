@@ -12,8 +12,8 @@ struct TraceSite {
     bool enabled = false;
 };
 
-/// Writes a warning if the status is one (positive) and the channel is on. Never fails: a line that cannot be
-/// composed is not written.
+/// Writes a warning if the status is one (positive) and the channel is on. Never fails: a line that cannot
+/// be composed is not written.
 /// \param statusText  the primitives' text for the status.
 void TraceInitialiserWarning(TraceSite& site, int32_t status, const char* statusText) noexcept;
 

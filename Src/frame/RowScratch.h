@@ -17,7 +17,8 @@ constexpr bool RowScratchIsOnStack(uint64_t bytes) {
 }
 
 /// Calls use(scratch) with \p bytes of uninitialised scratch and returns what it returns, or
-/// PK_ErrOutOfMemory without a call if the scratch cannot be had. \param bytes  0 gives a null pointer.
+/// PK_ErrOutOfMemory without a call if the scratch cannot be had.
+/// \param bytes  0 gives a null pointer.
 /// \param use    takes a uint8_t* (64-byte aligned on the stack, else 16-byte) and returns a PK_Result.
 ///
 /// Never inlined: the stack scratch is this frame's, and a loop around the call would otherwise collect it.

@@ -36,9 +36,9 @@ private:
 uint32_t TraceChangeCount() noexcept;
 
 /// Whether a channel traces messages of a level.
-/// \param channel          name of the channel.
-/// \param level            level of the message; higher is more talkative.
-/// \param enabledByDefault the answer for a channel that nobody has set.
+/// \param channel           name of the channel.
+/// \param level             level of the message; higher is more talkative.
+/// \param enabledByDefault  the answer for a channel that nobody has set.
 bool TraceEnabled(const char* channel, int32_t level, bool enabledByDefault);
 
 /// Lets a channel trace messages up to a level; below 0 silences it.

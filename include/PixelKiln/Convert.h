@@ -53,7 +53,8 @@ extern "C" {
 ///  - PK_ErrOutOfMemory: no memory for a picture between decoding, conversion and encoding, or for rows above
 ///    16384 pixels.
 ///  - PK_ErrFailed: a null pointer, a negative width, a width too great, a negative height where a stream is
-///    to be written, negative row bytes of a stream of unknown kind, or no way between the formats.
+///    to be written, negative row bytes of a stream of unknown kind, or no way between the formats. A copy of
+///    a stream of unknown kind looks at no width.
 ///  - whatever a decoder or encoder reports.
 ///
 /// Arguments are checked before memory is touched. After a failure of a codec or a lack of memory the

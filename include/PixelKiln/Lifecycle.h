@@ -10,10 +10,10 @@
 
 extern "C" {
 
-/// Starts the library. Calls nest: only the one that brings the count of open calls to 1 does any work, which
-/// is to detect the processor (this sets capability flags and never clears any), to read the host's settings
-/// "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), and to start the
-/// primitives. Every call wants a matching PK_Terminate.
+/// Starts the library. Calls nest: only the one that brings the count of open calls to 1 does any work,
+/// which is to detect the processor (this sets capability flags and never clears any), to read the host's
+/// settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), and to
+/// start the primitives. Every call wants a matching PK_Terminate.
 /// \return always PK_Success.
 PK_API PK_Result PK_Initialize(void) noexcept;
 
@@ -23,9 +23,10 @@ PK_API PK_Result PK_Initialize(void) noexcept;
 PK_API PK_Result PK_Terminate(void) noexcept;
 
 /// Sets one of the numbered switches. A capability that the processor lacks can be switched on; nothing
-/// guards against that. \param which  0 blur of motion in linear light; 2 SSE, 3 SSE2, 4 SSE3, 5 SSSE3, 6
-/// SSE4.1, 7 SSE4.2, 8 AVX,
-///               9 AVX2; 10 every format has its origin at the top left. 1 and all above 10 are ignored.
+/// guards against that.
+/// \param which  0 blur of motion in linear light; 2 SSE, 3 SSE2, 4 SSE3, 5 SSSE3, 6 SSE4.1, 7 SSE4.2, 8
+///               AVX, 9 AVX2; 10 every format has its origin at the top left. 1 and all above 10 are
+///               ignored.
 /// \param value  0 is off, anything else on.
 /// \return always PK_Success.
 PK_API PK_Result PK_SetDebugFlag(uint32_t which, int32_t value) noexcept;

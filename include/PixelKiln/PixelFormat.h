@@ -144,13 +144,11 @@ PK_API PK_PixelFormat PK_ZEBPixelFormatToPKPixelFormat(const zebmediatypes::Pixe
 
 /// The bytes that one image takes, rows padded as PK_PixelFormatRowBytes pads them.
 /// \param format  any format. A DV format has a frame of fixed size and ignores \p width and \p height. A
-/// 4:2:0
-///                format counts its three planes as PK_GetPlanarBuffers lays them out.
+///                4:2:0 format counts its three planes as PK_GetPlanarBuffers lays them out.
 /// \param width   pixels in a row.
 /// \param height  rows.
-/// \return the number of bytes; 0 for a format without a known layout. For a raster format the product is
-/// formed
-///         in 32 bits and sign-extended, so that one above 2147483647 bytes wraps; hosts rely on it.
+/// \return the number of bytes; 0 for Invalid and for a format without a known layout. For a raster format the product is
+///         formed in 32 bits and sign-extended, so that one above 2147483647 bytes wraps; hosts rely on it.
 PK_API int64_t PK_PixelFormatSize(PK_PixelFormat format, int32_t width, int32_t height) noexcept;
 
 /// Whether the first row in memory is the top row of the picture. So it is for all formats but the
@@ -162,15 +160,17 @@ PK_API bool PK_IsOriginTopLeft(PK_PixelFormat format) noexcept;
 PK_API bool PK_IsOriginBottomLeft(PK_PixelFormat format) noexcept;
 
 /// The bytes from one row to the next. Rows are padded to 128 bytes for V210, to 16 for other 4:2:2 formats
-/// and to 64 for the rest. \param format  any format. \param width   pixels in a row; the bytes are computed
-/// in 32 bits and wrap beyond. \return the number of bytes; 0 for a stream (DV and 4:2:0 planar) and for an
-/// unknown depth.
+/// and to 64 for the rest.
+/// \param format  any format.
+/// \param width   pixels in a row; the bytes are computed in 32 bits and wrap beyond.
+/// \return the number of bytes; 0 for a stream (DV and 4:2:0 planar), for Invalid and for an unknown depth.
 PK_API int32_t PK_PixelFormatRowBytes(PK_PixelFormat format, int32_t width) noexcept;
 
-/// The bytes that the pixels of a row take, without padding. A 4:2:2 row is counted in whole pairs of pixels,
-/// a V210 row in whole groups of six. \param format  any format. \param width   pixels in a row; the bytes
-/// are computed in 32 bits and wrap beyond. \return the number of bytes; 0 for an unknown depth of a 4:4:4
-/// format.
+/// The bytes that the pixels of a row take, without padding. A 4:2:2 row is counted in whole pairs of
+/// pixels, a V210 row in whole groups of six.
+/// \param format  any format.
+/// \param width   pixels in a row; the bytes are computed in 32 bits and wrap beyond.
+/// \return the number of bytes; 0 for Invalid and for an unknown depth of a 4:4:4 format.
 PK_API int32_t PK_PixelFormatPackedRowBytes(PK_PixelFormat format, int32_t width) noexcept;
 
 /// The name of a format, for tracing. RGB_444_10u has no entry and counts as unknown.

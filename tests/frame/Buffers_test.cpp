@@ -63,7 +63,7 @@ TEST(Buffers, OfEqualSizeBeginAtDifferentDistancesFromAPage) {
 
 TEST(Buffers, OfNoSizeSucceedAndAreNull) {
     PixelBuffer invalid;
-    EXPECT_EQ(invalid.Allocate(PK_PixelFormat_Invalid, 0, 100), PK_Success);
+    EXPECT_EQ(invalid.Allocate(PK_PixelFormat_Invalid, 100, 100), PK_Success);
     EXPECT_TRUE(invalid.IsEmpty());
     EXPECT_EQ(invalid.rowBytes, 0);
 

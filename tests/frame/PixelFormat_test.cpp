@@ -53,8 +53,7 @@ constexpr SizeCase kSizes[] = {
     {0x40, 1, 64, 4},
     {0x40, 17, 128, 68},
     // Numbers without a name go by their bits.
-    {0x0, 1, 64, 2},      // 8-bit, one channel of two bytes
-    {0x0, 33, 128, 66},   //
+    {0x0, 33, 0, 0},      // but Invalid, which has no size
     {0x801, 33, 128, 66}, //
     {0x100, 1, 64, 8},    // float without alpha
     {0x100, 9, 128, 72},  //
