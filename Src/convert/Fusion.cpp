@@ -13,12 +13,16 @@ constexpr Kernel kStraight601[] = {RGBToYUV601Row, PremultiplyRow_VUYA_8u, Downs
 constexpr Kernel kStraight709[] = {RGBToYUV709Row, PremultiplyRow_VUYA_8u, Downsample444To422Row};
 constexpr Kernel kOpaque601[] = {RGBToYUV601Row, Downsample444To422Row};
 constexpr Kernel kOpaque709[] = {RGBToYUV709Row, Downsample444To422Row};
+constexpr Kernel kStraightToRGB10[] = {ExpandTo32fRow_RGB_8u, PremultiplyRow_BGRA_32f, BGR32fToRGB10uRow};
+constexpr Kernel kOpaqueToRGB10[] = {ExpandTo32fRow_RGB_8u, BGR32fToRGB10uRow};
 
 constexpr Fusion kFusions[] = {
     {StraightRGBToUYVY601, kStraight601},
     {StraightRGBToUYVY709, kStraight709},
     {RGBToUYVY601, kOpaque601},
     {RGBToUYVY709, kOpaque709},
+    {StraightBGRToRGB10, kStraightToRGB10},
+    {OpaqueBGRToRGB10, kOpaqueToRGB10},
 };
 
 } // namespace

@@ -135,6 +135,8 @@ enum class Kernel : uint8_t {
     RGBToUYVY709,
     StraightRGBToUYVY601,
     StraightRGBToUYVY709,
+    OpaqueBGRToRGB10,
+    StraightBGRToRGB10,
 
     None, // no kernel; also the count of kernels
 };

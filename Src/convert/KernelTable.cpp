@@ -157,6 +157,8 @@ constexpr KernelInfo kRegister[] = {
     {Kernel::StraightRGBToUYVY601, "RGBToYUV601Row + PremultiplyRow + Downsample444To422Row", kBGRA8, kUYVY8},
     {Kernel::StraightRGBToUYVY709, "RGBToYUV709Row + PremultiplyRow + Downsample444To422Row", kBGRA8,
      kUYVY8_709},
+    {Kernel::OpaqueBGRToRGB10, "ExpandTo32fRow + BGR32fToRGB10uRow", kBGRX8, kRGB10},
+    {Kernel::StraightBGRToRGB10, "ExpandTo32fRow + PremultiplyRow + BGR32fToRGB10uRow", kBGRA8, kRGB10},
 };
 // clang-format on
 

@@ -24,11 +24,18 @@ inline I32 ScaleBytesTo10u(I32 codes) {
     return ShiftLeft<2>(codes) + MultiplyHalvesHigh(codes, InBothHalves(772));
 }
 
+/// 4 c + (((c + 42) x 772) >> 16), which is truncated((c / 255) x 1023 + 0.5) for all 256 codes: what a code
+/// becomes by way of floats.
+inline I32 RoundBytesTo10u(I32 codes) {
+    return ShiftLeft<2>(codes) + MultiplyHalvesHigh(codes + InBothHalves(42), InBothHalves(772));
+}
+
+template <I32 (*kScale)(I32)>
 struct BGR8ToRGB10 : PixelGroup<4, 4> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 pixels = LoadInts(source);
-        const I32 blueAndRed = ScaleBytesTo10u(pixels & Ints(0x00ff00ff));
-        const I32 green = ScaleBytesTo10u(ShiftRight<8>(pixels) & Ints(0xff));
+        const I32 blueAndRed = kScale(pixels & Ints(0x00ff00ff));
+        const I32 green = kScale(ShiftRight<8>(pixels) & Ints(0xff));
         const I32 blue = ShiftLeft<2>(blueAndRed & Ints(0x3ff));
         const I32 red = ShiftLeft<6>(blueAndRed & Ints(0x03ff0000));
         Store(destination, blue | ShiftLeft<12>(green) | red);
@@ -57,13 +64,28 @@ inline I32 ScaleFloatsTo10u(F32 values) {
     return Truncate(LimitToUnit(values) * Floats(1023) + Floats(0.5f));
 }
 
+inline void StoreFloatsAs10u(uint8_t* destination, F32 blue, F32 green, F32 red) {
+    Store(destination, ShiftLeft<2>(ScaleFloatsTo10u(blue)) | ShiftLeft<12>(ScaleFloatsTo10u(green)) |
+                           ShiftLeft<22>(ScaleFloatsTo10u(red)));
+}
+
 struct BGR32fToRGB10 : PixelGroup<16, 4> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         Channels bgra;
         LoadFloatChannels(source, bgra.c0, bgra.c1, bgra.c2, bgra.c3);
-        Store(destination, ShiftLeft<2>(ScaleFloatsTo10u(bgra.c0)) |
-                               ShiftLeft<12>(ScaleFloatsTo10u(bgra.c1)) |
-                               ShiftLeft<22>(ScaleFloatsTo10u(bgra.c2)));
+        StoreFloatsAs10u(destination, bgra.c0, bgra.c1, bgra.c2);
+    }
+};
+
+/// Bytes expanded to float and premultiplied on the way. The product of two codes needs the floats'
+/// roundings.
+struct StraightBGR8ToRGB10 : PixelGroup<4, 4> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const IntChannels bgra = LoadByteChannels(source);
+        const F32 scale = Floats(kReciprocal255);
+        const F32 alpha = ToFloat(bgra.c3) * scale;
+        StoreFloatsAs10u(destination, ToFloat(bgra.c0) * scale * alpha, ToFloat(bgra.c1) * scale * alpha,
+                         ToFloat(bgra.c2) * scale * alpha);
     }
 };
 
@@ -118,9 +140,14 @@ template <>
 PK::KernelBodies PK::RGB10Bodies<PK::PK_TARGET::kTarget>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
-        {Kernel::BGR8uToRGB10uRow, Row<BGR8ToRGB10>},    {Kernel::BGR15uToRGB10uRow, Row<BGR15ToRGB10>},
-        {Kernel::BGR32fToRGB10uRow, Row<BGR32fToRGB10>}, {Kernel::RGB10uToBGR8uRow, Row<RGB10ToBGR8>},
-        {Kernel::RGB10uToBGR15uRow, Row<RGB10ToBGR15>},  {Kernel::RGB10uToBGR32fRow, Row<RGB10ToBGR32f>},
+        {Kernel::BGR8uToRGB10uRow, Row<BGR8ToRGB10<ScaleBytesTo10u>>},
+        {Kernel::BGR15uToRGB10uRow, Row<BGR15ToRGB10>},
+        {Kernel::BGR32fToRGB10uRow, Row<BGR32fToRGB10>},
+        {Kernel::RGB10uToBGR8uRow, Row<RGB10ToBGR8>},
+        {Kernel::RGB10uToBGR15uRow, Row<RGB10ToBGR15>},
+        {Kernel::RGB10uToBGR32fRow, Row<RGB10ToBGR32f>},
+        {Kernel::OpaqueBGRToRGB10, Row<BGR8ToRGB10<RoundBytesTo10u>>},
+        {Kernel::StraightBGRToRGB10, Row<StraightBGR8ToRGB10>},
     };
     return bodies;
 }
