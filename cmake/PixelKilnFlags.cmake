@@ -13,3 +13,9 @@ if(PIXELKILN_SANITIZE)
                          -fno-sanitize-recover=all)
   target_link_options(pixelkiln_flags INTERFACE -fsanitize=${PIXELKILN_SANITIZE})
 endif()
+
+# libFuzzer comes with Clang and wants to see which branches of the library its inputs reach.
+if(PIXELKILN_BUILD_FUZZ AND CMAKE_CXX_COMPILER_ID MATCHES Clang)
+  set(PIXELKILN_LIBFUZZER ON)
+  target_compile_options(pixelkiln_flags INTERFACE -fsanitize=fuzzer-no-link)
+endif()

@@ -16,5 +16,7 @@ write_basic_package_version_file(${CMAKE_CURRENT_BINARY_DIR}/PixelKilnConfigVers
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/PixelKilnConfig.cmake
               ${CMAKE_CURRENT_BINARY_DIR}/PixelKilnConfigVersion.cmake DESTINATION ${package_dir})
 
+# Relative to the file itself, so that the installed tree can be moved.
+file(RELATIVE_PATH pkgconfig_prefix /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
 configure_file(${CMAKE_CURRENT_LIST_DIR}/pixelkiln.pc.in ${CMAKE_CURRENT_BINARY_DIR}/pixelkiln.pc @ONLY)
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/pixelkiln.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)

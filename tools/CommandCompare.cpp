@@ -44,9 +44,9 @@ void RunCompare(const CompareOptions& options) {
           std::to_string(difference.differingPixels) + " of " + std::to_string(pixels) +
           (difference.differingPixels == 0 ? ", identical\n" : "\n"));
     const double largest = std::max(difference.largestColour, difference.largestAlpha);
-    if (options.limit >= 0 && largest > options.limit)
+    if (options.limit && !(largest <= *options.limit)) // a limit that is no number is never kept
         throw Failure(kExitFailed, "the largest difference is " + StepsText(largest) +
-                                       ", above the limit of " + StepsText(options.limit));
+                                       ", above the limit of " + StepsText(*options.limit));
 }
 
 } // namespace tool

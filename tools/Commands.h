@@ -4,6 +4,7 @@
 
 #include "Frame.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -40,7 +41,7 @@ void RunConvert(const ConvertOptions& options);
 struct CompareOptions {
     std::string first;
     std::string second;
-    double limit = -1; ///< steps of 8 bits; below 0 there is none
+    std::optional<double> limit; ///< steps of 8 bits
 };
 void RunCompare(const CompareOptions& options);
 

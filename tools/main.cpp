@@ -109,7 +109,7 @@ void AddPictures(CLI::App& program) {
     compare.app
         ->add_option("--limit", compare.options->limit,
                      "Fail if any sample differs by more, in steps of 1/255")
-        ->check(CLI::Range(0.0, 255.0)); // refuses not-a-number too
+        ->check(CLI::NonNegativeNumber);
 
     const Command<SheetOptions> sheet(program, "sheet", "Draw pictures side by side", RunSheet);
     sheet.app->add_option("OUT", sheet.options->output, "PNG file to write")->required();

@@ -24,7 +24,10 @@ SourceImage AsSource(const DestinationImage& image) {
 }
 
 PK_Result ConvertToRaster(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
-    if (source.height < 1) return ConvertRasterRows(source, destination, quality);
+    // What is refused or does nothing has no last row whose address could be taken.
+    const bool hasRows = source.height > 0 && source.width > 0 && source.width <= kMaximumWidth &&
+                         source.pixels != nullptr && destination.pixels != nullptr;
+    if (!hasRows) return ConvertRasterRows(source, destination, quality);
     return ConvertRasterRows(FromBottomOfPicture(source), FromBottomOfPicture(destination), quality);
 }
 

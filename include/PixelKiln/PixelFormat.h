@@ -9,13 +9,14 @@
 /// |-------|-----------------|--------|
 /// | 0     | colour model    | 0 RGB, 1 YUV |
 /// | 1     | light           | 0 gamma-coded, 1 linear |
-/// | 2-3   | alpha kind      | 0 none in the layout, 4 straight (A), 8 premultiplied (P), 0xc stored but
-/// meaningless (X) | | 4-5   | structure       | 0 4:4:4 interleaved, 0x10 4:2:2 interleaved, 0x20 DV, 0x30
-/// 4:2:0 planar | | 6-8   | sample depth    | 0 8u, 0x40 10u packed, 0x80 15u in 16-bit words, 0x100 32f | |
-/// 9-10  | colour matrix   | 0 BT.601, 0x200 BT.709 | | 11    | range           | 0x800 on YUV of video
-/// range; 0 on full range and on RGB | | 12    | component order | 0 BGRA or UYVY, 0x1000 ARGB or YUYV | |
-/// 13-23 | reserved        | 0 | | 24-31 | stream kind     | 0 plain raster, 1 to 8 DV, 9 to 12 planar 4:2:0
-/// |
+/// | 2-3   | alpha kind      | 0 none, 4 straight (A), 8 premultiplied (P), 0xc stored but meaningless (X) |
+/// | 4-5   | structure       | 0 4:4:4 interleaved, 0x10 4:2:2 interleaved, 0x20 DV, 0x30 4:2:0 planar |
+/// | 6-8   | sample depth    | 0 8u, 0x40 10u packed, 0x80 15u in 16-bit words, 0x100 32f |
+/// | 9-10  | colour matrix   | 0 BT.601, 0x200 BT.709 |
+/// | 11    | range           | 0x800 on YUV of video range; 0 on full range and on RGB |
+/// | 12    | component order | 0 BGRA or UYVY, 0x1000 ARGB or YUYV |
+/// | 13-23 | reserved        | 0 |
+/// | 24-31 | stream kind     | 0 plain raster, 1 to 8 DV, 9 to 12 planar 4:2:0 |
 ///
 /// Names give the memory order of a pixel from the lowest address, the channel structure and the depth.
 /// All functions may be called from any thread.

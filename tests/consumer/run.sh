@@ -15,7 +15,7 @@ cmake --build "$work/cmake" >"$work/build.log" || { cat "$work/build.log"; exit 
 "$work/cmake/consumer"
 
 pkgconfig=$(find "$work/prefix" -name pixelkiln.pc -printf '%h')
-flags=$(PKG_CONFIG_PATH=$pkgconfig pkg-config --define-variable=prefix="$work/prefix" --cflags --libs pixelkiln)
+flags=$(PKG_CONFIG_PATH=$pkgconfig pkg-config --cflags --libs pixelkiln)
 # shellcheck disable=SC2086 -- flags are words
 g++ -std=c++20 "$here/consumer.cpp" $flags -o "$work/consumer"
 LD_LIBRARY_PATH=$(dirname "$pkgconfig") "$work/consumer"

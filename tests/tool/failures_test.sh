@@ -63,6 +63,9 @@ expect 1 "cannot convert BGRA_4444_8u to NTSCDV25" convert "$photo" out/x.dv --t
 expect 1 "differ in size" compare "$photo" "$media/chelsea.png"
 "$program" convert --quiet "$photo" in/yuv.png --to VUYA_4444_8u
 expect 1 "above the limit of 0" compare "$photo" in/yuv.png --limit 0
+expect 1 "above the limit of nan" compare "$photo" in/yuv.png --limit nan
+expect 2 "more than one place for a number" convert "$photo" out/x-%d-%d.png
+expect 2 "more than 20 digits" convert "$photo" out/x-%999999999d.png
 is "nothing left behind" "$(names out)" ""
 
 # Full disks: of the output, of standard output, and of an old file that must stay.

@@ -318,7 +318,7 @@ inline I32 PackHalves(I32 a, I32 b) {
     const auto pack = [](uint32_t x) { return Saturate(x & 0xffff, 255) | Saturate(x >> 16, 255) << 8; };
     I32 result;
     for (int i = 0; i < kLanes; ++i) {
-        const uint32_t* pair = i < kLanes / 2 ? a.lane + 2 * i : b.lane + 2 * i - kLanes;
+        const uint32_t* pair = i < kLanes / 2 ? a.lane + 2 * i : b.lane + (2 * i - kLanes);
         result.lane[i] = pack(pair[0]) | pack(pair[1]) << 16;
     }
     return result;
