@@ -4,7 +4,8 @@
 
 add_library(pixelkiln_flags INTERFACE)
 target_compile_options(pixelkiln_flags INTERFACE -ffp-contract=off -Wall -Wextra -Wshadow -Wconversion
-                       -Wno-sign-conversion)
+                       -Wno-sign-conversion
+                       -Wno-restrict) # g++ 12 sees overlaps in std::string's operator+ that are not there
 if(PIXELKILN_WARNINGS_AS_ERRORS)
   target_compile_options(pixelkiln_flags INTERFACE -Werror)
 endif()

@@ -4,8 +4,6 @@
 
 #include "convert/CopyRow.h"
 
-#include "frame/Capabilities.h"
-
 #include <PixelKiln/PixelFormat.h>
 
 #include <array>
@@ -200,18 +198,6 @@ BodyTable MakeBodyTable() {
 
 const KernelInfo& Info(Kernel kernel) noexcept {
     return kRegister[static_cast<std::size_t>(kernel)];
-}
-
-const char* TargetName(Target target) noexcept {
-    constexpr const char* names[kTargetCount] = {"plain", "SSE2", "SSSE3", "SSE4.1", "AVX2"};
-    return names[static_cast<std::size_t>(target)];
-}
-
-bool IsEnabled(Target target) noexcept {
-    const uint8_t flags[kTargetCount] = {1, sCPUHasSSE2, sCPUHasSSSE3, sCPUHasSSE4, sCPUHasAVX2};
-    for (std::size_t i = 0; i <= static_cast<std::size_t>(target); ++i)
-        if (!flags[i]) return false;
-    return true;
 }
 
 RowKernel Body(Kernel kernel, Target target) noexcept {

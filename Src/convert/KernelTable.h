@@ -4,6 +4,7 @@
 // micro-benchmark all read this one table.
 
 #include "convert/Kernel.h"
+#include "frame/Dispatch.h"
 
 #include <PixelKiln/Types.h>
 
@@ -25,12 +26,6 @@ struct KernelInfo {
 };
 
 const KernelInfo& Info(Kernel kernel) noexcept;
-
-const char* TargetName(Target target) noexcept;
-
-/// Whether the capability flags allow the bodies of a target at this moment. A target stands on all lower
-/// ones, so that switching SSE2 off leaves the plain bodies.
-bool IsEnabled(Target target) noexcept;
 
 /// The body for one target, null if the kernel has none.
 RowKernel Body(Kernel kernel, Target target) noexcept;
