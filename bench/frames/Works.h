@@ -39,7 +39,9 @@ inline constexpr Work kWorks[] = {
     {"BGRA 32f to BGRA 8u", PK_PixelFormat_BGRA_4444_32f, PK_PixelFormat_BGRA_4444_8u, Aim::BestPeer},
     {"BGRA 8u to BGRA 15u", PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_BGRA_4444_15u, Aim::BestPeer},
     {"BGRA 15u to BGRA 8u", PK_PixelFormat_BGRA_4444_15u, PK_PixelFormat_BGRA_4444_8u, Aim::BestPeer},
-    {"BGRX 8u to RGB 10u", PK_PixelFormat_BGRX_4444_8u, PK_PixelFormat_RGB_444_10u, Aim::BestPeer},
+    {"BGRP 8u to RGB 10u", PK_PixelFormat_BGRP_4444_8u, PK_PixelFormat_RGB_444_10u, Aim::BestPeer},
+    {"BGRX 8u to RGB 10u, by way of 32f", PK_PixelFormat_BGRX_4444_8u, PK_PixelFormat_RGB_444_10u,
+     Aim::BestPeer},
     {"RGB 10u to BGRX 8u", PK_PixelFormat_RGB_444_10u, PK_PixelFormat_BGRX_4444_8u, Aim::BestPeer},
 
     {"BGRX 8u to UYVY 8u", PK_PixelFormat_BGRX_4444_8u, PK_PixelFormat_UYVY_422_8u, Aim::BestPeer},

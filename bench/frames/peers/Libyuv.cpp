@@ -48,6 +48,8 @@ const AddPeers add = {
      Interleaved<libyuv::ARGBAttenuate>},
     {PK_PixelFormat_BGRP_4444_8u, PK_PixelFormat_BGRA_4444_8u, "libyuv ARGBUnattenuate", Likeness::Same,
      Interleaved<libyuv::ARGBUnattenuate>},
+    {PK_PixelFormat_BGRP_4444_8u, PK_PixelFormat_RGB_444_10u, "libyuv ARGBToAR30 (other bit order)",
+     Likeness::OtherLayout, Interleaved<libyuv::ARGBToAR30>},
     {PK_PixelFormat_BGRX_4444_8u, PK_PixelFormat_RGB_444_10u, "libyuv ARGBToAR30 (other bit order)",
      Likeness::OtherLayout, Interleaved<libyuv::ARGBToAR30>},
     {PK_PixelFormat_RGB_444_10u, PK_PixelFormat_BGRX_4444_8u, "libyuv AR30ToARGB (other bit order)",
