@@ -28,7 +28,11 @@ PK_Result ConvertToRaster(const SourceImage& source, const DestinationImage& des
     const bool hasRows = source.height > 0 && source.width > 0 && source.width <= kMaximumWidth &&
                          source.pixels != nullptr && destination.pixels != nullptr;
     if (!hasRows) return ConvertRasterRows(source, destination, quality);
-    return ConvertRasterRows(FromBottomOfPicture(source), FromBottomOfPicture(destination), quality);
+
+    // Only between a bottom-up and a top-down format do the rows change their order in memory. Otherwise both
+    // are walked upward in memory, which the processor fetches ahead up to twice as fast.
+    const bool turned = PK_IsOriginTopLeft(source.format) != PK_IsOriginTopLeft(destination.format);
+    return ConvertRasterRows(turned ? Reversed(source) : source, destination, quality);
 }
 
 PK_Result Convert(const SourceImage& source, const DestinationImage& destination, int32_t quality);

@@ -28,11 +28,9 @@ using DestinationImage = Image<uint8_t>;
 /// The widest row whose bytes, at 16 a pixel, can be told in 32 bits.
 inline constexpr int32_t kMaximumWidth = INT32_MAX / 16;
 
-/// The image walked from the bottom of the picture up, whichever way its format lies in memory. Of two images
-/// walked so, row meets row. The height is at least 1.
+/// The image walked from its last row in memory to its first. The height is at least 1.
 template <class Byte>
-Image<Byte> FromBottomOfPicture(const Image<Byte>& image) {
-    if (!PK_IsOriginTopLeft(image.format)) return image;
+Image<Byte> Reversed(const Image<Byte>& image) {
     Image<Byte> reversed = image;
     reversed.pixels = image.Row(image.height - 1);
     reversed.rowBytes = -image.rowBytes;
