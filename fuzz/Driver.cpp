@@ -71,7 +71,7 @@ const Family* FindFamily(std::string_view name) {
     std::string known;
     for (const Family* family : Family::All()) {
         if (family->Name() == name) return family;
-        known += " " + std::string(family->Name());
+        known.append(" ").append(family->Name());
     }
     Refuse("no such family; there are:" + known);
 }
