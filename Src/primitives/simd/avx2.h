@@ -356,16 +356,16 @@ inline F32 ToFloat(F64 a) {
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
 /// The block i is loaded from, or stored to, i x stride bytes further on.
-inline F32 LoadFloatBlocks(const void* source, int32_t stride) {
+inline F32 LoadFloatBlocks(const void* source, int64_t stride) {
     const auto* second = static_cast<const uint8_t*>(source) + stride;
     return {_mm256_loadu2_m128(reinterpret_cast<const float*>(second), static_cast<const float*>(source))};
 }
-inline void StoreBlocks(void* destination, int32_t stride, I32 a) {
+inline void StoreBlocks(void* destination, int64_t stride, I32 a) {
     auto* second = static_cast<uint8_t*>(destination) + stride;
     _mm_storeu_si128(static_cast<__m128i*>(destination), _mm256_castsi256_si128(a.v));
     _mm_storeu_si128(reinterpret_cast<__m128i*>(second), _mm256_extracti128_si256(a.v, 1));
 }
-inline void StoreBlocks(void* destination, int32_t stride, F32 a) {
+inline void StoreBlocks(void* destination, int64_t stride, F32 a) {
     StoreBlocks(destination, stride, Bits(a));
 }
 
@@ -416,6 +416,19 @@ inline F32 BlendBlocks(F32 a, F32 b) {
 template <int kMask>
 inline I32 BlendBlocks(I32 a, I32 b) {
     return {_mm256_blend_epi32(b.v, a.v, kMask * 0x11)};
+}
+
+/// In each block: a0 a1 b0 b1 and a2 a3 b2 b3.
+inline F32 LowPairs(F32 a, F32 b) {
+    return {_mm256_shuffle_ps(a.v, b.v, _MM_SHUFFLE(1, 0, 1, 0))};
+}
+inline F32 HighPairs(F32 a, F32 b) {
+    return {_mm256_shuffle_ps(a.v, b.v, _MM_SHUFFLE(3, 2, 3, 2))};
+}
+
+/// All lanes in the other order.
+inline I32 ReverseLanes(I32 a) {
+    return {_mm256_permutevar8x32_epi32(a.v, _mm256_setr_epi32(7, 6, 5, 4, 3, 2, 1, 0))};
 }
 
 } // namespace PK::avx2

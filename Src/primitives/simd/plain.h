@@ -412,13 +412,13 @@ inline F32 ToFloat(F64 a) {
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
 /// The block i is loaded from, or stored to, i x stride bytes further on.
-inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int32_t stride) {
+inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int64_t stride) {
     return LoadFloats(source);
 }
-inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, I32 a) {
+inline void StoreBlocks(void* destination, [[maybe_unused]] int64_t stride, I32 a) {
     Store(destination, a);
 }
-inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, F32 a) {
+inline void StoreBlocks(void* destination, [[maybe_unused]] int64_t stride, F32 a) {
     Store(destination, a);
 }
 
@@ -474,6 +474,19 @@ inline I32 BlendBlocks(I32 a, I32 b) {
 template <int kMask>
 inline F32 BlendBlocks(F32 a, F32 b) {
     return FromBits(BlendBlocks<kMask>(Bits(a), Bits(b)));
+}
+
+/// In each block: a0 a1 b0 b1 and a2 a3 b2 b3.
+inline F32 LowPairs(F32 a, F32 b) {
+    return {{a.lane[0], a.lane[1], b.lane[0], b.lane[1]}};
+}
+inline F32 HighPairs(F32 a, F32 b) {
+    return {{a.lane[2], a.lane[3], b.lane[2], b.lane[3]}};
+}
+
+/// All lanes in the other order.
+inline I32 ReverseLanes(I32 a) {
+    return ShufflePixel<3, 2, 1, 0>(a);
 }
 
 } // namespace PK::plain

@@ -385,13 +385,13 @@ inline F32 ToFloat(F64 a) {
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
 /// The block i is loaded from, or stored to, i x stride bytes further on.
-inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int32_t stride) {
+inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int64_t stride) {
     return LoadFloats(source);
 }
-inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, I32 a) {
+inline void StoreBlocks(void* destination, [[maybe_unused]] int64_t stride, I32 a) {
     Store(destination, a);
 }
-inline void StoreBlocks(void* destination, [[maybe_unused]] int32_t stride, F32 a) {
+inline void StoreBlocks(void* destination, [[maybe_unused]] int64_t stride, F32 a) {
     Store(destination, a);
 }
 
@@ -452,6 +452,19 @@ inline F32 BlendBlocks(F32 a, F32 b) {
 template <int kMask>
 inline I32 BlendBlocks(I32 a, I32 b) {
     return Bits(BlendBlocks<kMask>(FromBits(a), FromBits(b)));
+}
+
+/// In each block: a0 a1 b0 b1 and a2 a3 b2 b3.
+inline F32 LowPairs(F32 a, F32 b) {
+    return {_mm_shuffle_ps(a.v, b.v, _MM_SHUFFLE(1, 0, 1, 0))};
+}
+inline F32 HighPairs(F32 a, F32 b) {
+    return {_mm_shuffle_ps(a.v, b.v, _MM_SHUFFLE(3, 2, 3, 2))};
+}
+
+/// All lanes in the other order.
+inline I32 ReverseLanes(I32 a) {
+    return ShufflePixel<3, 2, 1, 0>(a);
 }
 
 } // namespace PK::PK_TARGET

@@ -1,0 +1,136 @@
+// PK_Transpose and PK_RotateImage: moves of whole pixels.
+
+#include <PixelKiln/Rotate.h>
+
+#include "frame/Capabilities.h"
+#include "frame/Dispatch.h"
+#include "frame/PixelFormat.h"
+#include "geometry/TransposeKernels.h"
+
+#include <cstring>
+
+namespace PK {
+namespace {
+
+using TransposeKernel = void (*)(const TransposeArea&);
+
+/// One pixel after the other, for small pixels and where no vectors are used. Tiles of 16 by 16 keep the columns'
+/// cache lines.
+template <int32_t kPixelBytes>
+void TransposePixelwise(const TransposeArea& area) {
+    constexpr int32_t kTile = 16;
+    for (int32_t top = 0; top < area.rows; top += kTile)
+        for (int32_t column = 0; column < area.columns; ++column)
+            for (int32_t row = top; row < top + kTile && row < area.rows; ++row)
+                std::memcpy(area.destination + column * area.destinationStep + int64_t{row} * kPixelBytes,
+                            area.source + row * area.sourceStep + int64_t{column} * kPixelBytes, kPixelBytes);
+}
+
+TransposeKernel VectorKernel(uint8_t pixelBytes) {
+    if (!sCPUHasSSE2) return nullptr;
+    const TransposeKernels& kernels = Best<TransposeKernels>();
+    switch (pixelBytes) {
+    case 4:
+        return kernels.pixels4;
+    case 8:
+        return kernels.pixels8;
+    case 16:
+        return kernels.pixels16;
+    default:
+        return nullptr;
+    }
+}
+
+TransposeKernel PixelwiseKernel(uint8_t pixelBytes) {
+    switch (pixelBytes) {
+    case 1:
+        return TransposePixelwise<1>;
+    case 2:
+        return TransposePixelwise<2>;
+    case 4:
+        return TransposePixelwise<4>;
+    case 8:
+        return TransposePixelwise<8>;
+    case 16:
+        return TransposePixelwise<16>;
+    default:
+        return nullptr;
+    }
+}
+
+/// A step between rows in whole pixels; what is left over is dropped.
+int64_t WholePixels(int32_t rowBytes, int32_t pixelBytes) {
+    return int64_t{rowBytes} / pixelBytes * pixelBytes;
+}
+
+/// The area with its source rows, or its destination rows, in the other order.
+TransposeArea FromLastSourceRow(TransposeArea area) {
+    area.source += (area.rows - 1) * area.sourceStep;
+    area.sourceStep = -area.sourceStep;
+    return area;
+}
+TransposeArea FromLastDestinationRow(TransposeArea area) {
+    area.destination += (area.columns - 1) * area.destinationStep;
+    area.destinationStep = -area.destinationStep;
+    return area;
+}
+
+void TurnHalf(const TransposeArea& area) {
+    const TransposeKernels& kernels = Best<TransposeKernels>();
+    for (int32_t row = 0; row < area.rows; ++row)
+        kernels.reverseRow(area.source + row * area.sourceStep,
+                           area.destination + (area.rows - 1 - row) * area.destinationStep, area.columns);
+}
+
+constexpr bool IsPacked8u(PK_PixelFormat format) {
+    return IsPacked4444(format) && (format & kDepthMask) == kDepth8u;
+}
+
+} // namespace
+} // namespace PK
+
+using namespace PK;
+
+PK_Result PK_Transpose(const void* source, int32_t sourceRowBytes, void* dest, int32_t destRowBytes,
+                       int32_t width, int32_t height, uint8_t pixelBytes) noexcept {
+    const TransposeKernel vector = VectorKernel(pixelBytes);
+    const TransposeKernel kernel = vector ? vector : PixelwiseKernel(pixelBytes);
+    if (!kernel) return PK_ErrBadSrcFormat;
+    if (width < 0 || height < 0) return PK_ErrFailed;
+    if (width == 0 || height == 0) return PK_Success;
+    if (!source || !dest) return PK_ErrFailed;
+
+    // Deliberate: only the vector form takes steps that are no multiple of the pixel as they are.
+    kernel({static_cast<const uint8_t*>(source),
+            vector ? sourceRowBytes : WholePixels(sourceRowBytes, pixelBytes), static_cast<uint8_t*>(dest),
+            vector ? destRowBytes : WholePixels(destRowBytes, pixelBytes), height, width});
+    return PK_Success;
+}
+
+PK_Result PK_RotateImage(const void* source, int32_t sourceRowBytes, void* dest, int32_t destRowBytes,
+                         int32_t width, int32_t height, PK_PixelFormat format, int32_t degrees) noexcept {
+    if (!IsPacked8u(format)) return PK_ErrBadSrcFormat;
+    if (degrees == 0 || degrees % 90 != 0 || degrees < -270 || degrees > 270) return PK_ErrFailed;
+    if (width < 1 || height < 1) return PK_Success;
+    if (!source || !dest) return PK_ErrFailed;
+
+    const TransposeArea area = {static_cast<const uint8_t*>(source),
+                                WholePixels(sourceRowBytes, 4),
+                                static_cast<uint8_t*>(dest),
+                                WholePixels(destRowBytes, 4),
+                                height,
+                                width};
+    const TransposeKernel transpose = Best<TransposeKernels>().pixels4;
+    switch (degrees < 0 ? degrees + 360 : degrees) {
+    case 90:
+        transpose(FromLastSourceRow(area));
+        break;
+    case 180:
+        TurnHalf(area);
+        break;
+    default: // 270
+        transpose(FromLastDestinationRow(area));
+        break;
+    }
+    return PK_Success;
+}
