@@ -11,7 +11,8 @@ set(PIXELKILN_KERNEL_FLAGS_sse2 -msse2)
 set(PIXELKILN_KERNEL_FLAGS_ssse3 -mssse3)
 set(PIXELKILN_KERNEL_FLAGS_sse41 -msse4.1)
 set(PIXELKILN_KERNEL_FLAGS_avx2 -mavx2)
-# What a tail needs is copied by the C library: 512-bit groups would be copied by string instructions, which start slowly.
+# The C library copies what tails need: groups of this size the compiler would copy by string instructions, which
+# start slowly.
 set(PIXELKILN_KERNEL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512vl -mavx512dq -mstringop-strategy=libcall)
 set(PIXELKILN_KERNEL_HEADER_plain plain)
 set(PIXELKILN_KERNEL_HEADER_sse2 vector128)
