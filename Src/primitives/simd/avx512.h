@@ -394,25 +394,44 @@ inline F32 ToFloat(F64 a) {
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
-/// The block i is loaded from, or stored to, i x stride bytes further on.
+inline __m128 LoadBlock(const uint8_t* source) {
+    return _mm_loadu_ps(reinterpret_cast<const float*>(source));
+}
+/// The block i is loaded from i x stride bytes further on.
 inline F32 LoadFloatBlocks(const void* source, int32_t stride) {
     const auto* bytes = static_cast<const uint8_t*>(source);
-    const auto block = [bytes, stride](int i) {
-        return _mm_loadu_ps(reinterpret_cast<const float*>(bytes + i * stride));
-    };
-    const __m256 lower = _mm256_insertf128_ps(_mm256_castps128_ps256(block(0)), block(1), 1);
-    const __m256 upper = _mm256_insertf128_ps(_mm256_castps128_ps256(block(2)), block(3), 1);
-    return JoinHalves(lower, upper);
+    return JoinHalves(_mm256_set_m128(LoadBlock(bytes + stride), LoadBlock(bytes)),
+                      _mm256_set_m128(LoadBlock(bytes + 3 * stride), LoadBlock(bytes + 2 * stride)));
 }
-inline void StoreBlocks(void* destination, int32_t stride, I32 a) {
+
+/// The blocks of two or three vectors in turns.
+inline void StoreBlocksInTurns(void* destination, I32 a, I32 b) {
+    const __m512i lower = _mm512_setr_epi64(0, 1, 8, 9, 2, 3, 10, 11);
+    const __m512i upper = _mm512_setr_epi64(4, 5, 12, 13, 6, 7, 14, 15);
     auto* bytes = static_cast<uint8_t*>(destination);
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(bytes), _mm512_castsi512_si128(a.v));
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(bytes + stride), _mm512_extracti32x4_epi32(a.v, 1));
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(bytes + 2 * stride), _mm512_extracti32x4_epi32(a.v, 2));
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(bytes + 3 * stride), _mm512_extracti32x4_epi32(a.v, 3));
+    Store(bytes, I32{_mm512_permutex2var_epi64(a.v, lower, b.v)});
+    Store(bytes + sizeof a, I32{_mm512_permutex2var_epi64(a.v, upper, b.v)});
 }
-inline void StoreBlocks(void* destination, int32_t stride, F32 a) {
-    StoreBlocks(destination, stride, Bits(a));
+inline void StoreBlocksInTurns(void* destination, I32 a, I32 b, I32 c) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    const __m512i ab0 = _mm512_setr_epi64(0, 1, 8, 9, 0, 0, 2, 3);     // a0 b0 -- a1
+    const __m512i ab1 = _mm512_setr_epi64(10, 11, 0, 0, 4, 5, 12, 13); // b1 -- a2 b2
+    const __m512i ab2 = _mm512_setr_epi64(0, 0, 6, 7, 14, 15, 0, 0);   // -- a3 b3 --
+    const __m512i c0 = _mm512_setr_epi64(0, 0, 0, 0, 0, 1, 0, 0);      // what the others leave out
+    const __m512i c1 = _mm512_setr_epi64(0, 0, 2, 3, 0, 0, 0, 0);
+    const __m512i c2 = _mm512_setr_epi64(4, 5, 0, 0, 0, 0, 6, 7);
+    const __m512i first = _mm512_permutex2var_epi64(a.v, ab0, b.v);
+    const __m512i second = _mm512_permutex2var_epi64(a.v, ab1, b.v);
+    const __m512i third = _mm512_permutex2var_epi64(a.v, ab2, b.v);
+    Store(bytes, I32{_mm512_mask_permutexvar_epi64(first, 0x30, c0, c.v)});
+    Store(bytes + sizeof a, I32{_mm512_mask_permutexvar_epi64(second, 0x0c, c1, c.v)});
+    Store(bytes + 2 * sizeof a, I32{_mm512_mask_permutexvar_epi64(third, 0xc3, c2, c.v)});
+}
+inline void StoreBlocksInTurns(void* destination, F32 a, F32 b) {
+    StoreBlocksInTurns(destination, Bits(a), Bits(b));
+}
+inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
+    StoreBlocksInTurns(destination, Bits(a), Bits(b), Bits(c));
 }
 
 /// In each block: a0 b0 a1 b1 and a2 b2 a3 b3.
