@@ -4,18 +4,22 @@
 # objects to TARGET. A further instruction set is one more word in the list below and one file in
 # Src/primitives/simd/.
 
-set(PIXELKILN_KERNEL_TARGETS plain sse2 ssse3 sse41 avx2)
+set(PIXELKILN_KERNEL_TARGETS plain sse2 ssse3 sse41 avx2 avx512)
 # The plain bodies stay scalar: they are the form to debug, and the one that no vectoriser has touched.
 set(PIXELKILN_KERNEL_FLAGS_plain -fno-tree-vectorize -fno-tree-slp-vectorize)
 set(PIXELKILN_KERNEL_FLAGS_sse2 -msse2)
 set(PIXELKILN_KERNEL_FLAGS_ssse3 -mssse3)
 set(PIXELKILN_KERNEL_FLAGS_sse41 -msse4.1)
 set(PIXELKILN_KERNEL_FLAGS_avx2 -mavx2)
+# The C library copies what tails need: groups of this size the compiler would copy by string instructions, which
+# start slowly.
+set(PIXELKILN_KERNEL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512vl -mavx512dq -mstringop-strategy=libcall)
 set(PIXELKILN_KERNEL_HEADER_plain plain)
 set(PIXELKILN_KERNEL_HEADER_sse2 vector128)
 set(PIXELKILN_KERNEL_HEADER_ssse3 vector128)
 set(PIXELKILN_KERNEL_HEADER_sse41 vector128)
 set(PIXELKILN_KERNEL_HEADER_avx2 avx2)
+set(PIXELKILN_KERNEL_HEADER_avx512 avx512)
 
 function(pixelkiln_add_kernels target)
   foreach(isa IN LISTS PIXELKILN_KERNEL_TARGETS)

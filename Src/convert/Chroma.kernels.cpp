@@ -70,8 +70,7 @@ struct FloatPairs {
 };
 
 inline void StorePixels(uint8_t* destination, F32 evenPairs, F32 oddPairs) {
-    StoreBlocks(destination, 32, PixelsOfPairs<1>(evenPairs));
-    StoreBlocks(destination + 16, 32, PixelsOfPairs<3>(oddPairs));
+    StoreBlocksInTurns(destination, PixelsOfPairs<1>(evenPairs), PixelsOfPairs<3>(oddPairs));
 }
 
 struct Repeat32f : FloatPairs, NoNeighbours {

@@ -61,8 +61,7 @@ struct UpsamplePairs : Neighbours<2, 4, 0, 1> {
         const I32 nextChroma = LoadPairs<kLumaFirst>(source + 4).chroma;
         I32 low, high;
         UpsampleInBlocks<Pixel, kHasByteShuffle>(LoadPairs<kLumaFirst>(source), nextChroma, low, high);
-        StoreBlocks(destination, 32, low);
-        StoreBlocks(destination + 16, 32, high);
+        StoreBlocksInTurns(destination, low, high);
     }
 };
 

@@ -189,6 +189,7 @@ BodyTable MakeBodyTable() {
     Enter<Target::ssse3>(table);
     Enter<Target::sse41>(table);
     Enter<Target::avx2>(table);
+    Enter<Target::avx512>(table);
     for (const KernelBody& copy : kCopyBodies)
         table[static_cast<std::size_t>(copy.kernel)][static_cast<std::size_t>(Target::plain)] = copy.run;
     return table;

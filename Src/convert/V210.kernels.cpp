@@ -139,9 +139,9 @@ struct V210ToUYVY32f : V210Source, NoNeighbours {
 
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 words = LoadInts(source);
-        StoreBlocks(destination, 48, UYVYFromCodes<0, 1, 2, 0>(ShufflePixel<0, 0, 0, 1>(words)));
-        StoreBlocks(destination + 16, 48, UYVYFromCodes<1, 2, 0, 1>(ShufflePixel<1, 1, 2, 2>(words)));
-        StoreBlocks(destination + 32, 48, UYVYFromCodes<2, 0, 1, 2>(ShufflePixel<2, 3, 3, 3>(words)));
+        StoreBlocksInTurns(destination, UYVYFromCodes<0, 1, 2, 0>(ShufflePixel<0, 0, 0, 1>(words)),
+                           UYVYFromCodes<1, 2, 0, 1>(ShufflePixel<1, 1, 2, 2>(words)),
+                           UYVYFromCodes<2, 0, 1, 2>(ShufflePixel<2, 3, 3, 3>(words)));
     }
 };
 

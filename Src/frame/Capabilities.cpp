@@ -17,6 +17,7 @@ uint8_t sCPUHasSSE4 = 0;
 uint8_t sCPUHasSSE42 = 0;
 uint8_t sCPUHasAVX = 0;
 uint8_t sCPUHasAVX2 = 0;
+uint8_t sCPUHasAVX512 = 0;
 
 namespace {
 
@@ -28,7 +29,9 @@ constexpr uint32_t kLeaf1ECX_SSE41 = 1u << 19;
 constexpr uint32_t kLeaf1ECX_SSE42 = 1u << 20;
 constexpr uint32_t kLeaf1ECX_AVX = 0x18000000; // AVX, and XGETBV open to programs
 constexpr uint32_t kLeaf7EBX_AVX2 = 1u << 5;
-constexpr uint32_t kXCR0_AVX = 6; // the system saves the XMM and the YMM registers
+constexpr uint32_t kLeaf7EBX_AVX512 = 1u << 16 | 1u << 17 | 1u << 30 | 1u << 31; // F, DQ, BW, VL
+constexpr uint32_t kXCR0_AVX = 6;       // the system saves the XMM and the YMM registers
+constexpr uint32_t kXCR0_AVX512 = 0xe0; // and the mask registers and both parts of the ZMM ones
 
 bool HasAll(uint32_t bits, uint32_t mask) {
     return (bits & mask) == mask;
@@ -93,7 +96,9 @@ void SetCapabilities(const ProcessorReport& report) noexcept {
     SetIf(sCPUHasSSE42, HasAll(report.leaf1ECX, kLeaf1ECX_SSE42));
     if (!HasAVX(report)) return;
     sCPUHasAVX = 1;
-    SetIf(sCPUHasAVX2, HasLeaf7(report) && HasAll(report.leaf7EBX, kLeaf7EBX_AVX2));
+    if (!HasLeaf7(report)) return;
+    SetIf(sCPUHasAVX2, HasAll(report.leaf7EBX, kLeaf7EBX_AVX2));
+    SetIf(sCPUHasAVX512, HasAll(report.leaf7EBX, kLeaf7EBX_AVX512) && HasAll(report.xcr0, kXCR0_AVX512));
 }
 
 void ApplyCapabilitySettings() noexcept {

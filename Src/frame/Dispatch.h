@@ -28,6 +28,8 @@ Target BestTarget() noexcept;
 template <class Kernels>
 const Kernels& KernelsFor(Target target) noexcept {
     switch (target) {
+    case Target::avx512:
+        return Kernels::template For<Target::avx512>();
     case Target::avx2:
         return Kernels::template For<Target::avx2>();
     case Target::sse41:

@@ -37,7 +37,8 @@ PK_API bool PK_hasSSE4(void) noexcept;
 /// Whether AVX counts as present, as the flag stands now: after detection, settings and switches.
 PK_API bool PK_hasAVX(void) noexcept;
 
-/// Whether AVX2 code is used, as the flag stands now: after detection, settings and switches.
+/// Whether AVX2 code is used, as the flag stands now: after detection, settings and switches. AVX-512 code is
+/// used only where this holds and the processor and the system have it; it has no flag to ask for or to set.
 PK_API bool PK_hasAVX2(void) noexcept;
 
 } // extern "C"

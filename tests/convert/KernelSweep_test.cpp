@@ -125,10 +125,10 @@ TEST_P(KernelSweep, EveryWidthAgreesWithTheReferenceUpToTheGuardPages) {
 
 TEST_P(KernelSweep, EveryAlignmentAgreesWithTheReference) {
     for (const Target target : BodiesOf(kernel))
-        for (int offset = 0; offset < 32; ++offset)
+        for (int offset = 0; offset < 64; ++offset)
             for (const int32_t width : {1, 2, 7, 33, 64})
                 ASSERT_NO_FATAL_FAILURE(CheckRow(target, width, {PKTest::Placement::kAtOffset, offset},
-                                                 {PKTest::Placement::kAtOffset, 3 * offset % 32}));
+                                                 {PKTest::Placement::kAtOffset, 3 * offset % 64}));
 }
 
 TEST_P(KernelSweep, BodiesOfTheSameRuleAgreeToTheBit) {
@@ -176,6 +176,19 @@ TEST(KernelRegister, EveryKernelHasABodyForEveryProcessorAndOneForAVX2) {
     }
 }
 
+TEST(KernelRegister, AVX512NeedsItsOwnFlagAndThatOfAVX2) {
+    PKTest::FlagScope flags;
+    for (uint8_t* flag : PKTest::AllFlags()) *flag = 1;
+    EXPECT_TRUE(IsEnabled(Target::avx512));
+    sCPUHasAVX512 = 0;
+    EXPECT_FALSE(IsEnabled(Target::avx512));
+    EXPECT_TRUE(IsEnabled(Target::avx2));
+    sCPUHasAVX512 = 1;
+    PK_SetDebugFlag(9, 0); // AVX2
+    EXPECT_FALSE(IsEnabled(Target::avx512));
+    EXPECT_TRUE(IsEnabled(Target::sse41));
+}
+
 TEST(KernelRegister, SwitchingACapabilityOffTakesEverythingAboveItAway) {
     PKTest::FlagScope flags;
     DetectProcessor();
@@ -185,6 +198,9 @@ TEST(KernelRegister, SwitchingACapabilityOffTakesEverythingAboveItAway) {
     ASSERT_TRUE(ChooseTarget(kernel, target));
     EXPECT_LT(target, Target::avx2);
     PK_SetDebugFlag(9, 1);
+    sCPUHasAVX512 = 0;
+    ASSERT_TRUE(ChooseTarget(kernel, target));
+    EXPECT_LE(target, Target::avx2);
     PK_SetDebugFlag(3, 0); // SSE2
     ASSERT_TRUE(ChooseTarget(kernel, target));
     EXPECT_EQ(Target::plain, target);

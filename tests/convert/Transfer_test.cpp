@@ -70,13 +70,13 @@ protected:
 };
 
 std::string BodyName(const testing::TestParamInfo<Target>& info) {
-    constexpr const char* names[] = {"plain", "SSE2", "SSSE3", "SSE41", "AVX2"};
+    constexpr const char* names[] = {"plain", "SSE2", "SSSE3", "SSE41", "AVX2", "AVX512"};
     return names[static_cast<size_t>(info.param)];
 }
 
 INSTANTIATE_TEST_SUITE_P(Bodies, Transfer,
                          testing::Values(Target::plain, Target::sse2, Target::ssse3, Target::sse41,
-                                         Target::avx2),
+                                         Target::avx2, Target::avx512),
                          BodyName);
 
 TEST_P(Transfer, KnownPowers) {

@@ -76,6 +76,23 @@ TEST_F(Capabilities, AVX2IsAskedForByTheSignature) {
     EXPECT_EQ(sCPUHasAVX2, 1);
 }
 
+TEST_F(Capabilities, AVX512NeedsAllItsPartsAndTheSystem) {
+    constexpr uint32_t parts[] = {1u << 16, 1u << 17, 1u << 30, 1u << 31}; // F, DQ, BW, VL
+    constexpr uint32_t allParts = 0xc0030000, allState = 0xe6;
+    SetCapabilities({kSignature, kAVXAndOSXSAVE, 0, allParts, allState});
+    EXPECT_EQ(sCPUHasAVX512, 1);
+    EXPECT_EQ(sCPUHasAVX2, 0); // a flag of its own
+
+    sCPUHasAVX512 = 0;
+    for (const uint32_t part : parts)
+        SetCapabilities({kSignature, kAVXAndOSXSAVE, 0, allParts & ~part, allState});
+    for (const uint32_t state : {1u << 5, 1u << 6, 1u << 7, 1u << 2, 1u << 1})
+        SetCapabilities({kSignature, kAVXAndOSXSAVE, 0, allParts, allState & ~state});
+    SetCapabilities({kSignature, 0x10000000, 0, allParts, allState}); // no XGETBV
+    SetCapabilities({6, kAVXAndOSXSAVE, 0, allParts, allState});
+    EXPECT_EQ(sCPUHasAVX512, 0);
+}
+
 TEST_F(Capabilities, DetectionClearsNothing) {
     for (uint8_t* flag : PKTest::AllFlags()) *flag = 1;
     SetCapabilities({});
@@ -92,6 +109,9 @@ TEST_F(Capabilities, DetectionAgreesWithTheCompiler) {
     EXPECT_EQ(sCPUHasSSE42 != 0, __builtin_cpu_supports("sse4.2") != 0);
     EXPECT_EQ(sCPUHasAVX != 0, __builtin_cpu_supports("avx") != 0);
     EXPECT_EQ(sCPUHasAVX2 != 0, __builtin_cpu_supports("avx2") != 0);
+    EXPECT_EQ(sCPUHasAVX512 != 0, __builtin_cpu_supports("avx512f") && __builtin_cpu_supports("avx512dq") &&
+                                      __builtin_cpu_supports("avx512bw") &&
+                                      __builtin_cpu_supports("avx512vl"));
 }
 
 TEST_F(Capabilities, EachSettingTakesItsFlagOnly) {

@@ -23,8 +23,9 @@ using namespace PKTest;
 /// Switches the capabilities down to those that a target stands on.
 void LeaveOnly(PK::Target target) {
     PK::DetectProcessor();
-    const std::array<uint32_t, 4> switches = {3, 5, 6, 9}; // SSE2, SSSE3, SSE4.1, AVX2
-    for (size_t i = static_cast<size_t>(target); i < switches.size(); ++i) PK_SetDebugFlag(switches[i], 0);
+    uint8_t* const flags[PK::kTargetCount] = {nullptr,          &PK::sCPUHasSSE2, &PK::sCPUHasSSSE3,
+                                              &PK::sCPUHasSSE4, &PK::sCPUHasAVX2, &PK::sCPUHasAVX512};
+    for (size_t i = static_cast<size_t>(target) + 1; i < std::size(flags); ++i) *flags[i] = 0;
 }
 
 /// An image of whole pixels whose rows are `step` bytes apart, in memory that ends at guard pages.
@@ -123,7 +124,7 @@ TEST_P(TransposeBodies, QuarterTurnsLandWhereTheRuleSays) {
 
 INSTANTIATE_TEST_SUITE_P(Targets, TransposeBodies,
                          testing::Values(PK::Target::plain, PK::Target::sse2, PK::Target::ssse3,
-                                         PK::Target::sse41, PK::Target::avx2),
+                                         PK::Target::sse41, PK::Target::avx2, PK::Target::avx512),
                          [](const auto& param) {
                              return "target" + std::to_string(static_cast<int>(param.param));
                          });

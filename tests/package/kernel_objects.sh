@@ -1,11 +1,12 @@
 #!/usr/bin/env bash
-# kernel_objects.sh BUILD_DIR: two checks on the compiled kernels.
+# kernel_objects.sh BUILD_DIR: three checks on the compiled kernels.
 #
 # An inline function that a kernel source compiled for a higher instruction set is a weak symbol, and the
 # linker may keep that copy for everybody. So every weak symbol of a kernel object must lie in the namespace of
 # its target. Optimisation hides such functions, so the check compiles without it.
 #
-# And no AVX instruction may stand in any object but those of the AVX2 bodies.
+# And no AVX instruction may stand in any object but those of the AVX2 and the AVX-512 bodies, and nothing of
+# AVX-512 in those of the AVX2 bodies.
 set -euo pipefail
 build=$1
 root=$(cd "$(dirname "$0")/../.." && pwd)
@@ -13,10 +14,11 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 status=0
 
-weak_symbols() { # TARGET VECTOR_HEADER FLAG
-    local target=$1 header=$2 flag=$3 source
+weak_symbols() { # TARGET VECTOR_HEADER FLAG...
+    local target=$1 header=$2 source
+    shift 2
     for source in "$root"/Src/*/*.kernels.cpp; do
-        g++ -std=c++20 -O0 "$flag" -ffp-contract=off -fvisibility=hidden -I"$root/Src" -I"$root/include" \
+        g++ -std=c++20 -O0 "$@" -ffp-contract=off -fvisibility=hidden -I"$root/Src" -I"$root/include" \
             -DPK_TARGET="$target" -DPK_TARGET_HEADER="\"primitives/simd/$header.h\"" -c "$source" -o "$work/kernel.o"
         if nm -C "$work/kernel.o" | grep -E '^[0-9a-f]+ [WVu] ' | grep -v "PK::$target::"; then
             echo "the weak symbols above, of $(basename "$source") for $target, are not in its namespace"
@@ -27,15 +29,25 @@ weak_symbols() { # TARGET VECTOR_HEADER FLAG
 weak_symbols ssse3 vector128 -mssse3
 weak_symbols sse41 vector128 -msse4.1
 weak_symbols avx2 avx2 -mavx2
+weak_symbols avx512 avx512 -mavx512f -mavx512bw -mavx512vl -mavx512dq
 
 checked=0
-while IFS= read -r object; do
-    checked=$((checked + 1))
-    if objdump -d --no-show-raw-insn "$object" | grep -m1 -P '\t(v[a-z0-9]+\s.*%[xy]mm|vzeroupper)'; then
-        echo "the AVX instruction above is in $object"
-        status=1
-    fi
-done < <(find "$build/Src" "$build/host" -name '*.o' -not -path '*_kernels_avx2.dir/*')
+search() { # NAME PATTERN, and the names of objects on standard input
+    local name=$1 pattern=$2 object
+    while IFS= read -r object; do
+        checked=$((checked + 1))
+        if objdump -d --no-show-raw-insn "$object" | grep -m1 -P "$pattern"; then
+            echo "the $name instruction above is in $object"
+            status=1
+        fi
+    done
+}
+avx512='\tv[a-z0-9]+\s.*(%zmm|%[xy]mm(1[6-9]|[23][0-9]))|%k[0-7]'
+search AVX "\tv[a-z0-9]+\s.*%[xy]mm|\tvzeroupper|$avx512" < <(find "$build/Src" "$build/host" -name '*.o' \
+    -not -path '*_kernels_avx2.dir/*' -not -path '*_kernels_avx512.dir/*')
 [ "$checked" -gt 0 ] || { echo "no objects found in $build"; exit 1; }
+others=$checked
+search AVX-512 "$avx512" < <(find "$build/Src" -name '*.o' -path '*_kernels_avx2.dir/*')
+[ "$checked" -gt "$others" ] || { echo "no objects of the AVX2 bodies found in $build"; exit 1; }
 [ "$status" -eq 0 ] && echo "kernel objects are clean ($checked objects searched for AVX)"
 exit "$status"

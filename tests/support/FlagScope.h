@@ -11,11 +11,11 @@
 
 namespace PKTest {
 
-/// The flags in the order of their switch numbers; switch 1 has none.
-inline std::array<uint8_t*, 10> AllFlags() {
+/// The flags in the order of their switch numbers, and the one that has no switch; switch 1 has no flag.
+inline std::array<uint8_t*, 11> AllFlags() {
     using namespace PK;
-    return {&sMotionBlurLinear, &sCPUHasSSE,   &sCPUHasSSE2, &sCPUHasSSE3, &sCPUHasSSSE3,
-            &sCPUHasSSE4,       &sCPUHasSSE42, &sCPUHasAVX,  &sCPUHasAVX2, &sAllOriginsTopLeft};
+    return {&sMotionBlurLinear, &sCPUHasSSE, &sCPUHasSSE2, &sCPUHasSSE3,        &sCPUHasSSSE3, &sCPUHasSSE4,
+            &sCPUHasSSE42,      &sCPUHasAVX, &sCPUHasAVX2, &sAllOriginsTopLeft, &sCPUHasAVX512};
 }
 
 class FlagScope {
@@ -37,8 +37,8 @@ public:
     }
 
 private:
-    std::array<uint8_t*, 10> fFlags;
-    std::array<uint8_t, 10> fSaved{};
+    std::array<uint8_t*, 11> fFlags;
+    std::array<uint8_t, 11> fSaved{};
     int32_t fCacheLevel = PK::sLargestCacheLevel;
     uint64_t fCacheBytes = PK::sLargestCacheBytes;
 };

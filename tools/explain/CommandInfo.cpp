@@ -32,7 +32,7 @@ std::string FlagsText() {
     const std::pair<const char*, uint8_t> flags[] = {
         {"SSE", PK::sCPUHasSSE},     {"SSE2", PK::sCPUHasSSE2},   {"SSE3", PK::sCPUHasSSE3},
         {"SSSE3", PK::sCPUHasSSSE3}, {"SSE4.1", PK::sCPUHasSSE4}, {"SSE4.2", PK::sCPUHasSSE42},
-        {"AVX", PK::sCPUHasAVX},     {"AVX2", PK::sCPUHasAVX2},
+        {"AVX", PK::sCPUHasAVX},     {"AVX2", PK::sCPUHasAVX2},   {"AVX-512", PK::sCPUHasAVX512},
     };
     std::vector<std::string> names;
     for (const auto& [name, isOn] : flags)

@@ -7,7 +7,7 @@
 
 namespace PK {
 
-enum class Target : uint8_t { plain, sse2, ssse3, sse41, avx2 };
-inline constexpr int kTargetCount = 5;
+enum class Target : uint8_t { plain, sse2, ssse3, sse41, avx2, avx512 };
+inline constexpr int kTargetCount = 6;
 
 } // namespace PK

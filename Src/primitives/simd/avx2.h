@@ -365,8 +365,24 @@ inline void StoreBlocks(void* destination, int64_t stride, I32 a) {
     _mm_storeu_si128(static_cast<__m128i*>(destination), _mm256_castsi256_si128(a.v));
     _mm_storeu_si128(reinterpret_cast<__m128i*>(second), _mm256_extracti128_si256(a.v, 1));
 }
-inline void StoreBlocks(void* destination, int64_t stride, F32 a) {
-    StoreBlocks(destination, stride, Bits(a));
+
+/// The blocks of two or three vectors in turns.
+inline void StoreBlocksInTurns(void* destination, I32 a, I32 b) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    Store(bytes, I32{_mm256_permute2x128_si256(a.v, b.v, 0x20)});
+    Store(bytes + sizeof a, I32{_mm256_permute2x128_si256(a.v, b.v, 0x31)});
+}
+inline void StoreBlocksInTurns(void* destination, I32 a, I32 b, I32 c) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    Store(bytes, I32{_mm256_permute2x128_si256(a.v, b.v, 0x20)});
+    Store(bytes + sizeof a, I32{_mm256_blend_epi32(c.v, a.v, 0xf0)});
+    Store(bytes + 2 * sizeof a, I32{_mm256_permute2x128_si256(b.v, c.v, 0x31)});
+}
+inline void StoreBlocksInTurns(void* destination, F32 a, F32 b) {
+    StoreBlocksInTurns(destination, Bits(a), Bits(b));
+}
+inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
+    StoreBlocksInTurns(destination, Bits(a), Bits(b), Bits(c));
 }
 
 /// In each block: a0 b0 a1 b1 and a2 b2 a3 b3.

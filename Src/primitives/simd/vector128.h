@@ -384,15 +384,28 @@ inline F32 ToFloat(F64 a) {
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
-/// The block i is loaded from, or stored to, i x stride bytes further on.
+/// The block i is loaded from i x stride bytes further on.
 inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int64_t stride) {
     return LoadFloats(source);
 }
-inline void StoreBlocks(void* destination, [[maybe_unused]] int64_t stride, I32 a) {
-    Store(destination, a);
+
+/// The blocks of two or three vectors in turns.
+inline void StoreBlocksInTurns(void* destination, I32 a, I32 b) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    Store(bytes, a);
+    Store(bytes + sizeof a, b);
 }
-inline void StoreBlocks(void* destination, [[maybe_unused]] int64_t stride, F32 a) {
-    Store(destination, a);
+inline void StoreBlocksInTurns(void* destination, I32 a, I32 b, I32 c) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    Store(bytes, a);
+    Store(bytes + sizeof a, b);
+    Store(bytes + 2 * sizeof a, c);
+}
+inline void StoreBlocksInTurns(void* destination, F32 a, F32 b) {
+    StoreBlocksInTurns(destination, Bits(a), Bits(b));
+}
+inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
+    StoreBlocksInTurns(destination, Bits(a), Bits(b), Bits(c));
 }
 
 /// In each block: a0 b0 a1 b1 and a2 b2 a3 b3.
