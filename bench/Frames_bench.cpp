@@ -106,6 +106,7 @@ const char* MetOrMissed(double share, double aim) {
 const char* Verdict(Aim aim, const Result& result) {
     const double shareOfMemcpy = result.memcpySeconds / result.seconds;
     if (aim == Aim::Copy) return MetOrMissed(shareOfMemcpy, 0.95);
+    if (aim == Aim::CopyInCache) return "-";
     if (aim == Aim::ByteMove) return MetOrMissed(shareOfMemcpy, 0.8);
     const PeerResult* const peer = FastestWholePeer(result);
     return peer == nullptr ? "-" : MetOrMissed(peer->seconds / result.seconds, kLevel);
