@@ -179,6 +179,25 @@ TEST(CPUBoundPool, CarriesAnExceptionFromAThreadOfItsOwn) {
     EXPECT_THROW(run(), std::runtime_error);
 }
 
+TEST(CPUBoundPool, CarriesTheExceptionThatCameFirst) {
+    CPUBoundPool pool(1);
+    std::latch bothBegun(2);
+    const std::thread::id caller = std::this_thread::get_id();
+    try {
+        pool.Run(
+            [&](int32_t) {
+                bothBegun.arrive_and_wait();
+                if (std::this_thread::get_id() == caller) throw std::runtime_error("first");
+                std::this_thread::sleep_for(std::chrono::milliseconds(100));
+                throw std::runtime_error("second");
+            },
+            2);
+        FAIL() << "nothing was thrown";
+    } catch (const std::runtime_error& error) {
+        EXPECT_STREQ(error.what(), "first");
+    }
+}
+
 TEST(CPUBoundPool, LeavesSignalsToTheProgram) {
     CPUBoundPool pool(1);
     std::latch bothBegun(2);
@@ -210,7 +229,7 @@ TEST(CPUBoundExecutor, IsOneForAllWhoHoldIt) {
 }
 
 TEST(CPUBoundExecutor, TakesItsThreadsAway) {
-    const size_t before = PKTest::ThreadCount();
+    const size_t before = PKTest::RestingThreadCount();
     for (int round = 0; round < 100; ++round) {
         const boost::shared_ptr<AsyncExecutor> executor = CreateCPUBoundExecutor();
         CallCounts calls(64);

@@ -23,4 +23,16 @@ inline size_t SettledThreadCount(size_t expected) {
     return ThreadCount();
 }
 
+/// The threads that there are once those which were joined before are no longer seen.
+inline size_t RestingThreadCount() {
+    size_t count = ThreadCount();
+    for (int quiet = 0; quiet < 20; ++quiet) {
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        const size_t now = ThreadCount();
+        if (now != count) quiet = 0;
+        count = now;
+    }
+    return count;
+}
+
 } // namespace PKTest
