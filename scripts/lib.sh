@@ -37,20 +37,25 @@ install_packages() {
     as_root env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}"
 }
 
-build_packages=(g++ cmake ninja-build pkg-config)
+build_packages=(g++ cmake ninja-build pkg-config libboost-dev)
 tool_packages=(libpng-dev libcli11-dev libcairo2-dev fonts-dejavu-core)
 test_packages=(libgtest-dev)
 bench_packages=(libbenchmark-dev libyuv-dev libswscale-dev libavcodec-dev libavutil-dev libopencv-core-dev
     libopencv-imgproc-dev libzimg-dev)
 
-# build DIRECTORY [CMAKE_ARGUMENT...]: configures and builds; ninja shows the progress.
-build() {
+# configure DIRECTORY [CMAKE_ARGUMENT...]
+configure() {
     local directory=$1
     shift
     say "Configuring $directory"
     cmake -S . -B "$directory" -G Ninja "$@" >"$directory.configure.log" 2>&1 ||
         { cat "$directory.configure.log" >&2; fail "configuration failed"; }
-    say "Building $directory (the first time takes some minutes)"
-    cmake --build "$directory"
+}
+
+# build DIRECTORY [CMAKE_ARGUMENT...]: configures and builds; ninja shows the progress.
+build() {
+    configure "$@"
+    say "Building $1 (the first time takes some minutes)"
+    cmake --build "$1"
 }
 mkdir -p build

@@ -2,6 +2,7 @@
 
 #include "frame/Capabilities.h"
 #include "frame/PrimitivesStart.h"
+#include "frame/Task.h"
 #include "frame/Wrap32.h"
 
 #include <PixelKiln/Lifecycle.h>
@@ -21,11 +22,13 @@ PK_Result PK_Initialize(void) noexcept {
     if (sNestingCount != 1) return PK_Success;
     DetectProcessor();
     StartPrimitives();
+    Threading::CreateTaskExecutor();
     return PK_Success;
 }
 
 PK_Result PK_Terminate(void) noexcept {
     using namespace PK;
     sNestingCount = WrapAdd(sNestingCount, -1);
+    if (sNestingCount == 0) Threading::ReleaseTaskExecutor();
     return PK_Success;
 }

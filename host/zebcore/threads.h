@@ -1,13 +1,47 @@
 #pragma once
 
 /// \file
-/// The host's threads.
+/// The host's threads, and its pool for work that keeps a processor busy.
 
+#include <boost/function.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
 
 namespace zebcore::threads {
 
 /// The number by which the system knows the calling thread.
 uint32_t GetCurrentThreadID() noexcept;
+
+/// Keeps a pool of threads alive for as long as somebody holds it. Tasks reach the pool by
+/// ExecuteCPUBoundTaskOnAllProcessors only.
+class AsyncExecutor {
+public:
+    AsyncExecutor() = default;
+    virtual ~AsyncExecutor() = default;
+    AsyncExecutor(const AsyncExecutor&) = delete;
+    AsyncExecutor& operator=(const AsyncExecutor&) = delete;
+};
+
+/// The executor of the process, started if nobody holds one: together with the thread that calls, it has a
+/// thread for each processor that the process may use. If the system gives it fewer, it works with those.
+/// Safe from all threads.
+/// \return never null; throws std::bad_alloc.
+boost::shared_ptr<AsyncExecutor> CreateCPUBoundExecutor();
+
+/// Calls \p function once for each index from 0 to \p count - 1, spread over the calling thread and the threads
+/// of the executor, in no particular order, and returns when all calls have returned.
+///
+/// The calling thread takes part from the first index on, and so never waits for a thread of the pool to be
+/// free, only for calls that have begun. Hence \p function may itself call this, any number of threads may call
+/// it at once, and without an executor the calling thread makes all calls. A call allocates nothing.
+///
+/// An exception that leaves \p function ends the task: indices that nobody has begun are skipped, those that
+/// have begun are waited for, and then the first exception is thrown on the calling thread.
+///
+/// Each thread stays in the floating-point mode that it is in; that of the pool's threads is the mode of the
+/// thread that started the executor.
+/// \param function  what to call; it is not copied.
+/// \param count     number of calls; 0 and below make none.
+void ExecuteCPUBoundTaskOnAllProcessors(const boost::function<void(int32_t)>& function, int32_t count);
 
 } // namespace zebcore::threads

@@ -12,12 +12,14 @@ extern "C" {
 
 /// Starts the library. Calls nest: only the one that brings the count of open calls to 1 does any work,
 /// which is to detect the processor (this sets capability flags and never clears any), to read the host's
-/// settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), and to
-/// start the primitives. Every call wants a matching PK_Terminate.
+/// settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), to start the
+/// primitives, and to take the host's pool of threads, on which some operations run parts of their work.
+/// Every call wants a matching PK_Terminate.
 /// \return always PK_Success.
 PK_API PK_Result PK_Initialize(void) noexcept;
 
-/// Takes back one PK_Initialize; the last one stops the library. Capability flags stay as they are. A call
+/// Takes back one PK_Initialize; the last one stops the library and lets the pool of threads go.
+/// Capability flags stay as they are. A call
 /// without an open PK_Initialize counts below 0, and the next PK_Initialize then only makes good for it.
 /// \return always PK_Success.
 PK_API PK_Result PK_Terminate(void) noexcept;
