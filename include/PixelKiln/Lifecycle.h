@@ -19,8 +19,8 @@ extern "C" {
 PK_API PK_Result PK_Initialize(void) noexcept;
 
 /// Takes back one PK_Initialize; the last one stops the library and lets the pool of threads go.
-/// Capability flags stay as they are. A call
-/// without an open PK_Initialize counts below 0, and the next PK_Initialize then only makes good for it.
+/// Capability flags stay as they are. A call without an open PK_Initialize counts below 0, and the next
+/// PK_Initialize then only makes good for it.
 /// \return always PK_Success.
 PK_API PK_Result PK_Terminate(void) noexcept;
 
