@@ -6,6 +6,9 @@
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Lifecycle.h>
+#include <PixelKiln/Overlay.h>
 #include <PixelKiln/PixelFormat.h>
+#include <PixelKiln/Planar.h>
+#include <PixelKiln/QuarterScale.h>
 #include <PixelKiln/Rotate.h>
 #include <PixelKiln/Types.h>

@@ -1,0 +1,23 @@
+#pragma once
+
+// The rows of quarter-resolution scaling.
+
+#include "primitives/simd/Targets.h"
+
+namespace PK {
+
+struct QuarterScaleKernels {
+    /// out[i] = in[2 i] for `count` bytes; of the source 2 x count bytes are read.
+    void (*evenBytes)(const void* source, void* destination, int32_t count);
+
+    /// Interleaves `pairs` pairs of luma samples with a sample of each chroma, luma first or chroma first.
+    using Interleave = void (*)(const uint8_t* luma, const uint8_t* chroma1, const uint8_t* chroma2,
+                                uint8_t* destination, int32_t pairs);
+    Interleave lumaFirst;
+    Interleave chromaFirst;
+
+    template <Target>
+    static const QuarterScaleKernels& For();
+};
+
+} // namespace PK

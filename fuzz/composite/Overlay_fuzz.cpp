@@ -1,0 +1,201 @@
+// The one-bit mask and the numbers, on images of any format and size.
+
+#include "support/Check.h"
+#include "support/Family.h"
+#include "support/FloatState.h"
+#include "support/Formats.h"
+#include "support/ImageMemory.h"
+#include "support/Switches.h"
+
+#include "convert/RasterFormats.h"
+#include "frame/PixelFormat.h"
+
+#include <PixelKiln/Overlay.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstring>
+#include <string>
+
+namespace {
+
+using namespace PKFuzz;
+
+constexpr int32_t kWidestRow = INT32_MAX / 16; // as documented
+
+struct Size {
+    int32_t width, height;
+
+    bool HasPixels() const { return width > 0 && width <= kWidestRow && height > 0; }
+};
+
+Size DrawSize(ByteStream& stream) {
+    if (stream.OneIn(16)) return {stream.AnyI32(), stream.Between(-3, 0)};
+    if (stream.OneIn(64))
+        return {stream.Between(16380, 16390), 1}; // about where rows no longer fit the stack
+    return {stream.Between(-1, 120), stream.Between(0, 40)};
+}
+
+std::string SizeWords(Size size) {
+    return std::to_string(size.width) + " x " + std::to_string(size.height);
+}
+
+RowsLayout DrawRows(ByteStream& stream, int64_t rowLength, Size size) {
+    if (!size.HasPixels()) return {0, 0, stream.AnyI32()};
+    const auto bytes = static_cast<size_t>(std::max<int64_t>(rowLength, 0));
+    const auto rows = static_cast<size_t>(size.height);
+    return {bytes, rows, DrawRowBytes(stream, bytes, rows, 0)};
+}
+
+/// Rows with content, given to a call as they are or, now and then, as null.
+struct Input {
+    PK_PixelFormat format;
+    ImageMemory memory;
+    bool isNull;
+
+    Input(ByteStream& stream, PK_PixelFormat pixelFormat, const RowsLayout& layout)
+        : format(pixelFormat), memory(layout, stream), isNull(stream.OneIn(64)) {
+        std::vector<uint8_t> content(layout.rowLength * layout.rows);
+        stream.Fill(content.data(), content.size());
+        memory.SetRows(content);
+    }
+    Input(ByteStream& stream, PK_PixelFormat pixelFormat, Size size)
+        : Input(stream, pixelFormat,
+                DrawRows(stream, PK_PixelFormatPackedRowBytes(pixelFormat, std::max(size.width, 0)), size)) {}
+
+    uint8_t* Pixels() const { return isNull ? nullptr : memory.Pixels(); }
+    int32_t RowBytes() const { return memory.Layout().rowBytes; }
+};
+
+struct MaskCall {
+    const Input &first, &second, &mask, &destination;
+    Size size;
+    size_t bit;
+};
+
+PK_Result ExpectedResult(const MaskCall& call) {
+    if (!PK::IsRasterFormat(call.destination.format) || PK::Is422(call.destination.format))
+        return PK_ErrBadDstFormat;
+    if (!PK::IsRasterFormat(call.first.format) || !PK::IsRasterFormat(call.second.format))
+        return PK_ErrBadSrcFormat;
+    if (call.size.width < 0 || call.size.width > kWidestRow || call.size.height < 0) return PK_ErrFailed;
+    if (!call.size.HasPixels()) return PK_Success;
+    const bool hasNull =
+        call.first.isNull || call.second.isNull || call.mask.isNull || call.destination.isNull;
+    return hasNull ? PK_ErrFailed : PK_Success;
+}
+
+/// Where neither image is converted, each pixel is that of one of them.
+void CheckPixels(const MaskCall& call) {
+    const PK_PixelFormat format = call.destination.format;
+    if (call.first.format != format || call.second.format != format || !call.size.HasPixels()) return;
+    const std::vector<uint8_t> ones = call.first.memory.Rows(), zeros = call.second.memory.Rows(),
+                               bits = call.mask.memory.Rows();
+    const size_t maskRow = call.mask.memory.Layout().rowLength;
+    const size_t row = call.destination.memory.Layout().rowLength;
+    const size_t pixelBytes = row / static_cast<size_t>(call.size.width);
+    std::vector<uint8_t> expected(ones.size());
+    for (size_t i = 0; i < expected.size(); ++i) {
+        const size_t place = call.bit + i % row / pixelBytes;
+        const bool isSet = (bits[i / row * maskRow + place / 8] >> (7 - place % 8) & 1) != 0;
+        expected[i] = (isSet ? ones : zeros)[i];
+    }
+    CheckSame(expected, call.destination.memory.Rows(), "the pixel is that of the image which the bit names");
+}
+
+void FuzzMask(ByteStream& stream, uint32_t state) {
+    const Size size = DrawSize(stream);
+    const PK_PixelFormat format = DrawFormat(stream);
+    const uint8_t offset = stream.Byte();
+    const size_t bit = offset % 8;
+    const auto drawOther = [&] { return stream.Bool() ? format : DrawFormat(stream); };
+    const Input first(stream, drawOther(), size), second(stream, drawOther(), size);
+    const Input destination(stream, format, size);
+    const int64_t maskBytes = (static_cast<int64_t>(bit) + size.width + 7) / 8;
+    const Input mask(stream, PK_PixelFormat_Invalid, DrawRows(stream, maskBytes, size));
+    SetCall("PK_OneBitMaskComposite of " + Words(first.format) + " and " + Words(second.format) + " to " +
+            Words(format) + ", " + SizeWords(size) + ", bit " + std::to_string(offset));
+
+    const int32_t quality = stream.OneIn(8) ? stream.AnyI32() : stream.Between(0, 5);
+    const PK_Result result = CallIn(state, [&] {
+        return PK_OneBitMaskComposite(first.Pixels(), first.RowBytes(), first.format, second.Pixels(),
+                                      second.RowBytes(), second.format, mask.Pixels(), mask.RowBytes(),
+                                      offset, destination.Pixels(), destination.RowBytes(), format,
+                                      size.width, size.height, quality);
+    });
+    const MaskCall call = {first, second, mask, destination, size, bit};
+    Check(result == ExpectedResult(call), "the arguments decide the result");
+    Check(destination.memory.IsPaddingIntact(), "bytes outside the rows stay");
+    if (result == PK_Success) CheckPixels(call);
+}
+
+float DrawFraction(ByteStream& stream) {
+    if (stream.OneIn(16)) {
+        const uint32_t bits = stream.U32();
+        float any;
+        std::memcpy(&any, &bits, sizeof any);
+        return std::fpclassify(any) == FP_SUBNORMAL ? 0.0f
+                                                    : any; // which MXCSR may say to be 0, whatever its sign
+    }
+    return static_cast<float>(stream.Below(257)) / 256.0f;
+}
+
+bool IsFraction(float value) {
+    return value >= 0 && value <= 1;
+}
+
+/// Formats that have ink: the catalogue without 15 bits, also in reversed order, and the planes of 4:2:0.
+bool HasInk(PK_PixelFormat format) {
+    if ((format & PK::kDepthMask) == PK::kDepth15u) return false;
+    return PK::IsStream(format) ? PK::Is420Planar(format) : PK::IsRasterFormat(format & ~PK::kOrderMask);
+}
+
+RowsLayout DrawImage(ByteStream& stream, PK_PixelFormat format, Size size) {
+    if (!PK::IsStream(format))
+        return DrawRows(stream, PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0)), size);
+    const int64_t bytes = size.HasPixels() ? PK_PixelFormatSize(format, size.width, size.height) : 0;
+    return {static_cast<size_t>(bytes), bytes > 0 ? size_t{1} : 0, stream.AnyI32()};
+}
+
+void FuzzNumber(ByteStream& stream, uint32_t state) {
+    const Size size = DrawSize(stream);
+    const PK_PixelFormat format = stream.OneIn(4) ? DrawStreamFormat(stream) : DrawFormat(stream);
+    const float fraction = DrawFraction(stream);
+    const PK_Point position = {DrawFraction(stream), DrawFraction(stream)};
+    const int32_t number = stream.AnyI32();
+    const bool decimal = stream.Bool();
+    const Input image(stream, format, DrawImage(stream, format, size));
+    SetCall("PK_PrintNum of " + std::to_string(number) + " on " + Words(format) + ", " + SizeWords(size) +
+            ", size " + std::to_string(fraction) + " at " + std::to_string(position.x) + ", " +
+            std::to_string(position.y));
+
+    const std::vector<uint8_t> before = image.memory.Rows();
+    const PK_Result result = CallIn(state, [&] {
+        return PK_PrintNum(image.Pixels(), image.RowBytes(), format, size.width, size.height, number,
+                           fraction, position, decimal);
+    });
+    PK_Result expected = PK_Success;
+    if (!HasInk(format))
+        expected = PK_ErrBadDstFormat;
+    else if (size.width < 0)
+        expected = PK_ErrBadPosX;
+    else if (size.height < 0)
+        expected = PK_ErrBadPosY;
+    else if (!IsFraction(fraction) || !IsFraction(position.x) || !IsFraction(position.y))
+        expected = PK_ErrFailed;
+    else if (size.HasPixels() && image.isNull)
+        expected = PK_ErrFailed;
+    Check(result == expected, "the arguments decide the result");
+    Check(image.memory.IsPaddingIntact(), "bytes outside the rows stay");
+    if (result != PK_Success) CheckSame(before, image.memory.Rows(), "a refusal writes nothing");
+}
+
+void FuzzOverlay(ByteStream& stream) {
+    SetSwitches(DrawSwitches(stream));
+    const uint32_t state = DrawFloatState(stream);
+    stream.Bool() ? FuzzMask(stream, state) : FuzzNumber(stream, state);
+}
+
+const Family sFamily('o', "overlay", FuzzOverlay);
+
+} // namespace
