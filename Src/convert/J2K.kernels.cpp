@@ -21,7 +21,7 @@ struct BGR16ToRGB10 : PixelGroup<kTripleBytes, 4> {
 
 struct RGB10ToBGR16 : PixelGroup<4, kTripleBytes> {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        StoreTriples(destination, UnpackTriples<2>(LoadInts(source)));
+        StoreTriples<2>(destination, LoadInts(source));
     }
 };
 

@@ -26,28 +26,22 @@ inline SampleTriples LoadTriples(const void* source) {
                                 HalvesAt<0, 0, 0, 0, 6, 6, 12, 12>(upper))};
 }
 
-inline void StoreTriples(void* destination, SampleTriples triples) {
-    constexpr int32_t kLowHalf = 0xffff, kHighHalf = -0x10000;
-    const I32 low =
-        Select(PixelInts(kHighHalf, 0, kLowHalf, kHighHalf), HalvesAt<0, 0, 0, 0, 4, 4, 8, 8>(triples.middle),
-               HalvesAt<0, 0, 2, 4, 4, 6, 8, 8>(triples.outer));
-    const I32 high = Select(PixelInts(0, kLowHalf, 0, 0), HalvesAt<0, 0, 12, 12, 0, 0, 0, 0>(triples.middle),
-                            HalvesAt<10, 12, 14, 14, 0, 0, 0, 0>(triples.outer));
-    StoreSixes(destination, low, high);
-}
-
 /// s0 | s1 << 10 | s2 << 20, with whatever the samples have above their 10 bits.
 inline I32 PackTriples(SampleTriples triples) {
-    return (triples.outer & Ints(0xffff)) | ShiftLeft<10>(triples.middle & Ints(0xffff)) |
-           ShiftLeft<20>(ShiftRight<16>(triples.outer));
+    return MultiplyHalves(triples.outer, Ints(1 | 16 << 16)) | ShiftLeft<10>(triples.middle & Ints(0xffff));
 }
 
-/// The samples that stand at bits kFirst, kFirst + 10 and kFirst + 20.
+/// The samples at bits kFirst, kFirst + 10 and kFirst + 20 of each lane, as 16-bit words. Each lies within the
+/// 16 bits from byte 0, 1 or 2 of its lane on; a multiplication moves it to their top, past what stands above.
 template <int kFirst>
-inline SampleTriples UnpackTriples(I32 words) {
-    const I32 first = (kFirst == 0 ? words : ShiftRight<kFirst>(words)) & Ints(0x3ff);
-    const I32 third = ShiftRight<kFirst + 4>(words) & Ints(0x03ff0000);
-    return {first | third, ShiftRight<kFirst + 10>(words) & Ints(0x3ff)};
+inline void StoreTriples(void* destination, I32 words) {
+    constexpr int32_t first = 64 >> kFirst, second = 16 >> kFirst, third = 4 >> kFirst;
+    const I32 low = MultiplyHalves(
+        HalvesAt<0, 1, 2, 4, 5, 6, 8, 9>(words),
+        PixelInts(first | second << 16, third | first << 16, second | third << 16, first | second << 16));
+    const I32 high = MultiplyHalves(HalvesAt<10, 12, 13, 14, 0, 0, 0, 0>(words),
+                                    PixelInts(third | first << 16, second | third << 16, 0, 0));
+    StoreSixes(destination, ShiftRight<6>(low) & Ints(0x03ff03ff), ShiftRight<6>(high) & Ints(0x03ff03ff));
 }
 
 } // namespace PK::PK_TARGET

@@ -25,7 +25,7 @@ struct V210ToUYVY10 : NoNeighbours {
     static constexpr int32_t kSourceBytes = 16 * kGroups, kDestinationBytes = 24 * kGroups;
 
     static void Group(const uint8_t* source, uint8_t* destination) {
-        StoreTriples(destination, UnpackTriples<0>(LoadInts(source)));
+        StoreTriples<0>(destination, LoadInts(source));
     }
 };
 

@@ -12,53 +12,69 @@ namespace {
 //   kPixels              destination pixels of one group
 //   kUnit, kUnitBytes    destination pixels that cannot be parted, and their bytes
 //   kLumas               source lumas for each destination pixel, of which every kStep-th counts
-//   kReach               chromas from the group's first that it loads; of lumas it loads fewer than twice as
-//                        many, or just as many as that where kLumas is 2
-//   static void Group(PlaneRows planes, uint8_t* destination)
+//   kReach               chromas from the group's first that it loads; of lumas it loads twice as many at most
+//   static void Group(Pointers<kPlanes> planes, uint8_t* destination)
 
-/// What is left of the planes, filled up with repetitions of the last sample that counts.
+/// Where a group stands in its planes. By value, so that the pointers stay in registers: a store through the
+/// destination might change what lies in memory.
+template <int32_t kCount>
+struct Pointers {
+    const uint8_t* at[kCount];
+
+    const uint8_t* operator[](int32_t plane) const { return at[plane]; }
+};
+
+/// What is left of a plane, with the last sample that counts repeated to the end of the last unit.
 template <class Formula>
-void FillWindow(const uint8_t* plane, int32_t samples, uint8_t* window, int32_t windowSamples) {
-    const int32_t kept = samples < windowSamples ? samples : windowSamples;
-    std::memcpy(window, plane, static_cast<size_t>(2 * kept));
+void FillWindow(const uint8_t* plane, int32_t samples, int32_t wanted, uint8_t* window) {
+    std::memcpy(window, plane, static_cast<size_t>(2 * samples));
     const uint8_t* const last = plane + 2 * ((samples - 1) / Formula::kStep * Formula::kStep);
-    for (int32_t i = kept; i < windowSamples; ++i) std::memcpy(window + 2 * i, last, 2);
+    for (int32_t i = samples; i < wanted; ++i) std::memcpy(window + 2 * i, last, 2);
 }
 
-/// A group that loads more than is left of the planes.
 template <class Formula>
-void EndGroup(PlaneRows planes, uint8_t* destination, int32_t pixelsLeft) {
-    constexpr int32_t kWindowBytes = 4 * Formula::kReach;
-    uint8_t windows[Formula::kPlanes][kWindowBytes];
-    const uint8_t* rows[Formula::kPlanes];
-    const int32_t lumas = pixelsLeft * Formula::kLumas;
+constexpr int32_t kGroupBytes = Formula::kPixels / Formula::kUnit* Formula::kUnitBytes;
+
+template <class Formula>
+void Advance(Pointers<Formula::kPlanes>& planes) {
+    for (int32_t i = 0; i < Formula::kPlanes; ++i)
+        planes.at[i] += (i % 3 == 0 ? 2 : 1) * Formula::kLumas * Formula::kPixels;
+}
+
+/// The pixels at the end of a row, whose groups load more than is left of the planes. They have fewer than
+/// kReach chromas, which leaves as many for what the last group loads.
+template <class Formula>
+void EndOfRow(Pointers<Formula::kPlanes> planes, uint8_t* destination, int32_t pixelsLeft) {
+    constexpr int32_t kChromas = 2 * Formula::kReach;
+    uint8_t windows[Formula::kPlanes][4 * kChromas] = {};
+    const int32_t units = (pixelsLeft + Formula::kUnit - 1) / Formula::kUnit;
+    const int32_t lumas = pixelsLeft * Formula::kLumas, wanted = units * Formula::kUnit * Formula::kLumas;
     for (int32_t i = 0; i < Formula::kPlanes; ++i) {
         const bool isLuma = i % 3 == 0;
-        FillWindow<Formula>(planes[i], isLuma ? lumas : (lumas + 1) / 2, windows[i],
-                            isLuma ? 2 * Formula::kReach : Formula::kReach);
-        rows[i] = windows[i];
+        FillWindow<Formula>(planes[i], isLuma ? lumas : (lumas + 1) / 2, isLuma ? wanted : wanted / 2,
+                            windows[i]);
+        planes.at[i] = windows[i];
     }
-    uint8_t to[Formula::kPixels / Formula::kUnit * Formula::kUnitBytes];
-    Formula::Group(rows, to);
-    const int32_t pixels = pixelsLeft < Formula::kPixels ? pixelsLeft : Formula::kPixels;
-    const int32_t units = (pixels + Formula::kUnit - 1) / Formula::kUnit;
+    uint8_t to[(2 * Formula::kReach / Formula::kPixels + 1) * kGroupBytes<Formula>];
+    uint8_t* group = to;
+    for (int32_t left = pixelsLeft; left > 0; left -= Formula::kPixels, group += kGroupBytes<Formula>) {
+        Formula::Group(planes, group);
+        Advance<Formula>(planes);
+    }
     std::memcpy(destination, to, static_cast<size_t>(units * Formula::kUnitBytes));
 }
 
 template <class Formula>
 void FromPlanesRow(PlaneRows planes, uint8_t* destination, int32_t pixelsLeft) {
-    const uint8_t* at[Formula::kPlanes];
-    for (int32_t i = 0; i < Formula::kPlanes; ++i) at[i] = planes[i];
-    while (pixelsLeft > 0) {
-        if ((int64_t{pixelsLeft} * Formula::kLumas + 1) / 2 >= Formula::kReach)
-            Formula::Group(at, destination);
-        else
-            EndGroup<Formula>(at, destination, pixelsLeft);
-        for (int32_t i = 0; i < Formula::kPlanes; ++i)
-            at[i] += (i % 3 == 0 ? 2 : 1) * Formula::kLumas * Formula::kPixels;
-        destination += Formula::kPixels / Formula::kUnit * Formula::kUnitBytes;
-        pixelsLeft -= Formula::kPixels;
+    constexpr int32_t kPixelsOfWholeGroup = (2 * Formula::kReach + Formula::kLumas - 1) / Formula::kLumas;
+    Pointers<Formula::kPlanes> pointers;
+    for (int32_t i = 0; i < Formula::kPlanes; ++i) pointers.at[i] = planes[i];
+    for (; pixelsLeft >= kPixelsOfWholeGroup; pixelsLeft -= Formula::kPixels) {
+        Formula::Group(pointers, destination);
+        Advance<Formula>(pointers);
+        destination += kGroupBytes<Formula>;
     }
+    if (pixelsLeft > 0) EndOfRow<Formula>(pointers, destination, pixelsLeft);
 }
 
 constexpr int32_t kGroups = kLanes / 4; // of six pixels in a vector
@@ -73,18 +89,17 @@ inline I32 LoadBlocks(const uint8_t* source, int32_t stride) {
     return Bits(LoadFloatBlocks(source, stride));
 }
 
-inline GroupSamples LoadGroups(PlaneRows planes) {
-    return {
-        LoadBlocks(planes[0], 12),
-        BlendBlocks<0b0011>(LoadBlocks(planes[1], 6), ShufflePixel<0, 1, 0, 1>(LoadBlocks(planes[2], 6)))};
+inline GroupSamples LoadGroups(const uint8_t* y, const uint8_t* u, const uint8_t* v) {
+    return {LoadBlocks(y, 12),
+            BlendBlocks<0b0011>(LoadBlocks(u, 6), ShufflePixel<0, 1, 0, 1>(LoadBlocks(v, 6)))};
 }
 
 /// Every second sample.
-inline GroupSamples LoadHalvedGroups(PlaneRows planes) {
-    return {BlendBlocks<0b0011>(HalvesAt<0, 4, 8, 12, 0, 0, 0, 0>(LoadBlocks(planes[0], 24)),
-                                HalvesAt<0, 0, 0, 0, 8, 12, 8, 12>(LoadBlocks(planes[0] + 8, 24))),
-            BlendBlocks<0b0011>(HalvesAt<0, 4, 8, 8, 0, 0, 0, 0>(LoadBlocks(planes[1], 12)),
-                                HalvesAt<0, 0, 0, 0, 0, 4, 8, 8>(LoadBlocks(planes[2], 12)))};
+inline GroupSamples LoadHalvedGroups(const uint8_t* y, const uint8_t* u, const uint8_t* v) {
+    return {BlendBlocks<0b0011>(HalvesAt<0, 4, 8, 12, 0, 0, 0, 0>(LoadBlocks(y, 24)),
+                                HalvesAt<0, 0, 0, 0, 8, 12, 8, 12>(LoadBlocks(y + 8, 24))),
+            BlendBlocks<0b0011>(HalvesAt<0, 4, 8, 8, 0, 0, 0, 0>(LoadBlocks(u, 12)),
+                                HalvesAt<0, 0, 0, 0, 0, 4, 8, 8>(LoadBlocks(v, 12)))};
 }
 
 /// (a + b) >> 1 in each half.
@@ -104,14 +119,17 @@ struct ToV210 {
     static constexpr int32_t kLumas = 1, kStep = 1;
     static constexpr int32_t kReach = 3 * (kGroups - 1) + 8;
 
-    static void Group(PlaneRows planes, uint8_t* destination) { StoreV210(destination, LoadGroups(planes)); }
+    static void Group(Pointers<3> planes, uint8_t* destination) {
+        StoreV210(destination, LoadGroups(planes[0], planes[1], planes[2]));
+    }
 };
 
 struct AverageToV210 : ToV210 {
     static constexpr int32_t kPlanes = 6;
 
-    static void Group(PlaneRows planes, uint8_t* destination) {
-        const GroupSamples upper = LoadGroups(planes), lower = LoadGroups(planes + 3);
+    static void Group(Pointers<6> planes, uint8_t* destination) {
+        const GroupSamples upper = LoadGroups(planes[0], planes[1], planes[2]);
+        const GroupSamples lower = LoadGroups(planes[3], planes[4], planes[5]);
         StoreV210(destination,
                   {AverageDown(upper.luma, lower.luma), AverageDown(upper.chroma, lower.chroma)});
     }
@@ -121,8 +139,8 @@ struct QuarterToV210 : ToV210 {
     static constexpr int32_t kLumas = 2, kStep = 2;
     static constexpr int32_t kReach = 6 * (kGroups - 1) + 8;
 
-    static void Group(PlaneRows planes, uint8_t* destination) {
-        StoreV210(destination, LoadHalvedGroups(planes));
+    static void Group(Pointers<3> planes, uint8_t* destination) {
+        StoreV210(destination, LoadHalvedGroups(planes[0], planes[1], planes[2]));
     }
 };
 
@@ -132,7 +150,7 @@ struct QuarterToVUYX {
     static constexpr int32_t kLumas = 2, kStep = 1;
     static constexpr int32_t kReach = kLanes;
 
-    static void Group(PlaneRows planes, uint8_t* destination) {
+    static void Group(Pointers<3> planes, uint8_t* destination) {
         const I32 lumas = LoadInts(planes[0]);
         const I32 y = ShiftLeft<13>((lumas & Ints(0xffff)) + ShiftRight<16>(lumas)) & Ints(0xff0000);
         const I32 u = ShiftLeft<6>(LoadWords(planes[1])) & Ints(0xff00);
