@@ -4,6 +4,7 @@
 /// The whole exported interface.
 
 #include <PixelKiln/Buffers.h>
+#include <PixelKiln/CodecBridges.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Overlay.h>

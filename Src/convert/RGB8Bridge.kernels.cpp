@@ -1,0 +1,46 @@
+// Three-byte RGB to four-byte pixels.
+
+#include "convert/BridgeKernels.h"
+#include "convert/RowWindows.h"
+
+namespace PK::PK_TARGET {
+namespace {
+
+/// R, G and B of four pixels a block, to B, G and R with an opaque alpha. Where there is a byte shuffle, one
+/// of it does.
+template <class Vector>
+inline Vector OpaquePixels(Vector triples) {
+    const Vector alpha = Ints(-0x1000000);
+    if constexpr (kLanes == 4 && kHasByteShuffle) {
+        const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
+        return Vector{_mm_shuffle_epi8(triples.v, order)} | alpha;
+    } else if constexpr (kLanes == 8) {
+        const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
+        return Vector{_mm256_shuffle_epi8(triples.v, _mm256_broadcastsi128_si256(order))} | alpha;
+    } else {
+        return ShiftRight<8>(ReverseBytes(HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(triples))) | alpha;
+    }
+}
+
+struct RGB8ToBGRA : NoNeighbours {
+    static constexpr int32_t kVectors = 4;
+    static constexpr int32_t kPixels = kVectors * kLanes;
+    static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 1;
+    static constexpr int32_t kSourceBytes = 3 * kPixels, kDestinationBytes = 4 * kPixels;
+    static constexpr int32_t kBytesAfter = 4; // the last block of four pixels is loaded as 16 bytes
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        for (int32_t i = 0; i < kPixels; i += kLanes)
+            Store(destination + 4 * i, OpaquePixels(Bits(LoadFloatBlocks(source + 3 * i, 12))));
+    }
+};
+
+} // namespace
+} // namespace PK::PK_TARGET
+
+template <>
+const PK::RGB8Kernels& PK::RGB8Kernels::For<PK::PK_TARGET::kTarget>() {
+    using namespace PK_TARGET;
+    static constexpr RGB8Kernels kernels = {WindowRow<RGB8ToBGRA>};
+    return kernels;
+}
