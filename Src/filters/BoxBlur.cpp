@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <cstring>
 #include <span>
+#include <utility>
 
 namespace PK {
 namespace {
@@ -75,10 +76,22 @@ private:
     int32_t fLength;
 };
 
-void CopyPixels(const uint8_t* source, int64_t sourceStep, uint8_t* destination, int64_t destinationStep,
-                int32_t count, size_t bytes) {
-    for (int32_t i = 0; i < count; ++i)
-        std::memcpy(destination + i * destinationStep, source + i * sourceStep, bytes);
+/// Copies \p length runs of kBytes.
+template <size_t kBytes>
+void CopyRuns(const uint8_t* source, int64_t sourceStep, uint8_t* destination, int64_t destinationStep,
+              int32_t length) {
+    for (int32_t i = 0; i < length; ++i)
+        std::memcpy(destination + i * destinationStep, source + i * sourceStep, kBytes);
+}
+
+void CopyColumns(const uint8_t* source, int64_t sourceStep, uint8_t* destination, int64_t destinationStep,
+                 int32_t length, int32_t count) {
+    if (count == kBundleLines) {
+        CopyRuns<kBundleStep>(source, sourceStep, destination, destinationStep, length);
+        return;
+    }
+    for (int32_t offset = 0; offset < 4 * count; offset += 4)
+        CopyRuns<4>(source + offset, sourceStep, destination + offset, destinationStep, length);
 }
 
 /// One line after the other, through the caller's scratch.
@@ -88,26 +101,26 @@ void BlurSingly(const Lines& lines, const Passes& passes, uint8_t* scratch) {
     uint8_t* line = scratch + 4 * (int64_t{lines.length} + lines.count);
     for (int32_t i = 0; i < lines.count; ++i) {
         uint8_t* first = lines.first + i * lines.LineStep();
-        CopyPixels(first, lines.PixelStep(), line, 4, lines.length, 4);
+        CopyRuns<4>(first, lines.PixelStep(), line, 4, lines.length);
         passes.ForEach([&](const BoxPass& pass) {
             std::memcpy(scratch, line, bytes);
             blur(pass, scratch, line);
         });
-        CopyPixels(line, 4, first, lines.PixelStep(), lines.length, 4);
+        CopyRuns<4>(line, 4, first, lines.PixelStep(), lines.length);
     }
 }
 
 void GatherBundle(const Lines& lines, uint8_t* first, int32_t count, uint8_t* bundle) {
     if (count < kBundleLines) std::memset(bundle, 0, size_t{kBundleStep} * lines.length);
     if (lines.areColumns)
-        CopyPixels(first, lines.rowStep, bundle, kBundleStep, lines.length, size_t{4} * count);
+        CopyColumns(first, lines.rowStep, bundle, kBundleStep, lines.length, count);
     else
         Best<TransposeKernels>().pixels4({first, lines.rowStep, bundle, kBundleStep, count, lines.length});
 }
 
 void ScatterBundle(const Lines& lines, const uint8_t* bundle, uint8_t* first, int32_t count) {
     if (lines.areColumns)
-        CopyPixels(bundle, kBundleStep, first, lines.rowStep, lines.length, size_t{4} * count);
+        CopyColumns(bundle, kBundleStep, first, lines.rowStep, lines.length, count);
     else
         Best<TransposeKernels>().pixels4({bundle, kBundleStep, first, lines.rowStep, lines.length, count});
 }

@@ -61,8 +61,9 @@ void Run(const BoxPass& pass, const uint8_t* source, uint8_t* destination) {
     }
 }
 
-/// Divisors up to 7900. The inverse is so much too large that no rounding, in whatever mode, takes a quotient below
-/// the true one; and a quotient up to 256 stays less than 1/7900 above it, which no multiple of 1/divisor is.
+/// Divisors up to 7900. The inverse is so much too large that no rounding, in whatever mode, takes a product below the
+/// true quotient, by at most 2.07 x 2^-22 of it in all: less than 1/divisor, as long as the numerator is at most
+/// 255 x 7900 + 128. So no product reaches the next whole number.
 class SmallDivisor {
 public:
     static constexpr int64_t kLargest = 7900;
