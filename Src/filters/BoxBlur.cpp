@@ -164,13 +164,13 @@ void PK_BoxBlur(int32_t passCount, double* radii, int32_t flags, void* scratch, 
     using namespace PK;
     if (passCount < 1 || !radii || !scratch || !image) return;
     if (width < kSmallestSide || height < kSmallestSide) return;
+    const FloatMode mode; // comparing with NaN leaves a trace too
     const double limit = std::min(width, height) - 3;
     const std::span<double> all(radii, static_cast<size_t>(passCount));
     for (double& radius : all)
         if (radius > limit) radius = limit;
     if (FilteredBytes(flags) == 0) return;
 
-    const FloatMode mode;
     const Lines lines = LinesOf(static_cast<uint8_t*>(image), rowBytes, width, height, flags);
     Blur(lines, Passes(all, flags, lines.length), static_cast<uint8_t*>(scratch));
 }

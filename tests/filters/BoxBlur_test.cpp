@@ -253,7 +253,7 @@ TEST_P(BoxBlurBodies, AllRadiiOnAllShortLines) {
     const std::array<int32_t, 4> flags = {kAllBytes, kAllBytes | kRenormalise, 7, 9 | kRenormalise};
     int32_t turn = 0;
     for (int32_t length = 4; length <= 60; ++length)
-        for (double radius = 0; radius <= std::min(50, length - 3); radius += 0.93) {
+        for (double radius = 0; radius <= std::min(50, length - 3); radius += 1.43) {
             const int32_t other = std::max(length, 4 + turn % 19);
             const int32_t chosen = flags[static_cast<size_t>(turn++ % 4)];
             const Frame rows(length, other, length * 4, turn % 2 ? Guard::kAfter : Guard::kBefore);
@@ -298,7 +298,7 @@ TEST_P(BoxBlurBodies, SeveralPassesAtAnySize) {
 
 TEST_P(BoxBlurBodies, WideWindows) {
     Random random(6);
-    for (const double radius : {126.5, 150.25, 297.0})
+    for (const double radius : {126.5, 297.0})
         for (const int32_t flags : {kAllBytes, kAllBytes | kRenormalise}) {
             const Frame frame(604, 300, 604 * 4);
             frame.FillRandomly(random);
@@ -417,7 +417,7 @@ TEST(BoxBlur, RoundingModeAndExceptionFlagsCountForNothing) {
     const Frame frame(90, 70, 360);
     for (const uint32_t mode : {0x0000u, 0x2000u, 0x4000u, 0x6000u}) {
         frame.FillRandomly(random);
-        std::vector<double> radii = {10, 13.5, 40.25};
+        std::vector<double> radii = {10, 13.5, 40.25, 1e-310, std::numeric_limits<double>::quiet_NaN()};
         const std::vector<uint8_t> expected = frame.Expected(radii, kAllBytes | kRenormalise);
         const uint32_t saved = _mm_getcsr();
         _mm_setcsr(0x1f80 | mode);
