@@ -5,7 +5,7 @@
 #include "frame/Capabilities.h"
 #include "frame/Dispatch.h"
 #include "frame/PixelFormat.h"
-#include "geometry/TransposeKernels.h"
+#include "primitives/TransposeKernels.h"
 
 #include <cstring>
 

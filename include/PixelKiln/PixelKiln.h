@@ -3,6 +3,7 @@
 /// \file
 /// The whole exported interface.
 
+#include <PixelKiln/BoxBlur.h>
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/CodecBridges.h>
 #include <PixelKiln/Convert.h>

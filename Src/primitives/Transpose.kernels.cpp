@@ -1,7 +1,7 @@
 // Transposition in tiles: a tile takes as many source rows as fill a vector, and one block of four lanes from each.
 // Its transposed vectors are runs of destination rows.
 
-#include "geometry/TransposeKernels.h"
+#include "primitives/TransposeKernels.h"
 #include "primitives/simd/Target.h"
 
 namespace PK::PK_TARGET {
