@@ -17,9 +17,17 @@ inline Vector OpaquePixels(Vector triples) {
     } else if constexpr (kLanes == 8) {
         const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
         return Vector{_mm256_shuffle_epi8(triples.v, _mm256_broadcastsi128_si256(order))} | alpha;
+    } else if constexpr (kLanes == 16) {
+        const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
+        return ShuffleBytes(triples, order) | alpha;
     } else {
         return ShiftRight<8>(ReverseBytes(HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(triples))) | alpha;
     }
+}
+
+/// Twelve bytes a block; what follows them means nothing.
+inline I32 LoadPixels(const uint8_t* source) {
+    return kLanes > 8 ? LoadThrees(source) : Bits(LoadFloatBlocks(source, 12));
 }
 
 struct RGB8ToBGRA : NoNeighbours {
@@ -31,7 +39,7 @@ struct RGB8ToBGRA : NoNeighbours {
 
     static void Group(const uint8_t* source, uint8_t* destination) {
         for (int32_t i = 0; i < kPixels; i += kLanes)
-            Store(destination + 4 * i, OpaquePixels(Bits(LoadFloatBlocks(source + 3 * i, 12))));
+            Store(destination + 4 * i, OpaquePixels(LoadPixels(source + 3 * i)));
     }
 };
 
