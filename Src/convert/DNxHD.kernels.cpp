@@ -23,8 +23,8 @@ inline void StoreDNxHD(uint8_t* destination, I32 words) {
     I32 low, high;
     InterleaveInBlocks(firstAndSecond, ShiftRight<16>(words) & Ints(0xffc0), low, high);
     const I32 isSample = PixelInts(-1, 0xffff, -1, 0xffff);
-    StoreBlocks(destination, 32, Select(isSample, low, Bits(LoadFloatBlocks(destination, 32))));
-    StoreBlocks(destination + 16, 32, Select(isSample, high, Bits(LoadFloatBlocks(destination + 16, 32))));
+    StoreBlocksInTurns(destination, Select(isSample, low, Bits(LoadFloatBlocks(destination, 32))),
+                       Select(isSample, high, Bits(LoadFloatBlocks(destination + 16, 32))));
 }
 
 /// The pixels at the end are stored sample by sample: the row may end before the fourth word of the last.

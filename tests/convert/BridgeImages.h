@@ -77,7 +77,8 @@ void AtEveryCapability(Check check) {
     const FlagScope restore;
     PK::DetectProcessor();
     check();
-    for (uint8_t* flag : {&PK::sCPUHasAVX2, &PK::sCPUHasSSE4, &PK::sCPUHasSSSE3, &PK::sCPUHasSSE2}) {
+    for (uint8_t* flag :
+         {&PK::sCPUHasAVX512, &PK::sCPUHasAVX2, &PK::sCPUHasSSE4, &PK::sCPUHasSSSE3, &PK::sCPUHasSSE2}) {
         *flag = 0;
         SCOPED_TRACE(PK::TargetName(PK::BestTarget()));
         check();
