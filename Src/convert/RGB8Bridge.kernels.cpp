@@ -7,12 +7,13 @@ namespace PK::PK_TARGET {
 namespace {
 
 /// R, G and B of four pixels a block, to B, G and R with an opaque alpha. Where there is a byte shuffle, one
-/// of it does.
+/// of it does. Blocks of 16 bytes are the widest that pay: what is loaded or stored 64 bytes at once lies
+/// across cache lines.
 template <class Vector>
-inline Vector OpaquePixels(Vector triples) {
-    const Vector alpha = Ints(-0x1000000);
-    if constexpr (kLanes == 4 && kHasByteShuffle) {
+inline void StorePixels(const uint8_t* source, uint8_t* destination) {
+    if constexpr (kHasByteShuffle) {
         const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
+<<<<<<< HEAD
         return Vector{_mm_shuffle_epi8(triples.v, order)} | alpha;
     } else if constexpr (kLanes == 8) {
         const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
@@ -20,8 +21,17 @@ inline Vector OpaquePixels(Vector triples) {
     } else if constexpr (kLanes == 16) {
         const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
         return ShuffleBytes(triples, order) | alpha;
+=======
+        const __m128i alpha = _mm_set1_epi32(-0x1000000);
+        for (int32_t block = 0; block < kLanes / 4; ++block) {
+            const __m128i triples = _mm_loadu_si128(reinterpret_cast<const __m128i*>(source + 12 * block));
+            _mm_storeu_si128(reinterpret_cast<__m128i*>(destination + 16 * block),
+                             _mm_or_si128(_mm_shuffle_epi8(triples, order), alpha));
+        }
+>>>>>>> bridges
     } else {
-        return ShiftRight<8>(ReverseBytes(HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(triples))) | alpha;
+        const Vector pixels = HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(LoadInts(source));
+        Store(destination, ShiftRight<8>(ReverseBytes(pixels)) | Ints(-0x1000000));
     }
 }
 
@@ -31,15 +41,18 @@ inline I32 LoadPixels(const uint8_t* source) {
 }
 
 struct RGB8ToBGRA : NoNeighbours {
-    static constexpr int32_t kVectors = 4;
-    static constexpr int32_t kPixels = kVectors * kLanes;
+    static constexpr int32_t kPixels = 32;
     static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 1;
     static constexpr int32_t kSourceBytes = 3 * kPixels, kDestinationBytes = 4 * kPixels;
     static constexpr int32_t kBytesAfter = 4; // the last block of four pixels is loaded as 16 bytes
 
     static void Group(const uint8_t* source, uint8_t* destination) {
+<<<<<<< HEAD
         for (int32_t i = 0; i < kPixels; i += kLanes)
             Store(destination + 4 * i, OpaquePixels(LoadPixels(source + 3 * i)));
+=======
+        for (int32_t i = 0; i < kPixels; i += kLanes) StorePixels<I32>(source + 3 * i, destination + 4 * i);
+>>>>>>> bridges
     }
 };
 
