@@ -7,4 +7,5 @@
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/PixelFormat.h>
+#include <PixelKiln/QuadWarp.h>
 #include <PixelKiln/Types.h>
