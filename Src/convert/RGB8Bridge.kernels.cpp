@@ -13,31 +13,16 @@ template <class Vector>
 inline void StorePixels(const uint8_t* source, uint8_t* destination) {
     if constexpr (kHasByteShuffle) {
         const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
-<<<<<<< HEAD
-        return Vector{_mm_shuffle_epi8(triples.v, order)} | alpha;
-    } else if constexpr (kLanes == 8) {
-        const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
-        return Vector{_mm256_shuffle_epi8(triples.v, _mm256_broadcastsi128_si256(order))} | alpha;
-    } else if constexpr (kLanes == 16) {
-        const __m128i order = _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1);
-        return ShuffleBytes(triples, order) | alpha;
-=======
         const __m128i alpha = _mm_set1_epi32(-0x1000000);
         for (int32_t block = 0; block < kLanes / 4; ++block) {
             const __m128i triples = _mm_loadu_si128(reinterpret_cast<const __m128i*>(source + 12 * block));
             _mm_storeu_si128(reinterpret_cast<__m128i*>(destination + 16 * block),
                              _mm_or_si128(_mm_shuffle_epi8(triples, order), alpha));
         }
->>>>>>> bridges
     } else {
         const Vector pixels = HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(LoadInts(source));
         Store(destination, ShiftRight<8>(ReverseBytes(pixels)) | Ints(-0x1000000));
     }
-}
-
-/// Twelve bytes a block; what follows them means nothing.
-inline I32 LoadPixels(const uint8_t* source) {
-    return kLanes > 8 ? LoadThrees(source) : Bits(LoadFloatBlocks(source, 12));
 }
 
 struct RGB8ToBGRA : NoNeighbours {
@@ -47,12 +32,7 @@ struct RGB8ToBGRA : NoNeighbours {
     static constexpr int32_t kBytesAfter = 4; // the last block of four pixels is loaded as 16 bytes
 
     static void Group(const uint8_t* source, uint8_t* destination) {
-<<<<<<< HEAD
-        for (int32_t i = 0; i < kPixels; i += kLanes)
-            Store(destination + 4 * i, OpaquePixels(LoadPixels(source + 3 * i)));
-=======
         for (int32_t i = 0; i < kPixels; i += kLanes) StorePixels<I32>(source + 3 * i, destination + 4 * i);
->>>>>>> bridges
     }
 };
 

@@ -13,4 +13,5 @@
 #include <PixelKiln/Planar.h>
 #include <PixelKiln/QuarterScale.h>
 #include <PixelKiln/Rotate.h>
+#include <PixelKiln/QuadWarp.h>
 #include <PixelKiln/Types.h>

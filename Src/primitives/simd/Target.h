@@ -37,11 +37,15 @@ struct IntChannels {
     I32 c0, c1, c2, c3;
 };
 
-/// kLanes pixels of four bytes.
-inline IntChannels LoadByteChannels(const void* source) {
-    const I32 pixels = LoadInts(source);
+/// The four bytes of each lane.
+inline IntChannels ByteChannels(I32 pixels) {
     const I32 low = Ints(0xff);
     return {pixels & low, ShiftRight<8>(pixels) & low, ShiftRight<16>(pixels) & low, ShiftRight<24>(pixels)};
+}
+
+/// kLanes pixels of four bytes.
+inline IntChannels LoadByteChannels(const void* source) {
+    return ByteChannels(LoadInts(source));
 }
 
 inline F32 LoadBytesAsFloats(const void* source) {

@@ -419,6 +419,27 @@ inline I32 HalvesAt(I32 a) {
     return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
 }
 
+/// Whether the highest bit of any lane is set.
+inline bool AnyNegative(I32 a) {
+    return _mm256_movemask_ps(_mm256_castsi256_ps(a.v)) != 0;
+}
+
+/// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
+/// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
+inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {
+    const auto pair = [pixels](int64_t at) {
+        return _mm256_cvtepu8_epi32(_mm_loadl_epi64(reinterpret_cast<const __m128i*>(pixels + 4 * at)));
+    };
+    const __m256i lower = pair(index[0]), upper = pair(index[4]);
+    first.v = _mm256_permute2x128_si256(lower, upper, 0x20);
+    second.v = _mm256_permute2x128_si256(lower, upper, 0x31);
+}
+
+/// In each block, the lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanesInBlocks(I32 a, I32 b, I32 c, I32 d) {
+    return {_mm256_packus_epi16(_mm256_packs_epi32(a.v, b.v), _mm256_packs_epi32(c.v, d.v))};
+}
+
 /// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
 inline I32 MultiplyAddHalves(I32 a, I32 b) {
     return {_mm256_madd_epi16(a.v, b.v)};

@@ -467,6 +467,23 @@ inline I32 HalvesAt(I32 a) {
     return LoadInts(halves);
 }
 
+/// Whether the highest bit of any lane is set.
+inline bool AnyNegative(I32 a) {
+    return ((a.lane[0] | a.lane[1] | a.lane[2] | a.lane[3]) >> 31) != 0;
+}
+
+/// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
+/// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
+inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {
+    first = LoadBytes(pixels + 4 * int64_t{*index});
+    second = LoadBytes(pixels + 4 * int64_t{*index} + 4);
+}
+
+/// In each block, the lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanesInBlocks(I32 a, I32 b, I32 c, I32 d) {
+    return PackLanes(a, b, c, d);
+}
+
 /// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
 inline I32 MultiplyAddHalves(I32 a, I32 b) {
     return Map<I32>(a, b, [](uint32_t x, uint32_t y) {

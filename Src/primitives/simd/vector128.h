@@ -448,6 +448,24 @@ inline I32 HalvesAt(I32 a) {
 #endif
 }
 
+/// Whether the highest bit of any lane is set.
+inline bool AnyNegative(I32 a) {
+    return _mm_movemask_ps(_mm_castsi128_ps(a.v)) != 0;
+}
+
+/// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
+/// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
+inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {
+    const I32 halves = LoadBytesAsHalves(pixels + 4 * int64_t{*index});
+    first.v = _mm_unpacklo_epi16(halves.v, _mm_setzero_si128());
+    second.v = _mm_unpackhi_epi16(halves.v, _mm_setzero_si128());
+}
+
+/// In each block, the lanes of four vectors to bytes in their order, saturated.
+inline I32 PackLanesInBlocks(I32 a, I32 b, I32 c, I32 d) {
+    return PackLanes(a, b, c, d);
+}
+
 /// In each lane, the sum of the products of its two signed 16-bit halves with their counterparts.
 inline I32 MultiplyAddHalves(I32 a, I32 b) {
     return {_mm_madd_epi16(a.v, b.v)};

@@ -1,0 +1,145 @@
+#include "geometry/QuadRasterizer.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstddef>
+
+namespace PK {
+
+namespace {
+
+/// The first of the pixels low to high whose centre is not before the position; high + 1 if there is none, or
+/// if the position is no number.
+int64_t FirstCentre(float position, int32_t low, int32_t high) {
+    const double first = std::ceil(position - 0.5f);
+    if (!(first <= high)) return int64_t{high} + 1;
+    return first > low ? static_cast<int64_t>(first) : low;
+}
+
+/// The last of the pixels low to high whose centre is not behind the position; low - 1 if there is none, or if
+/// the position is no number.
+int64_t LastCentre(float position, int32_t low, int32_t high) {
+    const double last = std::floor(position - 0.5f);
+    if (!(last >= low)) return int64_t{low} - 1;
+    return last < high ? static_cast<int64_t>(last) : high;
+}
+
+bool IsFinite(const WarpPolygon& polygon) {
+    return std::all_of(polygon.begin(), polygon.end(), [](const WarpVertex& vertex) {
+        return std::isfinite(vertex.x) && std::isfinite(vertex.y) && std::isfinite(vertex.u) &&
+               std::isfinite(vertex.v) && std::isfinite(vertex.a);
+    });
+}
+
+float NonZero(float divisor) {
+    return divisor == 0 ? 1 : divisor;
+}
+
+} // namespace
+
+void QuadRasterizer::Draw(const WarpPolygon& polygon) {
+    if (!IsFinite(polygon)) return;
+    fPolygon = polygon;
+    fActiveCount = 0;
+    SortVertices();
+    const auto& order = fSortedVertices;
+    const int64_t first = FirstCentre(fPolygon[order.front()].y, fDestination.top, fDestination.bottom);
+    const int64_t last = LastCentre(fPolygon[order.back()].y, fDestination.top, fDestination.bottom);
+
+    size_t taken = 0;
+    for (int64_t row = first; row <= last; ++row) {
+        // In double precision, so that a row is told from the next however far down it lies.
+        const double centre = static_cast<double>(row) + 0.5;
+        while (taken < order.size() && fPolygon[order[taken]].y <= centre)
+            VisitVertex(order[taken++], centre);
+        SortEdges();
+        if (IsRowDrawn(row)) FillRow(row);
+        AdvanceEdges();
+    }
+}
+
+void QuadRasterizer::SortVertices() {
+    fSortedVertices = {0, 1, 2, 3};
+    std::sort(fSortedVertices.begin(), fSortedVertices.end(),
+              [this](int32_t a, int32_t b) { return fPolygon[a].y < fPolygon[b].y; });
+}
+
+void QuadRasterizer::VisitVertex(int32_t index, double centre) {
+    const int32_t before = (index + 3) % 4, after = (index + 1) % 4;
+    VisitEdge(before, fPolygon[before], centre);
+    VisitEdge(index, fPolygon[after], centre);
+}
+
+/// \param other  the end of the edge that is not being visited.
+void QuadRasterizer::VisitEdge(int32_t edge, const WarpVertex& other, double centre) {
+    if (other.y <= centre - 1)
+        EndEdge(edge);
+    else if (other.y > centre)
+        fActiveEdges[fActiveCount++] = StartEdge(edge, static_cast<float>(centre));
+}
+
+QuadRasterizer::EdgeState QuadRasterizer::StartEdge(int32_t edge, float centre) const {
+    const WarpVertex &first = fPolygon[edge], &second = fPolygon[(edge + 1) % 4];
+    const WarpVertex& upper = first.y < second.y ? first : second;
+    const WarpVertex& lower = first.y < second.y ? second : first;
+    const float height = NonZero(lower.y - upper.y);
+    const float above = centre - upper.y;
+    const auto slope = [height, above](float from, float to) {
+        const float change = (to - from) / height;
+        return Slope{from + change * above, change};
+    };
+    return {edge, slope(upper.x, lower.x), slope(upper.u, lower.u), slope(upper.v, lower.v),
+            slope(upper.a, lower.a)};
+}
+
+void QuadRasterizer::EndEdge(int32_t edge) {
+    const auto end = fActiveEdges.begin() + fActiveCount;
+    const auto kept = std::remove_if(fActiveEdges.begin(), end,
+                                     [edge](const EdgeState& state) { return state.edge == edge; });
+    fActiveCount = static_cast<int32_t>(kept - fActiveEdges.begin());
+}
+
+void QuadRasterizer::SortEdges() {
+    // What overflowed to not-a-number goes last: the order must be one.
+    std::sort(fActiveEdges.begin(), fActiveEdges.begin() + fActiveCount,
+              [](const EdgeState& a, const EdgeState& b) {
+                  return a.x.value < b.x.value || (std::isnan(b.x.value) && !std::isnan(a.x.value));
+              });
+}
+
+void QuadRasterizer::AdvanceEdges() {
+    for (int32_t i = 0; i < fActiveCount; ++i)
+        for (Slope* slope : {&fActiveEdges[i].x, &fActiveEdges[i].u, &fActiveEdges[i].v, &fActiveEdges[i].a})
+            slope->value += slope->change;
+}
+
+bool QuadRasterizer::IsRowDrawn(int64_t row) const {
+    if (fDestination.field == 0) return true;
+    const bool isOdd = (row & 1) != 0;
+    return fDestination.field == (isOdd ? 2 : 1);
+}
+
+void QuadRasterizer::FillRow(int64_t row) const {
+    for (int32_t i = 0; i + 1 < fActiveCount; i += 2) FillBetween(fActiveEdges[i], fActiveEdges[i + 1], row);
+}
+
+void QuadRasterizer::FillBetween(const EdgeState& left, const EdgeState& right, int64_t row) const {
+    const int64_t first = FirstCentre(left.x.value, fDestination.left, fDestination.right);
+    const int64_t last = LastCentre(right.x.value, fDestination.left, fDestination.right);
+    if (last < first) return;
+
+    const float width = NonZero(right.x.value - left.x.value);
+    const float inside = static_cast<float>(first) + 0.5f - left.x.value;
+    WarpSpan span{};
+    span.du = (right.u.value - left.u.value) / width;
+    span.dv = (right.v.value - left.v.value) / width;
+    span.da = (right.a.value - left.a.value) / width;
+    span.u = left.u.value + inside * span.du;
+    span.v = left.v.value + inside * span.dv;
+    span.a = left.a.value + inside * span.da;
+    span.pixels = fDestination.pixels + 4 * (row * fDestination.stride + first);
+    span.count = last - first + 1;
+    fFillSpan(fSource, fPaint, span);
+}
+
+} // namespace PK

@@ -1,0 +1,191 @@
+// Every body of the quad warp against the restatement, pixel for pixel.
+
+#include "frame/Capabilities.h"
+#include "frame/Dispatch.h"
+#include "reference/ReferenceQuadWarp.h"
+#include "support/FlagScope.h"
+#include "support/GuardedRows.h"
+#include "support/Random.h"
+
+#include <PixelKiln/QuadWarp.h>
+
+#include <algorithm>
+#include <cstring>
+#include <gtest/gtest.h>
+#include <memory>
+#include <vector>
+
+using namespace PKTest;
+using PKReference::QuadWarp;
+
+namespace {
+
+/// Memory that ends with the last pixel of the rectangle, or begins with the first.
+class Area {
+public:
+    Area(const PK_Rect& rect, int32_t stride, Guard guard, Random& random)
+        : fRows(4 * static_cast<size_t>((rect.bottom - rect.top - 1) * stride + rect.right - rect.left),
+                guard),
+          fOffset(4 * (ptrdiff_t{rect.top} * stride + rect.left)) {
+        random.Fill(fRows.Bytes(), fRows.Size());
+    }
+
+    /// Pixel (0, 0), which need not be in the area.
+    uint8_t* Origin() const {
+        return reinterpret_cast<uint8_t*>(reinterpret_cast<uintptr_t>(fRows.Bytes()) -
+                                          static_cast<uintptr_t>(fOffset));
+    }
+    std::vector<uint8_t> Copy() const { return {fRows.Bytes(), fRows.Bytes() + fRows.Size()}; }
+    void Restore(const std::vector<uint8_t>& bytes) const {
+        std::copy(bytes.begin(), bytes.end(), fRows.Bytes());
+    }
+
+private:
+    GuardedRows fRows;
+    ptrdiff_t fOffset;
+};
+
+int32_t Between(Random& random, int32_t low, int32_t high) {
+    return low + static_cast<int32_t>(random.Below(static_cast<uint32_t>(high - low + 1)));
+}
+
+PK_Rect DrawRect(Random& random) {
+    const int32_t left = Between(random, -3, 9), top = Between(random, -3, 9);
+    return {left, top, left + Between(random, 1, 70), top + Between(random, 1, 20)};
+}
+
+/// Any corners in and around the rectangle; now and then on a grid of quarters, where centres lie on borders.
+void DrawQuad(Random& random, const PK_Rect& rect, double quad[8]) {
+    const bool onGrid = random.Below(3) == 0;
+    const int32_t grid = onGrid ? 4 : 9973;
+    const bool isBox = random.Below(4) == 0;
+    for (int32_t i = 0; i < 8; ++i) {
+        const int32_t low = i % 2 == 0 ? rect.left : rect.top, high = i % 2 == 0 ? rect.right : rect.bottom;
+        quad[i] = Between(random, (low - 6) * grid, (high + 6) * grid) / static_cast<double>(grid);
+    }
+    if (isBox) {
+        quad[2] = quad[4];
+        quad[3] = quad[1];
+        quad[6] = quad[0];
+        quad[7] = quad[5];
+    }
+    if (random.Below(8) == 0) std::copy_n(quad, 2, quad + 2); // a triangle
+}
+
+QuadWarp DrawWarp(Random& random) {
+    QuadWarp warp;
+    warp.sourceRect = DrawRect(random);
+    warp.destinationRect = DrawRect(random);
+    DrawQuad(random, warp.sourceRect, warp.sourceQuad);
+    DrawQuad(random, warp.destinationRect, warp.destinationQuad);
+    warp.quality = Between(random, 2, 3);
+    warp.opacity = random.Below(2) == 0 ? 255 : Between(random, 0, 255);
+    warp.blend = random.Below(3) != 0;
+    warp.keepSourceAlpha = random.Below(2) == 0;
+    constexpr PK_PixelFormat kFormats[] = {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_VUYA_4444_8u,
+                                           PK_PixelFormat_VUYA_4444_8u_709};
+    warp.format = kFormats[random.Below(3)];
+    warp.field = Between(random, 0, 2);
+    warp.ignoreFields = random.Below(4) == 0;
+    warp.featherOver = random.Below(4) == 0;
+    warp.feather = random.Below(2) == 0 ? 0 : static_cast<float>(Between(random, 1, 900)) / 100;
+    return warp;
+}
+
+PK_Result Call(const QuadWarp& warp) {
+    return PK_WarpAffineQuad(nullptr, nullptr, warp.source, warp.sourceRowBytes, &warp.sourceRect,
+                             warp.sourceQuad, warp.destination, warp.destinationRowBytes,
+                             &warp.destinationRect, warp.destinationQuad, warp.quality, warp.opacity,
+                             warp.blend, warp.keepSourceAlpha, warp.format, warp.field, warp.ignoreFields,
+                             warp.featherOver, warp.feather);
+}
+
+/// Leaves the capabilities of a target, and of those that it stands on.
+void AllowUpTo(PK::Target target) {
+    FlagScope::ClearAll();
+    PK::SetCapabilities(PK::ReadProcessor());
+    uint8_t* const flags[] = {&PK::sCPUHasSSE2, &PK::sCPUHasSSSE3, &PK::sCPUHasSSE4, &PK::sCPUHasAVX2};
+    for (size_t i = static_cast<size_t>(target); i < std::size(flags); ++i) *flags[i] = 0;
+}
+
+} // namespace
+
+TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
+    const FlagScope flags;
+    Random random(53);
+    for (int32_t round = 0; round < 6000; ++round) {
+        QuadWarp warp = DrawWarp(random);
+        const int32_t sourceStride = warp.sourceRect.right - warp.sourceRect.left + Between(random, 0, 5);
+        const int32_t destinationStride =
+            warp.destinationRect.right - warp.destinationRect.left + Between(random, 0, 5);
+        const Guard guard = random.Below(2) == 0 ? Guard::kBefore : Guard::kAfter;
+        const Area source(warp.sourceRect, sourceStride, guard, random);
+        const Area destination(warp.destinationRect, destinationStride, guard, random);
+        warp.source = source.Origin();
+        warp.destination = destination.Origin();
+        warp.sourceRowBytes = 4 * (random.Below(2) == 0 ? sourceStride : -sourceStride);
+        warp.destinationRowBytes = 4 * (random.Below(2) == 0 ? destinationStride : -destinationStride);
+
+        const std::vector<uint8_t> before = destination.Copy();
+        DrawQuadWarp(warp);
+        const std::vector<uint8_t> expected = destination.Copy();
+        for (int i = 0; i < PK::kTargetCount; ++i) {
+            const auto target = static_cast<PK::Target>(i);
+            AllowUpTo(target);
+            if (PK::BestTarget() != target) continue;
+            destination.Restore(before);
+            ASSERT_EQ(Call(warp), PK_Success);
+            const std::vector<uint8_t> actual = destination.Copy();
+            const auto place = std::mismatch(expected.begin(), expected.end(), actual.begin());
+            ASSERT_TRUE(place.first == expected.end())
+                << PK::TargetName(target) << ", round " << round << ", seed " << random.Seed() << ", byte "
+                << place.first - expected.begin() << ": expected " << int{*place.first} << ", is "
+                << int{*place.second} << "; quality " << warp.quality << ", blend " << warp.blend
+                << ", format " << warp.format << ", field " << warp.field << ", feather " << warp.feather;
+        }
+    }
+}
+
+/// All alphas of both with every 17th byte, as one row of pixels.
+TEST(WarpSpan, EveryBodyMixesAsTheRestatement) {
+    const FlagScope flags;
+    constexpr int32_t kWidth = 65536;
+    std::vector<uint8_t> source(4 * kWidth), before(4 * kWidth);
+    Random random(54);
+    for (const PK_PixelFormat format : {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_VUYA_4444_8u}) {
+        for (int32_t round = 0; round < 12; ++round) {
+            random.Fill(source.data(), source.size());
+            random.Fill(before.data(), before.size());
+            for (size_t i = 0; i < kWidth; ++i) {
+                if (round < 4) { // black and white, where quotients are at their ends
+                    std::fill_n(&source[4 * i], 3, static_cast<uint8_t>(round & 1 ? 255 : 0));
+                    std::fill_n(&before[4 * i], 3, static_cast<uint8_t>(round & 2 ? 255 : 0));
+                }
+                source[4 * i + 3] = static_cast<uint8_t>(i & 255);
+                before[4 * i + 3] = static_cast<uint8_t>(i >> 8);
+            }
+            QuadWarp warp;
+            warp.source = source.data();
+            warp.sourceRowBytes = warp.destinationRowBytes = 4 * kWidth;
+            warp.sourceRect = warp.destinationRect = {0, 0, kWidth, 1};
+            const double quad[8] = {0, 0, kWidth, 0, kWidth, 1, 0, 1};
+            std::copy_n(quad, 8, warp.sourceQuad);
+            std::copy_n(quad, 8, warp.destinationQuad);
+            warp.quality = 3;
+            warp.blend = true;
+            warp.format = format;
+            std::vector<uint8_t> expected = before;
+            warp.destination = expected.data();
+            DrawQuadWarp(warp);
+            for (int i = 0; i < PK::kTargetCount; ++i) {
+                const auto target = static_cast<PK::Target>(i);
+                AllowUpTo(target);
+                if (PK::BestTarget() != target) continue;
+                std::vector<uint8_t> actual = before;
+                warp.destination = actual.data();
+                ASSERT_EQ(Call(warp), PK_Success);
+                ASSERT_TRUE(actual == expected) << PK::TargetName(target) << ", round " << round;
+            }
+        }
+    }
+}
