@@ -102,6 +102,12 @@ template <int kBits>
 inline I32 ShiftRightSigned(I32 a) {
     return {_mm_srai_epi32(a.v, kBits)};
 }
+inline I32 ShiftRightSigned(I32 a, int32_t bits) {
+    return {_mm_sra_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
+inline I32 ShiftLeft(I32 a, int32_t bits) {
+    return {_mm_sll_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
 inline I32 operator*(I32 a, I32 b) {
 #ifdef __SSE4_1__
     return {_mm_mullo_epi32(a.v, b.v)};
@@ -187,6 +193,11 @@ inline I32 LoadBytes(const void* source) {
 }
 inline I32 LoadWords(const void* source) {
     return {_mm_unpacklo_epi16(_mm_loadl_epi64(static_cast<const __m128i*>(source)), _mm_setzero_si128())};
+}
+/// Signed words, as many as there are lanes but at most eight; a lane beyond them is 0.
+inline I32 LoadSignedWords(const void* source) {
+    const __m128i words = _mm_loadl_epi64(static_cast<const __m128i*>(source));
+    return {_mm_srai_epi32(_mm_unpacklo_epi16(words, words), 16)};
 }
 inline void StoreBytes(void* destination, I32 a) {
     const __m128i words = _mm_packs_epi32(a.v, a.v);
@@ -381,6 +392,12 @@ inline F64 ToDouble(F32 a) {
 inline F32 ToFloat(F64 a) {
     return {_mm_movelh_ps(_mm_cvtpd_ps(a.low), _mm_cvtpd_ps(a.high))};
 }
+inline F64 ToDouble(I32 a) {
+    return {_mm_cvtepi32_pd(a.v), _mm_cvtepi32_pd(_mm_unpackhi_epi64(a.v, a.v))};
+}
+inline I32 Truncate(F64 a) {
+    return {_mm_unpacklo_epi64(_mm_cvttpd_epi32(a.low), _mm_cvttpd_epi32(a.high))};
+}
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
@@ -412,6 +429,21 @@ inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm_unpacklo_epi32(a.v, b.v)};
     high = {_mm_unpackhi_epi32(a.v, b.v)};
+}
+
+/// The same with 16-bit halves: a0 b0 to a3 b3 and a4 b4 to a7 b7.
+inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm_unpacklo_epi16(a.v, b.v)};
+    high = {_mm_unpackhi_epi16(a.v, b.v)};
+}
+/// The same with pairs of lanes: a0 a1 b0 b1 and a2 a3 b2 b3.
+inline void InterleavePairsInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm_unpacklo_epi64(a.v, b.v)};
+    high = {_mm_unpackhi_epi64(a.v, b.v)};
+}
+/// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
+inline I32 PackSignedInBlocks(I32 a, I32 b) {
+    return {_mm_packs_epi32(a.v, b.v)};
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.
