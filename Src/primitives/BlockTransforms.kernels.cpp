@@ -1,9 +1,9 @@
 // The bodies of the block transforms.
 //
 // A transform of the columns is a butterfly on eight vectors that hold a line each, one of the lines the same
-// on vectors that hold a column each. Between the two the block lies in memory as two panels of four columns,
-// in which the four values of a line stand together: loading them like interleaved pixels transposes it. The
-// way back is shorter after rounding, with 16 bits a value.
+// on vectors that hold a column each. Vectors of eight lanes are transposed between the two; narrower and wider
+// ones lay the block down as two panels of four columns, in which the four values of a line stand together:
+// loading them like interleaved pixels transposes it. The way back is after the rounding, with 16 bits a value.
 
 #include "primitives/BlockTransforms.h"
 #include "primitives/simd/Target.h"
@@ -164,16 +164,41 @@ inline void TransformLines(const float* panels, int16_t* block) {
 }
 
 template <class ColumnButterfly, class LineButterfly>
-void Transform(const int16_t* source, int16_t* destination) {
+inline void TransformInPanels(const int16_t* source, int16_t* destination) {
     alignas(64) float panels[kPanels * kPanel];
     TransformColumns<ColumnButterfly>(source, panels);
-    if constexpr (kLanes <= kSide) {
+    if constexpr (kLanes < kSide) {
         TransformLines<LineButterfly>(panels, destination);
     } else {
         alignas(64) int16_t lines[kSide * kLanes];
         TransformLines<LineButterfly>(panels, lines);
         std::memcpy(destination, lines, kSide * kLineBytes);
     }
+}
+
+/// For eight lanes: turns vectors that hold a line each into vectors that hold a column each.
+inline void TransposeBlock(F32 (&x)[kSide]) {
+    TransposePixels(x[0], x[1], x[2], x[3]);
+    TransposePixels(x[4], x[5], x[6], x[7]);
+    for (int i = 0; i < kSide / 2; ++i) JoinHalves(x[i], x[i + 4], x[i], x[i + 4]);
+}
+
+template <class ColumnButterfly, class LineButterfly>
+inline void TransformInRegisters(const int16_t* source, int16_t* destination) {
+    F32 vectors[kSide];
+    for (int i = 0; i < kSide; ++i) vectors[i] = ToFloat(LoadSignedWords(source + kSide * i));
+    ColumnButterfly::Apply(vectors);
+    TransposeBlock(vectors);
+    LineButterfly::Apply(vectors);
+    StoreLines(vectors, destination);
+}
+
+template <class ColumnButterfly, class LineButterfly>
+void Transform(const int16_t* source, int16_t* destination) {
+    if constexpr (kLanes == kSide)
+        TransformInRegisters<ColumnButterfly, LineButterfly>(source, destination);
+    else
+        TransformInPanels<ColumnButterfly, LineButterfly>(source, destination);
 }
 
 constexpr BlockTransformKernels kKernels = {

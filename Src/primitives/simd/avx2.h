@@ -206,6 +206,12 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
     d.v = _mm256_shuffle_ps(ab23, cd23, _MM_SHUFFLE(3, 2, 3, 2));
 }
 
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void JoinHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = {_mm256_insertf128_ps(a.v, _mm256_castps256_ps128(b.v), 1)};
+    upper = {_mm256_permute2f128_ps(a.v, b.v, 0x31)};
+}
+
 /// Pixel i in the lower half and pixel i + 4 in the upper, so that the transposed lanes come out in order.
 inline F32 LoadPixelAndFourth(const float* pixel) {
     return {_mm256_insertf128_ps(_mm256_castps128_ps256(_mm_loadu_ps(pixel)), _mm_loadu_ps(pixel + 16), 1)};

@@ -244,6 +244,12 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
         for (int j = 0; j < 4; ++j) columns[i]->lane[j] = rows[j].lane[i];
 }
 
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void JoinHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = {{a.lane[0], a.lane[1], b.lane[0], b.lane[1]}};
+    upper = {{a.lane[2], a.lane[3], b.lane[2], b.lane[3]}};
+}
+
 /// Four float vectors of kLanes interleaved pixels to one vector a channel.
 inline void LoadFloatChannels(const void* source, F32& c0, F32& c1, F32& c2, F32& c3) {
     const auto* pixels = static_cast<const float*>(source);

@@ -235,6 +235,12 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
     _MM_TRANSPOSE4_PS(a.v, b.v, c.v, d.v);
 }
 
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void JoinHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = {_mm_movelh_ps(a.v, b.v)};
+    upper = {_mm_movehl_ps(b.v, a.v)};
+}
+
 /// Four float vectors of kLanes interleaved pixels to one vector a channel.
 inline void LoadFloatChannels(const void* source, F32& c0, F32& c1, F32& c2, F32& c3) {
     const auto* pixels = static_cast<const float*>(source);
