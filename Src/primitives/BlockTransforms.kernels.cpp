@@ -1,9 +1,8 @@
 // The bodies of the block transforms.
 //
 // A transform of the columns is a butterfly on eight vectors that hold a line each, one of the lines the same
-// on vectors that hold a column each. Vectors of eight lanes are transposed between the two; narrower and wider
-// ones lay the block down as two panels of four columns, in which the four values of a line stand together:
-// loading them like interleaved pixels transposes it. The way back is after the rounding, with 16 bits a value.
+// on vectors that hold a column each. Between the two the block is transposed, and again at the end, after the
+// rounding, when a value has 16 bits.
 
 #include "primitives/BlockTransforms.h"
 #include "primitives/simd/Target.h"
@@ -13,11 +12,6 @@ namespace PK_TARGET {
 namespace {
 
 constexpr int kSide = 8;
-constexpr int kLineBytes = 2 * kSide;
-constexpr int kPanel = 4 * kSide; // floats
-constexpr int kPanelBytes = 4 * kPanel;
-/// A vector wider than a line has lanes that mean nothing, which land behind the two panels.
-constexpr int kPanels = kLanes > kSide ? kLanes / 4 : 2;
 
 constexpr float kCos1 = 0x1.f6297cp-2f; // cos(1 pi / 16) / 2
 constexpr float kCos2 = 0x1.d906bcp-2f; // cos(2 pi / 16) / 2
@@ -120,67 +114,38 @@ struct InverseFields {
     }
 };
 
-/// Transforms the columns of a block of integers, leaving it in panels.
-template <class Butterfly>
-inline void TransformColumns(const int16_t* block, float* panels) {
-    for (int column = 0; column < kSide; column += kLanes) {
-        F32 lines[kSide];
-        for (int i = 0; i < kSide; ++i) lines[i] = ToFloat(LoadSignedWords(block + kSide * i + column));
-        Butterfly::Apply(lines);
-        float* panel = panels + column / 4 * kPanel;
-        for (int i = 0; i < kSide; ++i) StoreBlocks(panel + 4 * i, kPanelBytes, lines[i]);
-    }
-}
-
 /// Four columns to 16 bits, saturated, and to lines: the first two lines of each block of lanes, then the others.
-inline void PackFourColumns(const F32* columns, I32& firstTwo, I32& lastTwo) {
+inline void PackFourColumns(const F32* columns, F32& firstTwo, F32& lastTwo) {
     const I32 even = PackSignedInBlocks(Nearest(columns[0]), Nearest(columns[2]));
     const I32 odd = PackSignedInBlocks(Nearest(columns[1]), Nearest(columns[3]));
-    I32 left, right;
+    I32 left, right, low, high;
     InterleaveHalvesInBlocks(even, odd, left, right);
-    InterleaveInBlocks(left, right, firstTwo, lastTwo);
+    InterleaveInBlocks(left, right, low, high);
+    firstTwo = FromBits(low);
+    lastTwo = FromBits(high);
 }
 
-/// Rounds eight columns by the current rounding mode and stores them as lines.
+/// Rounds eight columns by the current rounding mode and stores them as lines: first those on place 0 of each
+/// block of lanes, then those on place 1 and so on.
 inline void StoreLines(const F32 (&columns)[kSide], int16_t* lines) {
-    I32 left[2], right[2], line[4];
+    constexpr int kValues = 2 * kLanes; // of a vector
+    F32 left[2], right[2];
     PackFourColumns(columns, left[0], left[1]);
     PackFourColumns(columns + 4, right[0], right[1]);
-    InterleavePairsInBlocks(left[0], right[0], line[0], line[1]);
-    InterleavePairsInBlocks(left[1], right[1], line[2], line[3]);
-    for (int i = 0; i < 4; ++i) StoreBlocks(lines + kSide * i, 4 * kLineBytes, line[i]);
+    Store(lines, LowPairs(left[0], right[0]));
+    Store(lines + kValues, HighPairs(left[0], right[0]));
+    Store(lines + 2 * kValues, LowPairs(left[1], right[1]));
+    Store(lines + 3 * kValues, HighPairs(left[1], right[1]));
 }
 
-/// Transforms the lines of a block in panels and stores it as integers.
-template <class Butterfly>
-inline void TransformLines(const float* panels, int16_t* block) {
-    for (int line = 0; line < kSide; line += kLanes) {
-        F32 columns[kSide];
-        LoadFloatChannels(panels + 4 * line, columns[0], columns[1], columns[2], columns[3]);
-        LoadFloatChannels(panels + kPanel + 4 * line, columns[4], columns[5], columns[6], columns[7]);
-        Butterfly::Apply(columns);
-        StoreLines(columns, block + kSide * line);
-    }
-}
-
-template <class ColumnButterfly, class LineButterfly>
-inline void TransformInPanels(const int16_t* source, int16_t* destination) {
-    alignas(64) float panels[kPanels * kPanel];
-    TransformColumns<ColumnButterfly>(source, panels);
-    if constexpr (kLanes < kSide) {
-        TransformLines<LineButterfly>(panels, destination);
-    } else {
-        alignas(64) int16_t lines[kSide * kLanes];
-        TransformLines<LineButterfly>(panels, lines);
-        std::memcpy(destination, lines, kSide * kLineBytes);
-    }
-}
-
-/// For eight lanes: turns vectors that hold a line each into vectors that hold a column each.
+/// For eight lanes. Turns vectors that hold a line each into vectors that hold a column each, with the lines in
+/// the order 0, 2, 4, 6, 1, 3, 5, 7, in which StoreLines stores them one after the other.
 inline void TransposeBlock(F32 (&x)[kSide]) {
-    TransposePixels(x[0], x[1], x[2], x[3]);
-    TransposePixels(x[4], x[5], x[6], x[7]);
-    for (int i = 0; i < kSide / 2; ++i) JoinHalves(x[i], x[i + 4], x[i], x[i + 4]);
+    TransposePixels(x[0], x[2], x[4], x[6]);
+    TransposePixels(x[1], x[3], x[5], x[7]);
+    F32 columns[kSide];
+    for (int i = 0; i < kSide / 2; ++i) PairHalves(x[2 * i], x[2 * i + 1], columns[i], columns[i + 4]);
+    for (int i = 0; i < kSide; ++i) x[i] = columns[i];
 }
 
 template <class ColumnButterfly, class LineButterfly>
@@ -193,24 +158,57 @@ inline void TransformInRegisters(const int16_t* source, int16_t* destination) {
     StoreLines(vectors, destination);
 }
 
+/// For four lanes, which are half a line. In between, the block lies in memory as two panels of four columns, in
+/// which the four values of a line stand together: loading them like interleaved pixels transposes it.
 template <class ColumnButterfly, class LineButterfly>
-void Transform(const int16_t* source, int16_t* destination) {
-    if constexpr (kLanes == kSide)
-        TransformInRegisters<ColumnButterfly, LineButterfly>(source, destination);
-    else
-        TransformInPanels<ColumnButterfly, LineButterfly>(source, destination);
+inline void TransformInPanels(const int16_t* source, int16_t* destination) {
+    constexpr int kPanel = kLanes * kSide;
+    alignas(64) float panels[2 * kPanel];
+    for (int half = 0; half < 2; ++half) {
+        F32 lines[kSide];
+        for (int i = 0; i < kSide; ++i)
+            lines[i] = ToFloat(LoadSignedWords(source + kSide * i + kLanes * half));
+        ColumnButterfly::Apply(lines);
+        for (int i = 0; i < kSide; ++i) Store(panels + kPanel * half + kLanes * i, lines[i]);
+    }
+    for (int line = 0; line < kSide; line += kLanes) {
+        const float* left = panels + kLanes * line;
+        const float* right = left + kPanel;
+        F32 columns[kSide];
+        LoadFloatChannels(left, columns[0], columns[1], columns[2], columns[3]);
+        LoadFloatChannels(right, columns[4], columns[5], columns[6], columns[7]);
+        LineButterfly::Apply(columns);
+        StoreLines(columns, destination + kSide * line);
+    }
 }
 
-constexpr BlockTransformKernels kKernels = {
-    Transform<ForwardEight, ForwardEight>, Transform<InverseEight, InverseEight>,
-    Transform<ForwardFields, ForwardEight>, Transform<InverseFields, InverseEight>};
+template <class ColumnButterfly, class LineButterfly>
+void Transform(const int16_t* source, int16_t* destination) {
+    if constexpr (kLanes < kSide)
+        TransformInPanels<ColumnButterfly, LineButterfly>(source, destination);
+    else
+        TransformInRegisters<ColumnButterfly, LineButterfly>(source, destination);
+}
+
+/// A block has no use for sixteen lanes: those bodies are the ones of eight.
+template <int kVectorLanes>
+const BlockTransformKernels& Bodies() {
+    if constexpr (kVectorLanes > kSide) {
+        return BlockTransformKernels::For<Target::avx2>();
+    } else {
+        static constexpr BlockTransformKernels kernels = {
+            Transform<ForwardEight, ForwardEight>, Transform<InverseEight, InverseEight>,
+            Transform<ForwardFields, ForwardEight>, Transform<InverseFields, InverseEight>};
+        return kernels;
+    }
+}
 
 } // namespace
 } // namespace PK_TARGET
 
 template <>
 const BlockTransformKernels& BlockTransformKernels::For<Target::PK_TARGET>() {
-    return PK_TARGET::kKernels;
+    return PK_TARGET::Bodies<PK_TARGET::kLanes>();
 }
 
 } // namespace PK

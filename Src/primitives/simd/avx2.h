@@ -166,7 +166,6 @@ inline I32 LoadBytes(const void* source) {
 inline I32 LoadWords(const void* source) {
     return {_mm256_cvtepu16_epi32(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
 }
-/// Signed words, as many as there are lanes but at most eight; a lane beyond them is 0.
 inline I32 LoadSignedWords(const void* source) {
     return {_mm256_cvtepi16_epi32(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
 }
@@ -207,7 +206,7 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
 }
 
 /// The lower halves of both vectors, those of a first, and the upper halves.
-inline void JoinHalves(F32 a, F32 b, F32& lower, F32& upper) {
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
     lower = {_mm256_insertf128_ps(a.v, _mm256_castps256_ps128(b.v), 1)};
     upper = {_mm256_permute2f128_ps(a.v, b.v, 0x31)};
 }
@@ -418,11 +417,6 @@ inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
 inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm256_unpacklo_epi16(a.v, b.v)};
     high = {_mm256_unpackhi_epi16(a.v, b.v)};
-}
-/// The same with pairs of lanes: a0 a1 b0 b1 and a2 a3 b2 b3.
-inline void InterleavePairsInBlocks(I32 a, I32 b, I32& low, I32& high) {
-    low = {_mm256_unpacklo_epi64(a.v, b.v)};
-    high = {_mm256_unpackhi_epi64(a.v, b.v)};
 }
 /// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
 inline I32 PackSignedInBlocks(I32 a, I32 b) {

@@ -211,7 +211,6 @@ inline void StoreBytes(void* destination, I32 a) {
     for (int i = 0; i < kLanes; ++i) bytes[i] = static_cast<uint8_t>(Saturate(a.lane[i], 255));
     std::memcpy(destination, bytes, sizeof bytes);
 }
-/// Signed words, as many as there are lanes but at most eight; a lane beyond them is 0.
 inline I32 LoadSignedWords(const void* source) {
     return ShiftRightSigned<16>(ShiftLeft<16>(LoadWords(source)));
 }
@@ -245,7 +244,7 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
 }
 
 /// The lower halves of both vectors, those of a first, and the upper halves.
-inline void JoinHalves(F32 a, F32 b, F32& lower, F32& upper) {
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
     lower = {{a.lane[0], a.lane[1], b.lane[0], b.lane[1]}};
     upper = {{a.lane[2], a.lane[3], b.lane[2], b.lane[3]}};
 }
@@ -471,11 +470,6 @@ inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
         result.lane[lane] = (a.lane[i] & 0xffff) | b.lane[i] << 16;
         result.lane[lane + 1] = a.lane[i] >> 16 | (b.lane[i] & 0xffff0000);
     }
-}
-/// The same with pairs of lanes: a0 a1 b0 b1 and a2 a3 b2 b3.
-inline void InterleavePairsInBlocks(I32 a, I32 b, I32& low, I32& high) {
-    low = {{a.lane[0], a.lane[1], b.lane[0], b.lane[1]}};
-    high = {{a.lane[2], a.lane[3], b.lane[2], b.lane[3]}};
 }
 /// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
 inline I32 PackSignedInBlocks(I32 a, I32 b) {

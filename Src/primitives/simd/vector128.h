@@ -194,7 +194,6 @@ inline I32 LoadBytes(const void* source) {
 inline I32 LoadWords(const void* source) {
     return {_mm_unpacklo_epi16(_mm_loadl_epi64(static_cast<const __m128i*>(source)), _mm_setzero_si128())};
 }
-/// Signed words, as many as there are lanes but at most eight; a lane beyond them is 0.
 inline I32 LoadSignedWords(const void* source) {
     const __m128i words = _mm_loadl_epi64(static_cast<const __m128i*>(source));
     return {_mm_srai_epi32(_mm_unpacklo_epi16(words, words), 16)};
@@ -236,7 +235,7 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
 }
 
 /// The lower halves of both vectors, those of a first, and the upper halves.
-inline void JoinHalves(F32 a, F32 b, F32& lower, F32& upper) {
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
     lower = {_mm_movelh_ps(a.v, b.v)};
     upper = {_mm_movehl_ps(b.v, a.v)};
 }
@@ -441,11 +440,6 @@ inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
 inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm_unpacklo_epi16(a.v, b.v)};
     high = {_mm_unpackhi_epi16(a.v, b.v)};
-}
-/// The same with pairs of lanes: a0 a1 b0 b1 and a2 a3 b2 b3.
-inline void InterleavePairsInBlocks(I32 a, I32 b, I32& low, I32& high) {
-    low = {_mm_unpacklo_epi64(a.v, b.v)};
-    high = {_mm_unpackhi_epi64(a.v, b.v)};
 }
 /// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
 inline I32 PackSignedInBlocks(I32 a, I32 b) {
