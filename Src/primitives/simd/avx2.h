@@ -97,6 +97,12 @@ template <int kBits>
 inline I32 ShiftRightSigned(I32 a) {
     return {_mm256_srai_epi32(a.v, kBits)};
 }
+inline I32 ShiftRightSigned(I32 a, int32_t bits) {
+    return {_mm256_sra_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
+inline I32 ShiftLeft(I32 a, int32_t bits) {
+    return {_mm256_sll_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
 inline I32 operator*(I32 a, I32 b) {
     return {_mm256_mullo_epi32(a.v, b.v)};
 }
@@ -160,6 +166,9 @@ inline I32 LoadBytes(const void* source) {
 inline I32 LoadWords(const void* source) {
     return {_mm256_cvtepu16_epi32(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
 }
+inline I32 LoadSignedWords(const void* source) {
+    return {_mm256_cvtepi16_epi32(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
+}
 inline void StoreBytes(void* destination, I32 a) {
     const __m128i words = _mm_packs_epi32(_mm256_castsi256_si128(a.v), _mm256_extracti128_si256(a.v, 1));
     _mm_storel_epi64(static_cast<__m128i*>(destination), _mm_packus_epi16(words, words));
@@ -194,6 +203,12 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
     b.v = _mm256_shuffle_ps(ab01, cd01, _MM_SHUFFLE(3, 2, 3, 2));
     c.v = _mm256_shuffle_ps(ab23, cd23, _MM_SHUFFLE(1, 0, 1, 0));
     d.v = _mm256_shuffle_ps(ab23, cd23, _MM_SHUFFLE(3, 2, 3, 2));
+}
+
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = {_mm256_insertf128_ps(a.v, _mm256_castps256_ps128(b.v), 1)};
+    upper = {_mm256_permute2f128_ps(a.v, b.v, 0x31)};
 }
 
 /// Pixel i in the lower half and pixel i + 4 in the upper, so that the transposed lanes come out in order.
@@ -352,6 +367,13 @@ inline F64 ToDouble(F32 a) {
 inline F32 ToFloat(F64 a) {
     return {_mm256_set_m128(_mm256_cvtpd_ps(a.high), _mm256_cvtpd_ps(a.low))};
 }
+inline F64 ToDouble(I32 a) {
+    return {_mm256_cvtepi32_pd(_mm256_castsi256_si128(a.v)),
+            _mm256_cvtepi32_pd(_mm256_extracti128_si256(a.v, 1))};
+}
+inline I32 Truncate(F64 a) {
+    return {_mm256_set_m128i(_mm256_cvttpd_epi32(a.high), _mm256_cvttpd_epi32(a.low))};
+}
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
@@ -389,6 +411,16 @@ inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm256_unpacklo_epi32(a.v, b.v)};
     high = {_mm256_unpackhi_epi32(a.v, b.v)};
+}
+
+/// The same with 16-bit halves: a0 b0 to a3 b3 and a4 b4 to a7 b7.
+inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm256_unpacklo_epi16(a.v, b.v)};
+    high = {_mm256_unpackhi_epi16(a.v, b.v)};
+}
+/// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
+inline I32 PackSignedInBlocks(I32 a, I32 b) {
+    return {_mm256_packs_epi32(a.v, b.v)};
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.

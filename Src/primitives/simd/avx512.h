@@ -82,6 +82,12 @@ inline F32 JoinHalves(__m256 lower, __m256 upper) {
     return {_mm512_insertf32x8(_mm512_castps256_ps512(lower), upper, 1)};
 }
 
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = JoinHalves(LowerHalf(a), LowerHalf(b));
+    upper = JoinHalves(UpperHalf(a), UpperHalf(b));
+}
+
 /// In halves: the estimate of 512 bits is another, more precise one.
 inline F32 ReciprocalEstimate(F32 a) {
     return JoinHalves(_mm256_rcp_ps(LowerHalf(a)), _mm256_rcp_ps(UpperHalf(a)));
@@ -116,6 +122,12 @@ inline I32 ShiftRight(I32 a) {
 template <int kBits>
 inline I32 ShiftRightSigned(I32 a) {
     return {_mm512_srai_epi32(a.v, kBits)};
+}
+inline I32 ShiftRightSigned(I32 a, int32_t bits) {
+    return {_mm512_sra_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
+inline I32 ShiftLeft(I32 a, int32_t bits) {
+    return {_mm512_sll_epi32(a.v, _mm_cvtsi32_si128(bits))};
 }
 inline I32 operator*(I32 a, I32 b) {
     return {_mm512_mullo_epi32(a.v, b.v)};
@@ -179,6 +191,9 @@ inline I32 LoadBytes(const void* source) {
 }
 inline I32 LoadWords(const void* source) {
     return {_mm512_cvtepu16_epi32(_mm256_loadu_si256(static_cast<const __m256i*>(source)))};
+}
+inline I32 LoadSignedWords(const void* source) {
+    return {_mm512_cvtepi16_epi32(_mm256_loadu_si256(static_cast<const __m256i*>(source)))};
 }
 inline void StoreBytes(void* destination, I32 a) {
     _mm_storeu_si128(static_cast<__m128i*>(destination), _mm512_cvtusepi32_epi8(Max(a, Ints(0)).v));
@@ -391,6 +406,14 @@ inline F64 ToDouble(F32 a) {
 inline F32 ToFloat(F64 a) {
     return JoinHalves(_mm512_cvtpd_ps(a.low), _mm512_cvtpd_ps(a.high));
 }
+inline F64 ToDouble(I32 a) {
+    return {_mm512_cvtepi32_pd(_mm512_castsi512_si256(a.v)),
+            _mm512_cvtepi32_pd(_mm512_extracti32x8_epi32(a.v, 1))};
+}
+inline I32 Truncate(F64 a) {
+    return {_mm512_inserti32x8(_mm512_castsi256_si512(_mm512_cvttpd_epi32(a.low)),
+                               _mm512_cvttpd_epi32(a.high), 1)};
+}
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
@@ -438,6 +461,16 @@ inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm512_unpacklo_epi32(a.v, b.v)};
     high = {_mm512_unpackhi_epi32(a.v, b.v)};
+}
+
+/// The same with 16-bit halves: a0 b0 to a3 b3 and a4 b4 to a7 b7.
+inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm512_unpacklo_epi16(a.v, b.v)};
+    high = {_mm512_unpackhi_epi16(a.v, b.v)};
+}
+/// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
+inline I32 PackSignedInBlocks(I32 a, I32 b) {
+    return {_mm512_packs_epi32(a.v, b.v)};
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.

@@ -123,6 +123,12 @@ template <int kBits>
 inline I32 ShiftRightSigned(I32 a) {
     return Map<I32>(a, [](uint32_t x) { return static_cast<uint32_t>(static_cast<int32_t>(x) >> kBits); });
 }
+inline I32 ShiftRightSigned(I32 a, int32_t bits) {
+    return Map<I32>(a, [bits](uint32_t x) { return static_cast<uint32_t>(static_cast<int32_t>(x) >> bits); });
+}
+inline I32 ShiftLeft(I32 a, int32_t bits) {
+    return Map<I32>(a, [bits](uint32_t x) { return x << bits; });
+}
 inline I32 Min(I32 a, I32 b) {
     return Map<I32>(a, b, [](uint32_t x, uint32_t y) {
         return static_cast<int32_t>(x) < static_cast<int32_t>(y) ? x : y;
@@ -205,6 +211,9 @@ inline void StoreBytes(void* destination, I32 a) {
     for (int i = 0; i < kLanes; ++i) bytes[i] = static_cast<uint8_t>(Saturate(a.lane[i], 255));
     std::memcpy(destination, bytes, sizeof bytes);
 }
+inline I32 LoadSignedWords(const void* source) {
+    return ShiftRightSigned<16>(ShiftLeft<16>(LoadWords(source)));
+}
 /// The low 16 bits of each lane, unsaturated.
 inline void StoreWords(void* destination, I32 a) {
     uint16_t words[kLanes];
@@ -232,6 +241,12 @@ inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
     F32* const columns[4] = {&a, &b, &c, &d};
     for (int i = 0; i < 4; ++i)
         for (int j = 0; j < 4; ++j) columns[i]->lane[j] = rows[j].lane[i];
+}
+
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = {{a.lane[0], a.lane[1], b.lane[0], b.lane[1]}};
+    upper = {{a.lane[2], a.lane[3], b.lane[2], b.lane[3]}};
 }
 
 /// Four float vectors of kLanes interleaved pixels to one vector a channel.
@@ -408,6 +423,12 @@ inline F64 ToDouble(F32 a) {
 inline F32 ToFloat(F64 a) {
     return Map<F32>(a, [](double x) { return static_cast<float>(x); });
 }
+inline F64 ToDouble(I32 a) {
+    return Map<F64>(a, [](uint32_t x) { return static_cast<double>(static_cast<int32_t>(x)); });
+}
+inline I32 Truncate(F64 a) {
+    return Map<I32>(a, [](double x) { return static_cast<uint32_t>(_mm_cvttsd_si32(_mm_set_sd(x))); });
+}
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
@@ -439,6 +460,24 @@ inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {{a.lane[0], b.lane[0], a.lane[1], b.lane[1]}};
     high = {{a.lane[2], b.lane[2], a.lane[3], b.lane[3]}};
+}
+
+/// The same with 16-bit halves: a0 b0 to a3 b3 and a4 b4 to a7 b7.
+inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    for (int i = 0; i < kLanes; ++i) {
+        I32& result = i < kLanes / 2 ? low : high;
+        const int lane = 2 * i % kLanes;
+        result.lane[lane] = (a.lane[i] & 0xffff) | b.lane[i] << 16;
+        result.lane[lane + 1] = a.lane[i] >> 16 | (b.lane[i] & 0xffff0000);
+    }
+}
+/// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
+inline I32 PackSignedInBlocks(I32 a, I32 b) {
+    const I32 low = Ints(-32768), high = Ints(32767);
+    I32 result;
+    StoreWords(result.lane, Min(Max(a, low), high));
+    StoreWords(result.lane + kLanes / 2, Min(Max(b, low), high));
+    return result;
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.

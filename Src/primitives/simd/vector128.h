@@ -102,6 +102,12 @@ template <int kBits>
 inline I32 ShiftRightSigned(I32 a) {
     return {_mm_srai_epi32(a.v, kBits)};
 }
+inline I32 ShiftRightSigned(I32 a, int32_t bits) {
+    return {_mm_sra_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
+inline I32 ShiftLeft(I32 a, int32_t bits) {
+    return {_mm_sll_epi32(a.v, _mm_cvtsi32_si128(bits))};
+}
 inline I32 operator*(I32 a, I32 b) {
 #ifdef __SSE4_1__
     return {_mm_mullo_epi32(a.v, b.v)};
@@ -188,6 +194,10 @@ inline I32 LoadBytes(const void* source) {
 inline I32 LoadWords(const void* source) {
     return {_mm_unpacklo_epi16(_mm_loadl_epi64(static_cast<const __m128i*>(source)), _mm_setzero_si128())};
 }
+inline I32 LoadSignedWords(const void* source) {
+    const __m128i words = _mm_loadl_epi64(static_cast<const __m128i*>(source));
+    return {_mm_srai_epi32(_mm_unpacklo_epi16(words, words), 16)};
+}
 inline void StoreBytes(void* destination, I32 a) {
     const __m128i words = _mm_packs_epi32(a.v, a.v);
     const int32_t bytes = _mm_cvtsi128_si32(_mm_packus_epi16(words, words));
@@ -222,6 +232,12 @@ inline I32 ReverseBytes(I32 a) {
 /// Turns four interleaved pixels, one a vector, into four channels of four pixels, and back.
 inline void TransposePixels(F32& a, F32& b, F32& c, F32& d) {
     _MM_TRANSPOSE4_PS(a.v, b.v, c.v, d.v);
+}
+
+/// The lower halves of both vectors, those of a first, and the upper halves.
+inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
+    lower = {_mm_movelh_ps(a.v, b.v)};
+    upper = {_mm_movehl_ps(b.v, a.v)};
 }
 
 /// Four float vectors of kLanes interleaved pixels to one vector a channel.
@@ -381,6 +397,12 @@ inline F64 ToDouble(F32 a) {
 inline F32 ToFloat(F64 a) {
     return {_mm_movelh_ps(_mm_cvtpd_ps(a.low), _mm_cvtpd_ps(a.high))};
 }
+inline F64 ToDouble(I32 a) {
+    return {_mm_cvtepi32_pd(a.v), _mm_cvtepi32_pd(_mm_unpackhi_epi64(a.v, a.v))};
+}
+inline I32 Truncate(F64 a) {
+    return {_mm_unpacklo_epi64(_mm_cvttpd_epi32(a.low), _mm_cvttpd_epi32(a.high))};
+}
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
@@ -412,6 +434,16 @@ inline void StoreBlocksInTurns(void* destination, F32 a, F32 b, F32 c) {
 inline void InterleaveInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm_unpacklo_epi32(a.v, b.v)};
     high = {_mm_unpackhi_epi32(a.v, b.v)};
+}
+
+/// The same with 16-bit halves: a0 b0 to a3 b3 and a4 b4 to a7 b7.
+inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm_unpacklo_epi16(a.v, b.v)};
+    high = {_mm_unpackhi_epi16(a.v, b.v)};
+}
+/// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
+inline I32 PackSignedInBlocks(I32 a, I32 b) {
+    return {_mm_packs_epi32(a.v, b.v)};
 }
 
 /// Three lanes a block, which stand in memory without a gap; loading leaves the fourth 0.

@@ -1,0 +1,12 @@
+#pragma once
+
+// What a primitive returns: 0 for success, a negative number for a failed check.
+
+#include <cstdint>
+
+namespace PK {
+
+inline constexpr int32_t kStatusOk = 0;
+inline constexpr int32_t kStatusNullPointer = -8;
+
+} // namespace PK
