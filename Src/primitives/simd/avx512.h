@@ -532,4 +532,27 @@ inline I32 ReverseLanes(I32 a) {
     return {_mm512_permutexvar_epi32(order, a.v)};
 }
 
+inline bool AnyNegative(I32 a) {
+    return _mm512_movepi32_mask(a.v) != 0;
+}
+
+/// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
+/// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
+inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {
+    const auto twoPairs = [pixels](int64_t one, int64_t other) {
+        const auto pair = [pixels](int64_t at) {
+            return _mm_loadl_epi64(reinterpret_cast<const __m128i*>(pixels + 4 * at));
+        };
+        return _mm512_cvtepu8_epi32(_mm_unpacklo_epi64(pair(one), pair(other)));
+    };
+    const __m512i lower = twoPairs(index[0], index[4]), upper = twoPairs(index[8], index[12]);
+    first.v = _mm512_shuffle_i32x4(lower, upper, _MM_SHUFFLE(2, 0, 2, 0));
+    second.v = _mm512_shuffle_i32x4(lower, upper, _MM_SHUFFLE(3, 1, 3, 1));
+}
+
+/// In each block, the lanes of four vectors to bytes, saturated: those of a first.
+inline I32 PackLanesInBlocks(I32 a, I32 b, I32 c, I32 d) {
+    return {_mm512_packus_epi16(_mm512_packs_epi32(a.v, b.v), _mm512_packs_epi32(c.v, d.v))};
+}
+
 } // namespace PK::avx512
