@@ -25,9 +25,6 @@ struct Image {
 using SourceImage = Image<const uint8_t>;
 using DestinationImage = Image<uint8_t>;
 
-/// The widest row whose bytes, at 16 a pixel, can be told in 32 bits.
-inline constexpr int32_t kMaximumWidth = INT32_MAX / 16;
-
 /// The image walked from its last row in memory to its first. The height is at least 1.
 template <class Byte>
 Image<Byte> Reversed(const Image<Byte>& image) {

@@ -85,6 +85,9 @@ constexpr bool HasNoAlphaMeaning(PK_PixelFormat format) {
     return (format & kAlphaMask) == kAlphaNone || (format & kAlphaMask) == kAlphaMeaningless;
 }
 
+/// The widest row whose bytes, at 16 a pixel, can be told in 32 bits.
+inline constexpr int32_t kMaximumWidth = INT32_MAX / 16;
+
 /// Bytes of a pixel of an interleaved format, 0 for an unknown depth and for 10-bit YUV.
 int32_t BytesPerPixel(PK_PixelFormat format) noexcept;
 
