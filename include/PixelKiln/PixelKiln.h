@@ -7,6 +7,7 @@
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/CodecBridges.h>
 #include <PixelKiln/Convert.h>
+#include <PixelKiln/Fills.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Overlay.h>
 #include <PixelKiln/PixelFormat.h>
@@ -15,3 +16,4 @@
 #include <PixelKiln/Rotate.h>
 #include <PixelKiln/QuadWarp.h>
 #include <PixelKiln/Types.h>
+#include <PixelKiln/Utilities.h>

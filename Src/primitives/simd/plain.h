@@ -310,6 +310,26 @@ inline I32 AverageHalves(I32 a, I32 b) {
 inline I32 MinHalves(I32 a, I32 b) {
     return MapHalves(a, b, [](uint32_t x, uint32_t y) { return x < y ? x : y; });
 }
+/// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
+inline I32 LookUpBytes(I32 table, I32 places) {
+    uint8_t from[16], bytes[16];
+    Store(from, table);
+    Store(bytes, places);
+    for (uint8_t& byte : bytes) byte = from[byte];
+    return LoadInts(bytes);
+}
+/// Twice the products of unsigned bytes of `a` with signed bytes of `b`, in 16-bit halves in their order. They
+/// must fit.
+inline void DoubleByteProducts(I32 a, I32 b, I32& first, I32& second) {
+    uint8_t unsignedBytes[16];
+    int8_t signedBytes[16];
+    int16_t products[16];
+    Store(unsignedBytes, a);
+    Store(signedBytes, b);
+    for (int i = 0; i < 16; ++i) products[i] = static_cast<int16_t>(2 * unsignedBytes[i] * signedBytes[i]);
+    first = LoadInts(products);
+    second = LoadInts(products + 8);
+}
 /// Swaps the two bytes of each 16-bit half.
 inline I32 SwapBytes(I32 a) {
     return (ShiftLeft<8>(a) & Ints(static_cast<int32_t>(0xff00ff00))) | (ShiftRight<8>(a) & Ints(0x00ff00ff));
@@ -353,6 +373,15 @@ inline I32 PackLanesToHalves(I32 a, I32 b) {
     StoreWords(result.lane, a);
     StoreWords(result.lane + kLanes / 2, b);
     return result;
+}
+/// The lanes of two vectors to signed 16-bit halves in their order, saturated.
+inline I32 PackSignedLanes(I32 a, I32 b) {
+    int16_t halves[2 * kLanes];
+    for (int i = 0; i < 2 * kLanes; ++i) {
+        const auto lane = static_cast<int32_t>(i < kLanes ? a.lane[i] : b.lane[i - kLanes]);
+        halves[i] = static_cast<int16_t>(lane < INT16_MIN ? INT16_MIN : lane > INT16_MAX ? INT16_MAX : lane);
+    }
+    return LoadInts(halves);
 }
 /// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
 inline void StoreLanePairs(void* destination, I32 even, I32 odd) {

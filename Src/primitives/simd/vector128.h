@@ -296,6 +296,32 @@ inline I32 AverageHalves(I32 a, I32 b) {
 inline I32 MinHalves(I32 a, I32 b) {
     return {_mm_min_epi16(a.v, b.v)};
 }
+/// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
+inline I32 LookUpBytes(I32 table, I32 places) {
+#ifdef __SSSE3__
+    return {_mm_shuffle_epi8(table.v, places.v)};
+#else
+    uint8_t from[16], bytes[16];
+    Store(from, table);
+    Store(bytes, places);
+    for (uint8_t& byte : bytes) byte = from[byte];
+    return LoadInts(bytes);
+#endif
+}
+/// Twice the products of unsigned bytes of `a` with signed bytes of `b`, in 16-bit halves in their order. They
+/// must fit.
+inline void DoubleByteProducts(I32 a, I32 b, I32& first, I32& second) {
+#ifdef __SSSE3__
+    first = {_mm_maddubs_epi16(_mm_unpacklo_epi8(a.v, a.v), _mm_unpacklo_epi8(b.v, b.v))};
+    second = {_mm_maddubs_epi16(_mm_unpackhi_epi8(a.v, a.v), _mm_unpackhi_epi8(b.v, b.v))};
+#else
+    const __m128i zero = _mm_setzero_si128(), sign = _mm_cmpgt_epi8(zero, b.v);
+    const __m128i low = _mm_mullo_epi16(_mm_unpacklo_epi8(a.v, zero), _mm_unpacklo_epi8(b.v, sign));
+    const __m128i high = _mm_mullo_epi16(_mm_unpackhi_epi8(a.v, zero), _mm_unpackhi_epi8(b.v, sign));
+    first = {_mm_adds_epi16(low, low)};
+    second = {_mm_adds_epi16(high, high)};
+#endif
+}
 /// Swaps the two bytes of each 16-bit half.
 inline I32 SwapBytes(I32 a) {
 #ifdef __SSSE3__
@@ -330,6 +356,10 @@ inline I32 PackLanesToHalves(I32 a, I32 b) {
     return {_mm_packs_epi32(_mm_srai_epi32(_mm_slli_epi32(a.v, 16), 16),
                             _mm_srai_epi32(_mm_slli_epi32(b.v, 16), 16))};
 #endif
+}
+/// The lanes of two vectors to signed 16-bit halves in their order, saturated.
+inline I32 PackSignedLanes(I32 a, I32 b) {
+    return {_mm_packs_epi32(a.v, b.v)};
 }
 /// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
 inline void StoreLanePairs(void* destination, I32 even, I32 odd) {

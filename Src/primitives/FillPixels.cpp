@@ -1,0 +1,104 @@
+#include "primitives/FillPixels.h"
+
+#include "primitives/Status.h"
+
+#include <algorithm>
+#include <cstring>
+
+namespace PK {
+
+namespace {
+
+// From this length on the processor's string instructions are faster than stores of vectors: they take
+// possession of whole cache lines without reading them first.
+constexpr size_t kStringFrom = size_t{1} << 20;
+constexpr size_t kCacheLine = 64;
+
+FillPattern Repeat(const void* pixel, size_t pixelBytes) {
+    FillPattern pattern;
+    for (size_t at = 0; at < sizeof pattern.bytes; at += pixelBytes)
+        std::memcpy(pattern.bytes + at, pixel, pixelBytes);
+    return pattern;
+}
+
+/// The pattern as it stands `at` bytes further on.
+FillPattern Rotated(const FillPattern& pattern, size_t at) {
+    return Repeat(pattern.bytes + at % FillPattern::kPeriod, FillPattern::kPeriod);
+}
+
+/// Fills eight bytes at a time.
+void StoreString(uint8_t* destination, size_t bytes, const FillPattern& pattern) {
+    uint64_t word;
+    std::memcpy(&word, pattern.bytes, sizeof word);
+    size_t words = bytes / sizeof word;
+    asm volatile("rep stosq" : "+D"(destination), "+c"(words) : "a"(word) : "memory");
+}
+
+/// Copies from a block of the pattern, which stays in the cache. Each part has the place in its page that its
+/// destination has: a tenth faster than any other.
+void MoveString(const FillKernels& kernels, uint8_t* destination, size_t bytes, const FillPattern& pattern) {
+    constexpr size_t kPage = 4096, kBlock = size_t{1} << 18;
+    alignas(kPage) uint8_t block[kBlock];
+    kernels.run(block, kBlock, pattern);
+    while (bytes > 0) {
+        const size_t place = reinterpret_cast<uintptr_t>(destination) & (kPage - 1);
+        const size_t part = std::min(bytes, kBlock - place);
+        const uint8_t* from = block + place;
+        size_t words = part / sizeof(uint64_t);
+        asm volatile("rep movsq" : "+D"(destination), "+S"(from), "+c"(words) : : "memory");
+        bytes -= part;
+    }
+}
+
+/// A run that is long enough for whole cache lines.
+void FillLongRun(const FillKernels& kernels, uint8_t* destination, size_t bytes, const FillPattern& pattern) {
+    const size_t head = -reinterpret_cast<uintptr_t>(destination) & (kCacheLine - 1);
+    const size_t lines = (bytes - head) & ~(kCacheLine - 1);
+    const FillPattern aligned = Rotated(pattern, head);
+    kernels.run(destination, head, pattern);
+    const bool isEveryHalfTheSame = std::memcmp(aligned.bytes, aligned.bytes + 8, 8) == 0;
+    if (isEveryHalfTheSame)
+        StoreString(destination + head, lines, aligned);
+    else
+        MoveString(kernels, destination + head, lines, aligned);
+    kernels.run(destination + head + lines, bytes - head - lines, aligned);
+}
+
+int32_t FillPixels(const FillKernels& kernels, const void* value, size_t pixelBytes, uint8_t* destination,
+                   ptrdiff_t step, int32_t width, int32_t height) {
+    if (value == nullptr || destination == nullptr) return kStatusNullPointer;
+    if (width < 0 || height < 0) return kStatusBadSize;
+    size_t bytes = static_cast<size_t>(width) * pixelBytes;
+    ptrdiff_t rows = height;
+    if (step == static_cast<ptrdiff_t>(bytes)) { // no gap between the rows
+        bytes *= static_cast<size_t>(height);
+        rows = std::min<ptrdiff_t>(rows, 1);
+    }
+    const FillPattern pattern = Repeat(value, pixelBytes);
+    for (ptrdiff_t row = 0; row < rows; ++row) {
+        if (bytes < kStringFrom)
+            kernels.run(destination + row * step, bytes, pattern);
+        else
+            FillLongRun(kernels, destination + row * step, bytes, pattern);
+    }
+    return kStatusSuccess;
+}
+
+} // namespace
+
+int32_t FillPixels4x8u(const FillKernels& kernels, const uint8_t value[4], uint8_t* destination,
+                       ptrdiff_t step, int32_t width, int32_t height) noexcept {
+    return FillPixels(kernels, value, 4, destination, step, width, height);
+}
+
+int32_t FillPixels4x16u(const FillKernels& kernels, const uint16_t value[4], uint8_t* destination,
+                        ptrdiff_t step, int32_t width, int32_t height) noexcept {
+    return FillPixels(kernels, value, 8, destination, step, width, height);
+}
+
+int32_t FillPixels4x32f(const FillKernels& kernels, const float value[4], uint8_t* destination,
+                        ptrdiff_t step, int32_t width, int32_t height) noexcept {
+    return FillPixels(kernels, value, 16, destination, step, width, height);
+}
+
+} // namespace PK

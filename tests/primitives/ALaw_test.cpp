@@ -1,0 +1,87 @@
+// A-law decoding, beside the law itself: a code with every other bit inverted is sign, segment and step.
+
+#include "primitives/ALaw.h"
+
+#include "support/EnabledTargets.h"
+#include "support/RowBuffer.h"
+
+#include <cstring>
+#include <gtest/gtest.h>
+#include <vector>
+
+using namespace PKTest;
+
+namespace PK {
+namespace {
+
+int16_t Expected(uint8_t code) {
+    const int32_t bits = code ^ 0x55, segment = bits >> 4 & 7, step = bits & 15;
+    // the middle of the step, in units of half a step of segment 0 and 1
+    const int32_t middle = segment == 0 ? 2 * step + 1 : (2 * step + 33) << (segment - 1);
+    return static_cast<int16_t>((bits & 0x80) != 0 ? 8 * middle : -8 * middle);
+}
+
+std::vector<int16_t> Decode(Target target, const std::vector<uint8_t>& codes) {
+    std::vector<int16_t> samples(codes.size());
+    EXPECT_EQ(ALawToLinear16(KernelsFor<ALawKernels>(target), codes.data(), samples.data(),
+                             static_cast<int32_t>(codes.size())),
+              0);
+    return samples;
+}
+
+TEST(ALaw, DecodesKnownCodes) {
+    // least, end of segment 0, begin of 1, begin of 2, greatest; positive and negative
+    const std::vector<uint8_t> codes = {0xd5, 0x55, 0xda, 0xc5, 0xf5, 0xaa, 0x2a, 0x80, 0x00};
+    const std::vector<int16_t> samples = {8, -8, 248, 264, 528, 32256, -32256, 5504, -5504};
+    for (const Target target : EnabledTargets())
+        EXPECT_EQ(Decode(target, codes), samples) << TargetName(target);
+}
+
+TEST(ALaw, DecodesEveryCodeAtEveryPlace) {
+    for (const Target target : EnabledTargets()) {
+        for (int32_t shift = 0; shift < 256; ++shift) {
+            std::vector<uint8_t> codes(256);
+            std::vector<int16_t> expected(256);
+            for (size_t i = 0; i < 256; ++i) {
+                codes[i] = static_cast<uint8_t>(static_cast<int32_t>(i) + shift);
+                expected[i] = Expected(codes[i]);
+            }
+            ASSERT_EQ(Decode(target, codes), expected) << TargetName(target) << ", shift " << shift;
+        }
+    }
+}
+
+TEST(ALaw, TouchesExactlyItsElements) {
+    for (const Target target : EnabledTargets()) {
+        for (size_t count = 0; count <= 140; ++count) {
+            for (const Placement place :
+                 {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
+                  Placement{Placement::kAtOffset, 1}}) {
+                const RowBuffer source(count, place), result(2 * count, place);
+                for (size_t i = 0; i < count; ++i) source.Data()[i] = static_cast<uint8_t>(i * 37);
+                ALawToLinear16(KernelsFor<ALawKernels>(target), source.Data(),
+                               reinterpret_cast<int16_t*>(result.Data()), static_cast<int32_t>(count));
+                for (size_t i = 0; i < count; ++i) {
+                    int16_t sample;
+                    std::memcpy(&sample, result.Data() + 2 * i, sizeof sample);
+                    ASSERT_EQ(sample, Expected(static_cast<uint8_t>(i * 37)))
+                        << TargetName(target) << " " << i;
+                }
+                ASSERT_TRUE(result.MarginsIntact());
+            }
+        }
+    }
+}
+
+TEST(ALaw, RefusesNullPointersAndNegativeCounts) {
+    const uint8_t code = 0;
+    int16_t sample = 5;
+    const ALawKernels& kernels = KernelsFor<ALawKernels>(Target::plain);
+    EXPECT_EQ(ALawToLinear16(kernels, nullptr, &sample, 1), -8);
+    EXPECT_EQ(ALawToLinear16(kernels, &code, nullptr, 1), -8);
+    EXPECT_EQ(ALawToLinear16(kernels, &code, &sample, -1), -6);
+    EXPECT_EQ(sample, 5);
+}
+
+} // namespace
+} // namespace PK

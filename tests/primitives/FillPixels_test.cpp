@@ -1,0 +1,128 @@
+// Constant fills repeat the pixel over exactly the rectangle, at any address, size and step, whichever way a
+// run is written.
+
+#include "primitives/FillPixels.h"
+
+#include "support/EnabledTargets.h"
+#include "support/GuardedRows.h"
+#include "support/Random.h"
+
+#include <algorithm>
+#include <cstring>
+#include <gtest/gtest.h>
+#include <vector>
+
+using namespace PKTest;
+
+namespace PK {
+namespace {
+
+constexpr uint8_t kUntouched = 0xa5;
+
+struct Rectangle {
+    int32_t width, height;
+    ptrdiff_t padding; // bytes between the pixels of one row and the next
+    bool upwards;
+};
+
+int32_t Fill(Target target, const std::vector<uint8_t>& pixel, uint8_t* destination, ptrdiff_t step,
+             const Rectangle& size) {
+    const FillKernels& kernels = KernelsFor<FillKernels>(target);
+    uint16_t words[4];
+    float floats[4];
+    switch (pixel.size()) {
+    case 4:
+        return FillPixels4x8u(kernels, pixel.data(), destination, step, size.width, size.height);
+    case 8:
+        std::memcpy(words, pixel.data(), sizeof words);
+        return FillPixels4x16u(kernels, words, destination, step, size.width, size.height);
+    default:
+        std::memcpy(floats, pixel.data(), sizeof floats);
+        return FillPixels4x32f(kernels, floats, destination, step, size.width, size.height);
+    }
+}
+
+// Fills rows in memory that ends (or begins) at an inaccessible page, with a margin on the other side.
+void CheckFill(Target target, const std::vector<uint8_t>& pixel, const Rectangle& size, Guard guard,
+               size_t margin) {
+    SCOPED_TRACE(testing::Message() << TargetName(target) << ", pixels of " << pixel.size() << " bytes, "
+                                    << size.width << " x " << size.height << ", padding " << size.padding
+                                    << ", upwards " << size.upwards << ", margin " << margin);
+    const size_t rowBytes = pixel.size() * static_cast<size_t>(size.width);
+    const size_t step = rowBytes + static_cast<size_t>(size.padding);
+    const auto rows = static_cast<size_t>(size.height);
+    const GuardedRows memory(margin + step * (rows - 1) + rowBytes, guard);
+    std::fill_n(memory.Bytes(), memory.Size(), kUntouched);
+    uint8_t* lowest = memory.Bytes() + (guard == Guard::kBefore ? 0 : margin);
+    std::vector<uint8_t> expected(memory.Bytes(), memory.Bytes() + memory.Size());
+    for (size_t row = 0; row < rows; ++row)
+        for (size_t i = 0; i < rowBytes; ++i)
+            expected[static_cast<size_t>(lowest - memory.Bytes()) + row * step + i] = pixel[i % pixel.size()];
+
+    const auto signedStep = static_cast<ptrdiff_t>(step);
+    uint8_t* first = size.upwards ? lowest + signedStep * (size.height - 1) : lowest;
+    ASSERT_EQ(Fill(target, pixel, first, size.upwards ? -signedStep : signedStep, size), 0);
+    const auto [wrong, right] =
+        std::mismatch(memory.Bytes(), memory.Bytes() + memory.Size(), expected.begin());
+    ASSERT_EQ(wrong, memory.Bytes() + memory.Size()) << "at byte " << wrong - memory.Bytes();
+}
+
+TEST(FillPixels, FillsRowsOfEveryWidthAndAlignment) {
+    Random random(11);
+    for (const Target target : EnabledTargets()) {
+        for (const size_t pixelBytes : {4, 8, 16}) {
+            const std::vector<uint8_t> pixel = random.Bytes(pixelBytes);
+            for (int32_t width = 1; width <= 80; ++width) {
+                const size_t margin = random.Below(70);
+                CheckFill(target, pixel, {width, 2, 0, false}, Guard::kAfter, margin);
+                CheckFill(target, pixel, {width, 3, static_cast<ptrdiff_t>(random.Below(40)), true},
+                          Guard::kBefore, margin);
+                CheckFill(target, pixel, {width, 3, static_cast<ptrdiff_t>(random.Below(40)), false},
+                          Guard::kAfter, margin);
+            }
+        }
+    }
+}
+
+TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
+    Random random(12);
+    constexpr int32_t kBytes = 1 << 20; // from here on runs are long
+    std::vector<uint8_t> periodic = random.Bytes(16);
+    std::copy_n(periodic.begin(), 8, periodic.begin() + 8);
+    for (const Target target : EnabledTargets()) {
+        for (const std::vector<uint8_t>& pixel :
+             {random.Bytes(4), random.Bytes(8), random.Bytes(16), periodic}) {
+            const auto size = static_cast<int32_t>(pixel.size());
+            for (const size_t margin : {0, 1, 4, 63}) {
+                CheckFill(target, pixel, {kBytes / size, 1, 0, false}, Guard::kAfter, margin);
+                CheckFill(target, pixel, {kBytes / size - 1, 1, 0, false}, Guard::kAfter, margin);
+                CheckFill(target, pixel, {100003 / size, 11, 0, false}, Guard::kBefore, margin);
+                CheckFill(target, pixel, {kBytes / size + 5, 2, 20, true}, Guard::kAfter, margin);
+            }
+        }
+    }
+}
+
+TEST(FillPixels, OfNothingWritesNothing) {
+    uint8_t bytes[4] = {1, 2, 3, 4};
+    const std::vector<uint8_t> pixel = {9, 9, 9, 9};
+    EXPECT_EQ(Fill(Target::plain, pixel, bytes, 0, {0, 5, 0, false}), 0);
+    EXPECT_EQ(Fill(Target::plain, pixel, bytes, 4, {5, 0, 0, false}), 0);
+    EXPECT_EQ(Fill(Target::plain, pixel, bytes, 20, {5, 0, 0, false}), 0);
+    EXPECT_EQ(bytes[0], 1);
+}
+
+TEST(FillPixels, RefusesNullPointersAndNegativeSizes) {
+    uint8_t bytes[4] = {1, 2, 3, 4};
+    const FillKernels& kernels = KernelsFor<FillKernels>(Target::plain);
+    const float floats[4] = {};
+    EXPECT_EQ(FillPixels4x8u(kernels, bytes, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(FillPixels4x16u(kernels, nullptr, bytes, 4, 1, 1), -8);
+    EXPECT_EQ(FillPixels4x32f(kernels, floats, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(FillPixels4x32f(kernels, floats, bytes, 4, -1, 1), -6);
+    EXPECT_EQ(FillPixels4x32f(kernels, floats, bytes, 4, 1, -1), -6);
+    EXPECT_EQ(bytes[0], 1);
+}
+
+} // namespace
+} // namespace PK
