@@ -1,10 +1,12 @@
-// pixelkiln demo: one photograph through a dozen formats and back, and what that did to it.
+// pixelkiln demo: one photograph through a dozen formats and back, and what that did to it; and what the
+// operations on frames make of it.
 
 #include "Chains.h"
 #include "Commands.h"
 #include "Difference.h"
 #include "Failure.h"
 #include "Formats.h"
+#include "OperationsSheet.h"
 #include "Png.h"
 #include "Sheet.h"
 #include "Terminal.h"
@@ -80,12 +82,16 @@ void RunDemo(const DemoOptions& options) {
     std::vector<Tile> tiles;
     for (const PK_PixelFormat stop : kStops) tiles.push_back(Visit(picture, stop, folder, tiles.size() + 1));
     const std::string sheet = (folder / "sheet.png").string();
+    const std::string name = std::filesystem::path(options.image).filename().string();
     WriteSheet(tiles,
-               std::filesystem::path(options.image).filename().string() +
-                   " to each format and back; on the right the difference, " +
+               name + " to each format and back; on the right the difference, " +
                    std::to_string(kAmplification) + " times as bright",
                sheet);
     Print("\n" + sheet + " shows all " + std::to_string(tiles.size()) + " side by side\n");
+    const std::string operations = (folder / "operations.png").string();
+    WriteSheet(OperationTiles(picture), name + " filled over, turned, blurred, warped and stamped",
+               operations);
+    Print(operations + " shows what the operations do\n");
 }
 
 } // namespace tool

@@ -2,7 +2,7 @@
 
 // The commands of the program: what each is told, and the function that does it. All throw Failure.
 
-#include "Frame.h"
+#include "FramePipe.h"
 
 #include <optional>
 #include <string>
@@ -25,18 +25,42 @@ struct ExplainOptions {
 };
 void RunExplain(const ExplainOptions& options);
 
-struct ConvertOptions {
-    std::string input;
-    std::string output;
-    std::string from;
-    std::string to;
-    std::string size;
-    int32_t quality = kDefaultQuality;
-    int32_t pngDepth = 8;
-    bool packed = false;
-    bool quiet = false;
+void RunConvert(const PipeOptions& options);
+
+struct FillOptions : PipeOptions {
+    std::string colour;
 };
-void RunConvert(const ConvertOptions& options);
+void RunFill(const FillOptions& options);
+
+struct RotateOptions : PipeOptions {
+    int32_t degrees = 0;
+};
+void RunRotate(const RotateOptions& options);
+
+struct BoxBlurOptions : PipeOptions {
+    double radius = 0;
+    int32_t passes = 1;
+    bool rows = false;
+    bool columns = false;
+    bool renormalise = false;
+};
+void RunBoxBlur(const BoxBlurOptions& options);
+
+struct WarpOptions : PipeOptions {
+    std::string quad;
+    std::string onto;
+    float feather = 0;
+    int32_t opacity = 255;
+};
+void RunWarp(const WarpOptions& options);
+
+struct StampOptions : PipeOptions {
+    int32_t number = 0;
+    std::string at = "0.02,0.02";
+    float digit = 0.05F;
+    bool hex = false;
+};
+void RunStamp(const StampOptions& options);
 
 struct CompareOptions {
     std::string first;

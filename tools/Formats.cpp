@@ -127,4 +127,10 @@ bool IsPlanar(PK_PixelFormat format) {
     return (format & 0x30) == 0x30;
 }
 
+bool IsFourBytesAPixel(PK_PixelFormat format) {
+    constexpr int32_t kPair = 2; // pixels: 4:2:2 formats have four bytes a pair
+    return IsRaster(format) && format != PK_PixelFormat_RGB_444_10u &&
+           PK_PixelFormatPackedRowBytes(format, kPair) == 4 * kPair;
+}
+
 } // namespace tool

@@ -24,4 +24,7 @@ PK_PixelFormat ParseFormat(const std::string& text);
 bool IsRaster(PK_PixelFormat format);
 bool IsPlanar(PK_PixelFormat format);
 
+/// Whether a pixel is four samples of 8 bits.
+bool IsFourBytesAPixel(PK_PixelFormat format);
+
 } // namespace tool

@@ -60,10 +60,21 @@ void Convert(const Frame& source, Frame& destination, int32_t quality) {
                                        " (result " + std::to_string(result) + ")");
 }
 
+Frame Copied(const Frame& source) {
+    return Converted(source, source.Format(), kDefaultQuality);
+}
+
 Frame Converted(const Frame& source, PK_PixelFormat format, int32_t quality) {
     Frame destination(format, source.Width(), source.Height());
     Convert(source, destination, quality);
     return destination;
+}
+
+void Require(PK_Result result, const std::string& what, const Frame& frame) {
+    if (result == PK_Success) return;
+    throw Failure(kExitFailed, "cannot " + what + " a frame of " + FormatName(frame.Format()) + " at " +
+                                   std::to_string(frame.Width()) + "x" + std::to_string(frame.Height()) +
+                                   ": " + ResultText(result) + " (result " + std::to_string(result) + ")");
 }
 
 const char* ResultText(PK_Result result) {
@@ -89,7 +100,7 @@ const char* ResultText(PK_Result result) {
     case PK_ErrOutOfMemory:
         return "out of memory";
     case PK_ErrFailed:
-        return "no chain of kernels leads there";
+        return "nothing leads there";
     case PK_ErrNotSupported:
         return "this combination is not offered";
     default:

@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <string>
 #include <vector>
 
 namespace tool {
@@ -62,6 +63,12 @@ private:
 /// Throws a Failure that names both formats if the library refuses.
 void Convert(const Frame& source, Frame& destination, int32_t quality);
 Frame Converted(const Frame& source, PK_PixelFormat format, int32_t quality);
+
+Frame Copied(const Frame& source);
+
+/// Throws a Failure for any result but success.
+/// \param what  what was asked for, such as "rotate".
+void Require(PK_Result result, const std::string& what, const Frame& frame);
 
 /// What a result code says, as a clause.
 const char* ResultText(PK_Result result);

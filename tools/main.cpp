@@ -41,6 +41,18 @@ constexpr const char* kConvertNotes =
     "  pixelkiln convert photo.v210 photo.png --from V210_422_10u --size 512x512\n"
     "  pixelkiln convert clip.yuv frame-%04d.png --from UYVY_422_8u --size 720x576 --packed\n";
 
+constexpr const char* kFillNotes =
+    "A PNG is written from the format of --to, so that its losses show. 4:2:2 formats are filled in whole\n"
+    "pairs of pixels, and V210 with R,G,B,A in whole groups of six: what is left of a row stays 0.\n\n"
+    "Examples:\n"
+    "  pixelkiln fill black.v210 --size 1920x1080 --to V210_422_10u --colour black\n"
+    "  pixelkiln fill orange.png --size 640x360 --colour 255,128,0,255\n";
+
+constexpr const char* kOperationNotes =
+    "Files are named and read as by 'pixelkiln convert'. The work is done in the format of --from; a PNG\n"
+    "without it is BGRA, with 16 bits a sample as float. Directions and places are those of the picture as\n"
+    "one sees it, from its top left corner.\n";
+
 class Library {
 public:
     Library() { PK_Initialize(); }
@@ -83,22 +95,105 @@ void AddExplain(CLI::App& program) {
     AddQuality(*explain.app, explain.options->quality);
 }
 
-void AddConvert(CLI::App& program) {
-    const Command<ConvertOptions> convert(program, "convert", "Convert a PNG or raw frames to another format",
-                                          RunConvert);
-    ConvertOptions& options = *convert.options;
-    convert.app->add_option("IN", options.input, "PNG file, raw frames, or -")->required();
-    convert.app->add_option("OUT", options.output, "PNG file, raw frames, or -")->required();
-    convert.app->add_option("--from", options.from, "Format to start from; needed for raw frames");
-    convert.app->add_option("--to", options.to, "Format to end in; needed for raw frames");
-    convert.app->add_option("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
-    convert.app->add_option("--png-depth", options.pngDepth, "Bits a sample of an output PNG, 8 or 16")
+// What commands from frames to frames share.
+void AddOutput(CLI::App& command, PipeOptions& options) {
+    command.add_option("OUT", options.output, "PNG file, raw frames, or -")->required();
+    command.add_option("--png-depth", options.pngDepth, "Bits a sample of an output PNG, 8 or 16")
         ->check(CLI::IsMember({8, 16}))
         ->capture_default_str();
-    convert.app->add_flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
-    convert.app->add_flag("--quiet", options.quiet, "No summary");
-    AddQuality(*convert.app, options.quality);
+    command.add_flag("--quiet", options.quiet, "No summary");
+    AddQuality(command, options.quality);
+}
+
+void AddPipe(CLI::App& command, PipeOptions& options) {
+    command.add_option("IN", options.input, "PNG file, raw frames, or -")->required();
+    AddOutput(command, options);
+    command.add_option("--from", options.from, "Format to start from; needed for raw frames");
+    command.add_option("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
+    command.add_flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+}
+
+void AddConvert(CLI::App& program) {
+    const Command<PipeOptions> convert(program, "convert", "Convert a PNG or raw frames to another format",
+                                       RunConvert);
+    AddPipe(*convert.app, *convert.options);
+    convert.app->add_option("--to", convert.options->to, "Format to end in; needed for raw frames");
     convert.app->footer(kConvertNotes);
+}
+
+void AddFill(CLI::App& program) {
+    const Command<FillOptions> fill(program, "fill", "Make a frame of one colour", RunFill);
+    FillOptions& options = *fill.options;
+    AddOutput(*fill.app, options);
+    fill.app->add_option("--size", options.size, "Width x height of the frame, such as 1920x1080")
+        ->required();
+    fill.app->add_option("--to", options.to, "Format to fill; needed for raw frames");
+    fill.app
+        ->add_option("--colour", options.colour,
+                     "black, white, clear-black, clear-white, or R,G,B,A from 0 to 255")
+        ->required();
+    fill.app->add_flag("--packed", options.packed, "Rows of a raw frame have no padding");
+    fill.app->footer(kFillNotes);
+}
+
+// Adds what the commands that do something to the picture share, with --to as they take it.
+void AddOperation(CLI::App& command, PipeOptions& options) {
+    AddPipe(command, options);
+    command.add_option("--to", options.to, "Format to end in; without it, raw frames keep that of --from");
+    command.footer(kOperationNotes);
+}
+
+void AddGeometry(CLI::App& program) {
+    const Command<RotateOptions> rotate(program, "rotate", "Turn frames by quarters", RunRotate);
+    AddOperation(*rotate.app, *rotate.options);
+    rotate.app->add_option("--degrees", rotate.options->degrees, "Clockwise: 90, 180, 270, or less than 0")
+        ->required()
+        ->check(CLI::IsMember({90, 180, 270, -90, -180, -270}));
+
+    const Command<WarpOptions> warp(program, "warp", "Draw frames into a quadrilateral", RunWarp);
+    WarpOptions& options = *warp.options;
+    AddOperation(*warp.app, options);
+    warp.app
+        ->add_option("--quad", options.quad,
+                     "x0,y0,...,x3,y3: where the corners go, in pixels, clockwise from the top left one")
+        ->required();
+    warp.app->add_option("--onto", options.onto, "PNG file to draw on; without it, black");
+    warp.app->add_option("--feather", options.feather, "Width of a soft rim in pixels; needs quality 3")
+        ->check(CLI::Range(0.0, 1e6))
+        ->capture_default_str();
+    warp.app->add_option("--opacity", options.opacity, "0 to 255")
+        ->check(CLI::Range(0, 255))
+        ->capture_default_str();
+}
+
+void AddFilters(CLI::App& program) {
+    const Command<BoxBlurOptions> blur(program, "boxblur", "Blur frames by boxes", RunBoxBlur);
+    AddOperation(*blur.app, *blur.options);
+    blur.app->add_option("--radius", blur.options->radius, "In pixels; fractions count")
+        ->required()
+        ->check(CLI::Range(0.0, 1e6));
+    blur.app
+        ->add_option("--passes", blur.options->passes, "Boxes one after the other; three are near a Gaussian")
+        ->check(CLI::Range(1, 100))
+        ->capture_default_str();
+    blur.app->add_flag("--rows", blur.options->rows, "Along rows only");
+    blur.app->add_flag("--columns", blur.options->columns, "Along columns only");
+    blur.app->add_flag("--renormalise", blur.options->renormalise,
+                       "Keep the borders as bright as the rest; without it they fade to black");
+}
+
+void AddStamp(CLI::App& program) {
+    const Command<StampOptions> stamp(program, "stamp",
+                                      "Burn a number into frames, counting up from frame to frame", RunStamp);
+    StampOptions& options = *stamp.options;
+    AddOperation(*stamp.app, options);
+    stamp.app->add_option("--number", options.number, "Number of the first frame")->required();
+    stamp.app->add_flag("--hex", options.hex, "Hexadecimal digits");
+    stamp.app->add_option("--digit", options.digit, "Width of a digit, as a fraction of the width")
+        ->check(CLI::Range(0.0, 1.0))
+        ->capture_default_str();
+    stamp.app->add_option("--at", options.at, "X,Y of the top left corner, as fractions of width and height")
+        ->capture_default_str();
 }
 
 void AddPictures(CLI::App& program) {
@@ -139,6 +234,10 @@ int Run(int count, char** words) {
     AddListings(program);
     AddExplain(program);
     AddConvert(program);
+    AddFill(program);
+    AddGeometry(program);
+    AddFilters(program);
+    AddStamp(program);
     AddPictures(program);
     try {
         program.parse(count, words);

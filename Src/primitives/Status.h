@@ -1,11 +1,12 @@
 #pragma once
 
-// What a primitive returns: 0 for success, a negative number for a failed check.
+// What primitives return: 0 for success, a negative number for a check that failed.
 
 #include <cstdint>
 
 namespace PK {
 
+inline constexpr int32_t kStatusSuccess = 0;
 inline constexpr int32_t kStatusOk = 0;
 inline constexpr int32_t kStatusBadSize = -6; // a negative width, height or count
 inline constexpr int32_t kStatusNullPointer = -8;

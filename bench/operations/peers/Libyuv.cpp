@@ -1,0 +1,33 @@
+// libyuv. Its "ARGB" is BGRA in memory, and its "RAW" RGB.
+
+#include "operations/Operation.h"
+
+#include <libyuv.h>
+
+namespace OperationBench {
+namespace {
+
+Run FromRGB(const uint8_t* source, uint8_t* destination) {
+    return [=] { libyuv::RAWToARGB(source, 3 * kWidth, destination, kBGRARowBytes, kWidth, kHeight); };
+}
+
+// A negative height turns the picture over first, by which a quarter turn becomes a transposition.
+template <int kMode, int32_t kSignedHeight>
+Run Turn(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        libyuv::ARGBRotate(source, kBGRARowBytes, destination,
+                           kMode == libyuv::kRotate180 ? kBGRARowBytes : kTurnedRowBytes, kWidth,
+                           kSignedHeight, static_cast<libyuv::RotationMode>(kMode));
+    };
+}
+
+const AddPeers add = {
+    {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
+    {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
+    {"Rotate BGRA 8u by 90 degrees", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, kHeight>},
+    {"Rotate BGRA 8u by 180 degrees", "libyuv ARGBRotate", true, Turn<libyuv::kRotate180, kHeight>},
+    {"Rotate BGRA 8u by 270 degrees", "libyuv ARGBRotate", true, Turn<libyuv::kRotate270, kHeight>},
+};
+
+} // namespace
+} // namespace OperationBench

@@ -1,0 +1,78 @@
+// OpenCV, on one thread.
+
+#include "operations/Operation.h"
+#include "operations/WarpQuad.h"
+
+#include <opencv2/core.hpp>
+#include <opencv2/imgproc.hpp>
+
+namespace OperationBench {
+namespace {
+
+cv::Mat Wrap(const uint8_t* bytes, int32_t width, int32_t height, int type) {
+    return {height, width, type, const_cast<uint8_t*>(bytes)};
+}
+
+cv::Mat Upright(const uint8_t* bytes) {
+    return Wrap(bytes, kWidth, kHeight, CV_8UC4);
+}
+
+cv::Mat Turned(const uint8_t* bytes) {
+    return Wrap(bytes, kHeight, kWidth, CV_8UC4);
+}
+
+Run FromRGB(const uint8_t* source, uint8_t* destination) {
+    return [from = Wrap(source, kWidth, kHeight, CV_8UC3), to = Upright(destination)] {
+        cv::cvtColor(from, to, cv::COLOR_RGB2BGRA);
+    };
+}
+
+Run Transpose(const uint8_t* source, uint8_t* destination) {
+    return [from = Upright(source), to = Turned(destination)] { cv::transpose(from, to); };
+}
+
+template <int kCode>
+Run Rotate(const uint8_t* source, uint8_t* destination) {
+    const cv::Mat to = kCode == cv::ROTATE_180 ? Upright(destination) : Turned(destination);
+    return [from = Upright(source), to] { cv::rotate(from, to, kCode); };
+}
+
+template <int kWindowWidth, int kWindowHeight>
+Run BoxFilter(const uint8_t* source, uint8_t* destination) {
+    return [from = Upright(source), to = Upright(destination)] {
+        cv::boxFilter(from, to, -1, cv::Size(kWindowWidth, kWindowHeight), cv::Point(-1, -1), true,
+                      cv::BORDER_CONSTANT);
+    };
+}
+
+// Its pixel centres are at whole numbers.
+template <int kInterpolation>
+Run Warp(const uint8_t* source, uint8_t* destination) {
+    const WarpMatrix m;
+    const double x = m.offsetX + (m.a - m.b - 1) / 2;
+    const double y = m.offsetY + (m.b + m.a - 1) / 2;
+    const cv::Mat matrix = (cv::Mat_<double>(2, 3) << m.a, -m.b, x, m.b, m.a, y);
+    return [matrix, from = Upright(source), to = Upright(destination)] {
+        cv::warpAffine(from, to, matrix, to.size(), kInterpolation, cv::BORDER_TRANSPARENT);
+    };
+}
+
+const AddPeers add = {
+    {"RGB 8u to BGRA 8u", "OpenCV cvtColor", true, FromRGB},
+    {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose},
+    {"Rotate BGRA 8u by 90 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_CLOCKWISE>},
+    {"Rotate BGRA 8u by 180 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_180>},
+    {"Rotate BGRA 8u by 270 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_COUNTERCLOCKWISE>},
+    {"Box blur of rows, radius 10", "OpenCV boxFilter 21 x 1", false, BoxFilter<21, 1>},
+    {"Box blur of columns, radius 10", "OpenCV boxFilter 1 x 21", false, BoxFilter<1, 21>},
+    {"Quad warp, bilinear", "OpenCV warpAffine", false, Warp<cv::INTER_LINEAR>},
+    {"Quad warp, nearest", "OpenCV warpAffine", false, Warp<cv::INTER_NEAREST>},
+};
+
+const bool onOneThread = [] {
+    cv::setNumThreads(1);
+    return true;
+}();
+
+} // namespace
+} // namespace OperationBench

@@ -1,0 +1,48 @@
+#pragma once
+
+// Frames from a file to a file, PNG or raw, with something done to each on the way.
+
+#include "Frame.h"
+
+#include <functional>
+#include <string>
+
+namespace tool {
+
+/// What every command that reads frames and writes frames is told.
+struct PipeOptions {
+    std::string input;
+    std::string output;
+    std::string from;
+    std::string to;
+    std::string size;
+    int32_t quality = kDefaultQuality;
+    int32_t pngDepth = 8;
+    bool packed = false;
+    bool quiet = false;
+};
+
+struct Size {
+    int32_t width = 0;
+    int32_t height = 0;
+};
+
+/// Reads a size such as 1920x1080. Throws a usage Failure.
+Size ParseSize(const std::string& text);
+
+/// What becomes of a frame of the format of --from, before it is taken to that of --to.
+using Step = std::function<Frame(const Frame&)>;
+
+/// Takes every frame of the input through the step, if there is one, to the output and prints a line about it.
+void PipeFrames(const PipeOptions& options, const Step& step);
+
+/// The same where the output keeps the format of the input unless --to tells another.
+void PipeFramesInTheirFormat(PipeOptions options, const Step& step);
+
+/// Gives pixels to a new frame, of the format of --to.
+using Make = std::function<void(Frame&)>;
+
+/// Writes one frame that is made and not read. Of the options, input and from are not looked at.
+void WriteMadeFrame(const PipeOptions& options, const Make& make);
+
+} // namespace tool

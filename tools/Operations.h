@@ -1,0 +1,46 @@
+#pragma once
+
+// The operations of the library on whole frames, as the commands and the demonstration use them. What has a
+// place or a direction goes by the picture as one sees it, from its top left corner and clockwise, however the
+// format stores its rows. All throw a Failure if the library refuses.
+
+#include "Frame.h"
+
+#include <array>
+#include <string>
+
+namespace tool {
+
+/// \param colour  black, white, clear-black, clear-white, or R,G,B,A from 0 to 255.
+void Fill(Frame& frame, const std::string& colour);
+
+/// \param degrees  clockwise; a multiple of 90 from -270 to 270, but not 0.
+Frame Rotated(const Frame& frame, int32_t degrees);
+
+struct BoxBlur {
+    double radius = 0;
+    int32_t passes = 1;
+    bool rows = true;
+    bool columns = true;
+    bool renormalise = false;
+};
+void Blur(Frame& frame, const BoxBlur& blur);
+
+struct Warp {
+    std::array<double, 8> quad; ///< where the corners of the picture go, clockwise from the top left one
+    float feather = 0;
+    int32_t opacity = 255;
+    int32_t quality = kDefaultQuality;
+};
+/// Composites the whole picture into a quadrilateral of the background, which has its format.
+void DrawWarped(const Frame& picture, const Warp& warp, Frame& background);
+
+struct Stamp {
+    int32_t number = 0;
+    PK_Point at = {};    ///< as fractions of width and height
+    float digit = 0.05F; ///< width of a digit, as a fraction of the width
+    bool hex = false;
+};
+void Burn(Frame& frame, const Stamp& stamp);
+
+} // namespace tool
