@@ -60,10 +60,7 @@ FillUnit V210FillUnit(YUVCodes codes) noexcept {
 PK_Result FillWithUnits(const DestinationImage& image, const FillUnit& unit, int32_t units) noexcept {
     if (image.width < 0 || image.height < 0) return PK_ErrFailed;
     if (image.width == 0 || image.height == 0) return PK_Success;
-<<<<<<< HEAD
     if (image.width > kMaximumWidth) return PK_ErrFailed;
-=======
->>>>>>> tool2
     int32_t status = 0;
     if (unit.size == 4)
         status = FillWith<uint8_t>(FillPixels4x8u, image, unit, units);

@@ -32,12 +32,8 @@ struct Rows {
     ptrdiff_t sourceRowBytes;
     void* destination;
     ptrdiff_t destinationRowBytes;
-<<<<<<< HEAD
     PK_PixelFormat format;
     int32_t width;
-=======
-    size_t length;
->>>>>>> tool2
     int32_t height;
 };
 
@@ -45,7 +41,6 @@ using ChannelRow = decltype(ChannelKernels::replace);
 
 PK_Result RunRows(const Rows& rows, ChannelRow row, const ChannelPattern& pattern) {
     if (rows.source == nullptr || rows.destination == nullptr) return PK_ErrFailed;
-<<<<<<< HEAD
     if (rows.width > kMaximumWidth) return PK_ErrFailed;
     const auto* source = static_cast<const uint8_t*>(rows.source);
     auto* destination = static_cast<uint8_t*>(rows.destination);
@@ -55,20 +50,6 @@ PK_Result RunRows(const Rows& rows, ChannelRow row, const ChannelPattern& patter
     return PK_Success;
 }
 
-=======
-    const auto* source = static_cast<const uint8_t*>(rows.source);
-    auto* destination = static_cast<uint8_t*>(rows.destination);
-    for (ptrdiff_t i = 0; i < rows.height; ++i)
-        row(source + i * rows.sourceRowBytes, destination + i * rows.destinationRowBytes, rows.length,
-            pattern);
-    return PK_Success;
-}
-
-size_t RowLength(PK_PixelFormat format, int32_t width) {
-    return static_cast<size_t>(BytesPerPixel(format)) * static_cast<size_t>(width);
-}
-
->>>>>>> tool2
 /// nearest(full x alpha), limited to 0 to full; NaN gives 0. Not inlined, so that the arithmetic stays within
 /// the scope of the floating-point mode.
 [[gnu::noinline]] int32_t AlphaCode(float alpha, int32_t full) {
@@ -163,11 +144,7 @@ PK_Result PK_SetAlphaChannel(int32_t width, int32_t height, void* buffer, int32_
     if (setAlpha == nullptr) return PK_ErrNotSupported;
     if (width < 0 || height < 0) return PK_ErrFailed;
     if (width == 0 || height == 0) return PK_Success;
-<<<<<<< HEAD
     if (buffer == nullptr || width > kMaximumWidth) return PK_ErrFailed;
-=======
-    if (buffer == nullptr) return PK_ErrFailed;
->>>>>>> tool2
     const int32_t status = setAlpha(width, height, static_cast<uint8_t*>(buffer), rowBytes, opaque);
     return status == 0 ? PK_Success : PK_ErrFailed;
 }
@@ -180,14 +157,8 @@ PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void* desti
     if (width < 0 || height < 0) return PK_ErrFailed;
     if (width == 0 || height == 0) return PK_Success;
     const FloatMode mode;
-<<<<<<< HEAD
     return RunRows({source, sourceRowBytes, destination, destinationRowBytes, format, width, height},
                    inversion->row, inversion->pattern);
-=======
-    return RunRows(
-        {source, sourceRowBytes, destination, destinationRowBytes, RowLength(format, width), height},
-        inversion->row, inversion->pattern);
->>>>>>> tool2
 }
 
 PK_Result PK_CopyAndSetAlpha(const void* source, int32_t sourceRowBytes, void* destination,
@@ -197,12 +168,6 @@ PK_Result PK_CopyAndSetAlpha(const void* source, int32_t sourceRowBytes, void* d
     const auto pattern = ConstantAlpha(format, alpha);
     if (!HasFourChannels(format) || !pattern) return PK_ErrNotSupported;
     if (width < 1 || height < 1) return PK_Success;
-<<<<<<< HEAD
     return RunRows({source, sourceRowBytes, destination, destinationRowBytes, format, width, height},
                    Best<ChannelKernels>().replace, *pattern);
-=======
-    return RunRows(
-        {source, sourceRowBytes, destination, destinationRowBytes, RowLength(format, width), height},
-        Best<ChannelKernels>().replace, *pattern);
->>>>>>> tool2
 }

@@ -1,10 +1,7 @@
 // The primitives on arrays of samples, as a host calls them.
 
 #include "frame/Dispatch.h"
-<<<<<<< HEAD
 #include "frame/PixelFormat.h"
-=======
->>>>>>> tool2
 #include "primitives/ALaw.h"
 #include "primitives/ConvertFloat.h"
 #include "primitives/MultiplyConstant.h"
@@ -27,10 +24,7 @@ PK_Result PK_MultiplyByConstant(int32_t width, int32_t height, const void* sourc
                                 void* destination, int32_t destinationRowBytes, const uint8_t constants[4],
                                 int32_t scaleFactor) noexcept {
     if ((width == 0 && height >= 0) || (height == 0 && width >= 0)) return PK_Success;
-<<<<<<< HEAD
     if (width > kMaximumWidth) return PK_ErrFailed;
-=======
->>>>>>> tool2
     return ResultOf(MultiplyConstant(Best<MultiplyConstantKernels>(), static_cast<const uint8_t*>(source),
                                      sourceRowBytes, constants, static_cast<uint8_t*>(destination),
                                      destinationRowBytes, width, height, scaleFactor));

@@ -9,11 +9,7 @@ int32_t ALawToLinear16(const ALawKernels& kernels, const uint8_t* source, int16_
     if (source == nullptr || destination == nullptr) return kStatusNullPointer;
     if (count < 0) return kStatusBadSize;
     kernels.toLinear16(source, reinterpret_cast<uint8_t*>(destination), static_cast<size_t>(count));
-<<<<<<< HEAD
     return kStatusOk;
-=======
-    return kStatusSuccess;
->>>>>>> tool2
 }
 
 } // namespace PK

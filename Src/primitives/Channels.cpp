@@ -28,22 +28,14 @@ int32_t SetChannel(const ChannelKernels& kernels, Sample value, uint8_t* channel
                    int32_t width, int32_t height) {
     if (channelStart == nullptr) return kStatusNullPointer;
     if (width < 0 || height < 0) return kStatusBadSize;
-<<<<<<< HEAD
     if (width == 0) return kStatusOk;
-=======
-    if (width == 0) return kStatusSuccess;
->>>>>>> tool2
     const ChannelPattern pattern = Pattern(0, value);
     const size_t bytes = (static_cast<size_t>(width - 1) * kChannels + 1) * sizeof value;
     for (ptrdiff_t row = 0; row < height; ++row) {
         uint8_t* samples = channelStart + row * step;
         kernels.replace(samples, samples, bytes, pattern);
     }
-<<<<<<< HEAD
     return kStatusOk;
-=======
-    return kStatusSuccess;
->>>>>>> tool2
 }
 
 } // namespace

@@ -41,11 +41,7 @@ int32_t Convert(ConvertFloatKernels::Run run, const void* source, void* destinat
     const ScalingMode mode;
     run(static_cast<const uint8_t*>(source), static_cast<uint8_t*>(destination), static_cast<size_t>(count),
         factor);
-<<<<<<< HEAD
     return kStatusOk;
-=======
-    return kStatusSuccess;
->>>>>>> tool2
 }
 
 } // namespace

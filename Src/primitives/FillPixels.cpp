@@ -81,11 +81,7 @@ int32_t FillPixels(const FillKernels& kernels, const void* value, size_t pixelBy
         else
             FillLongRun(kernels, destination + row * step, bytes, pattern);
     }
-<<<<<<< HEAD
     return kStatusOk;
-=======
-    return kStatusSuccess;
->>>>>>> tool2
 }
 
 } // namespace

@@ -41,11 +41,7 @@ int32_t MultiplyConstant(const MultiplyConstantKernels& kernels, const uint8_t* 
         multiplyRow(source + row * sourceStep, destination + row * destinationStep,
                     static_cast<size_t>(width), factors);
     }
-<<<<<<< HEAD
     return kStatusOk;
-=======
-    return kStatusSuccess;
->>>>>>> tool2
 }
 
 } // namespace PK

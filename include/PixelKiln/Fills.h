@@ -30,22 +30,14 @@ extern "C" {
 ///
 /// \param buffer    the image.
 /// \param rowBytes  bytes from one row to the next; ignored for a stream.
-<<<<<<< HEAD
 /// \param width     pixels in a row, 0 to 134217727.
-=======
-/// \param width     pixels in a row, not negative.
->>>>>>> tool2
 /// \param height    rows, not negative.
 /// \param format    the format of the image.
 /// \return
 ///  - PK_Success: filled. A width or height of 0 does nothing, with any buffer.
 ///  - PK_ErrBadSrcFormat: a stream that is neither DV nor a well-formed planar 4:2:0 format.
 ///  - PK_ErrNotSupported: any other depth or layout, RGB_444_10u among them; a DV25 stream.
-<<<<<<< HEAD
 ///  - PK_ErrFailed: a null buffer, a negative width or height, a width too great, or planes too large for 32 bits.
-=======
-///  - PK_ErrFailed: a null buffer, a negative width or height, or planes too large for 32 bits.
->>>>>>> tool2
 ///  Nothing is written unless the result is PK_Success.
 PK_API PK_Result PK_FillWithOpaqueBlack(void* buffer, int32_t rowBytes, int32_t width, int32_t height,
                                         PK_PixelFormat format) noexcept;
@@ -54,11 +46,7 @@ PK_API PK_Result PK_FillWithOpaqueBlack(void* buffer, int32_t rowBytes, int32_t 
 /// one. See PK_FillWithOpaqueBlack for formats and result codes.
 /// \param buffer    the image.
 /// \param rowBytes  bytes from one row to the next; ignored for a stream.
-<<<<<<< HEAD
 /// \param width     pixels in a row, 0 to 134217727.
-=======
-/// \param width     pixels in a row, not negative.
->>>>>>> tool2
 /// \param height    rows, not negative.
 /// \param format    the format of the image.
 /// \return as PK_FillWithOpaqueBlack.
@@ -68,11 +56,7 @@ PK_API PK_Result PK_FillWithOpaqueWhite(void* buffer, int32_t rowBytes, int32_t 
 /// Fills with the colour of PK_FillWithOpaqueBlack and alpha 0.
 /// \param buffer    the image.
 /// \param rowBytes  bytes from one row to the next.
-<<<<<<< HEAD
 /// \param width     pixels in a row, 0 to 134217727.
-=======
-/// \param width     pixels in a row, not negative.
->>>>>>> tool2
 /// \param height    rows, not negative.
 /// \param format    a format with straight or premultiplied alpha.
 /// \return PK_ErrBadDstFormat for a format without alpha (kind 0, as 4:2:2 has) or with a meaningless one (X),
@@ -84,11 +68,7 @@ PK_API PK_Result PK_FillWithTransparentBlack(void* buffer, int32_t rowBytes, int
 /// colour, with transparent black.
 /// \param buffer    the image.
 /// \param rowBytes  bytes from one row to the next.
-<<<<<<< HEAD
 /// \param width     pixels in a row, 0 to 134217727.
-=======
-/// \param width     pixels in a row, not negative.
->>>>>>> tool2
 /// \param height    rows, not negative.
 /// \param format    a format with straight or premultiplied alpha.
 /// \return as PK_FillWithTransparentBlack.
@@ -107,11 +87,7 @@ PK_API PK_Result PK_FillWithTransparentWhite(void* buffer, int32_t rowBytes, int
 ///
 /// \param buffer       the image.
 /// \param rowBytes     bytes from one row to the next; ignored for a stream.
-<<<<<<< HEAD
 /// \param width        pixels in a row, 0 to 134217727.
-=======
-/// \param width        pixels in a row, not negative.
->>>>>>> tool2
 /// \param height       rows, not negative.
 /// \param format       the format of the image.
 /// \param pixel        one pixel of pixelFormat, 2 to 16 bytes; may lie in the image. Of a 4:2:2 format it is
@@ -122,11 +98,7 @@ PK_API PK_Result PK_FillWithTransparentWhite(void* buffer, int32_t rowBytes, int
 ///  - PK_ErrBadDstFormat: V210, after the fill; otherwise a format that cannot be filled, with nothing
 ///    written: DV and unknown streams, RGB_444_10u, and any number that has no constant.
 ///  - PK_ErrBadSrcFormat: a pixel format that has no single pixel (V210, streams) or no constant.
-<<<<<<< HEAD
 ///  - PK_ErrFailed: a null buffer or pixel, a negative width or height, a width too great, or planes too large for 32 bits.
-=======
-///  - PK_ErrFailed: a null buffer or pixel, a negative width or height, or planes too large for 32 bits.
->>>>>>> tool2
 PK_API PK_Result PK_FillWithColor(void* buffer, int32_t rowBytes, int32_t width, int32_t height,
                                   PK_PixelFormat format, const void* pixel,
                                   PK_PixelFormat pixelFormat) noexcept;

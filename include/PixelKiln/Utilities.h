@@ -13,11 +13,7 @@
 extern "C" {
 
 /// Sets the alpha of every pixel to its full value or to 0. Colour samples stay.
-<<<<<<< HEAD
 /// \param width     pixels in a row, 0 to 134217727.
-=======
-/// \param width     pixels in a row, not negative.
->>>>>>> tool2
 /// \param height    rows, not negative.
 /// \param buffer    first row of the image.
 /// \param rowBytes  bytes from one row to the next.
@@ -26,11 +22,7 @@ extern "C" {
 /// \param opaque    true for full, false for 0.
 /// \return PK_Success, also for a width or height of 0, which does nothing with any buffer;
 ///         PK_ErrNotSupported for any other format, ARGB_4444_8u and those of matrix 709 among them;
-<<<<<<< HEAD
 ///         PK_ErrFailed for a null buffer, a negative width or height or a width too great.
-=======
-///         PK_ErrFailed for a null buffer or a negative width or height.
->>>>>>> tool2
 PK_API PK_Result PK_SetAlphaChannel(int32_t width, int32_t height, void* buffer, int32_t rowBytes,
                                     PK_PixelFormat format, bool opaque) noexcept;
 
@@ -44,19 +36,11 @@ PK_API PK_Result PK_SetAlphaChannel(int32_t width, int32_t height, void* buffer,
 /// \param destinationRowBytes  bytes from one row to the next.
 /// \param format               the format of both: four channels of 8u, 15u or 32f, with alpha where the
 ///                             component order has it.
-<<<<<<< HEAD
 /// \param width                pixels in a row, 0 to 134217727.
 /// \param height               rows, not negative.
 /// \return PK_Success, also for a width or height of 0, which does nothing with any pointers;
 ///         PK_ErrBadSrcFormat for any other format; PK_ErrFailed for a null pointer, a negative width or
 ///         height or a width too great.
-=======
-/// \param width                pixels in a row, not negative.
-/// \param height               rows, not negative.
-/// \return PK_Success, also for a width or height of 0, which does nothing with any pointers;
-///         PK_ErrBadSrcFormat for any other format; PK_ErrFailed for a null pointer or a negative width or
-///         height.
->>>>>>> tool2
 PK_API PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void* destination,
                                 int32_t destinationRowBytes, PK_PixelFormat format, int32_t width,
                                 int32_t height) noexcept;
@@ -71,30 +55,18 @@ PK_API PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void
 /// \param destinationRowBytes  bytes from one row to the next.
 /// \param format               the format of both: four channels of 8u, 15u or 32f; of 8u only where alpha
 ///                             comes first (ARGB order).
-<<<<<<< HEAD
 /// \param width                pixels in a row, at most 134217727.
 /// \param height               rows.
 /// \param alpha                1 is full.
 /// \return PK_Success, also for a width or height below 1, which does nothing with any pointers;
 ///         PK_ErrNotSupported for any other format; PK_ErrFailed for a null pointer or a width too great.
-=======
-/// \param width                pixels in a row.
-/// \param height               rows.
-/// \param alpha                1 is full.
-/// \return PK_Success, also for a width or height below 1, which does nothing with any pointers;
-///         PK_ErrNotSupported for any other format; PK_ErrFailed for a null pointer.
->>>>>>> tool2
 PK_API PK_Result PK_CopyAndSetAlpha(const void* source, int32_t sourceRowBytes, void* destination,
                                     int32_t destinationRowBytes, PK_PixelFormat format, int32_t width,
                                     int32_t height, float alpha) noexcept;
 
 /// Multiplies an image of four-channel 8-bit pixels by a constant a channel:
 /// nearest(source x constant x 2^-scaleFactor), ties to even, limited to 255.
-<<<<<<< HEAD
 /// \param width                pixels in a row, 0 to 134217727.
-=======
-/// \param width                pixels in a row, not negative.
->>>>>>> tool2
 /// \param height               rows, not negative.
 /// \param source               first row of the source.
 /// \param sourceRowBytes       bytes from one row to the next.
@@ -104,11 +76,7 @@ PK_API PK_Result PK_CopyAndSetAlpha(const void* source, int32_t sourceRowBytes, 
 /// \param constants            one for each channel, in the order of the pixel's bytes.
 /// \param scaleFactor          any number; negative ones multiply. Above 16 every result is 0.
 /// \return PK_Success, also for a width or height of 0, which does nothing with any pointers; PK_ErrFailed for
-<<<<<<< HEAD
 ///         a null pointer, a negative width or height or a width too great.
-=======
-///         a null pointer or a negative width or height.
->>>>>>> tool2
 PK_API PK_Result PK_MultiplyByConstant(int32_t width, int32_t height, const void* source,
                                        int32_t sourceRowBytes, void* destination, int32_t destinationRowBytes,
                                        const uint8_t constants[4], int32_t scaleFactor) noexcept;

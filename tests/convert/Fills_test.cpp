@@ -175,11 +175,8 @@ TEST(NamedFills, RefuseOrLeaveWhatTheyCannotFill) {
             EXPECT_EQ(fill(pixels, 64, 1, 1, format), PK_Success);
         EXPECT_EQ(fill(nullptr, 64, 1, 1, PK_PixelFormat_BGRA_4444_8u), PK_ErrFailed);
         EXPECT_EQ(fill(pixels, 64, -1, 1, PK_PixelFormat_BGRA_4444_8u), PK_ErrFailed);
-<<<<<<< HEAD
         EXPECT_EQ(fill(pixels, 64, 0x08000000, 1, PK_PixelFormat_BGRA_4444_8u), PK_ErrFailed);
         EXPECT_EQ(fill(pixels, 64, INT32_MAX, 1, PK_PixelFormat_V210_422_10u), PK_ErrFailed);
-=======
->>>>>>> tool2
         EXPECT_EQ(fill(pixels, 64, 1, -1, PK_PixelFormat_V210_422_10u), PK_ErrFailed);
         EXPECT_EQ(fill(nullptr, 64, 0, 1, PK_PixelFormat_BGRA_4444_8u), PK_Success);
         EXPECT_EQ(fill(nullptr, 64, 1, 0, PK_PixelFormat_V210_422_10u), PK_Success);
@@ -360,12 +357,9 @@ TEST(FillWithColor, RefusesWhatItCannotFill) {
     EXPECT_EQ(PK_FillWithColor(nullptr, 64, 1, 1, kBGRA, colour, kBGRA), PK_ErrFailed);
     EXPECT_EQ(PK_FillWithColor(pixels, 64, 1, 1, kBGRA, nullptr, kBGRA), PK_ErrFailed);
     EXPECT_EQ(PK_FillWithColor(pixels, 64, -1, 1, kBGRA, colour, kBGRA), PK_ErrFailed);
-<<<<<<< HEAD
     EXPECT_EQ(PK_FillWithColor(pixels, 64, INT32_MAX, 1, kBGRA, colour, kBGRA), PK_ErrFailed);
     EXPECT_EQ(PK_FillWithColor(pixels, 64, INT32_MAX, 1, PK_PixelFormat_V210_422_10u, colour, kBGRA),
               PK_ErrFailed);
-=======
->>>>>>> tool2
     EXPECT_EQ(PK_FillWithColor(pixels, 64, 1, -1, kBGRA, colour, kBGRA), PK_ErrFailed);
     EXPECT_EQ(PK_FillWithColor(nullptr, 64, 0, 1, kBGRA, nullptr, kBGRA), PK_Success);
     EXPECT_EQ(pixels[0], 7);

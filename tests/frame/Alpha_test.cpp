@@ -1,9 +1,5 @@
 // Alpha of whole images, as a caller sees it: formats, sizes, rows and refusals.
 
-<<<<<<< HEAD
-=======
-#include "support/FlagScope.h"
->>>>>>> tool2
 #include "support/FloatEnvironment.h"
 #include "support/Random.h"
 
@@ -40,11 +36,7 @@ struct Layout {
     }
 };
 
-<<<<<<< HEAD
 /// Calls change(place of the alpha sample) for each pixel.
-=======
-/// Calls change(alpha bytes in both images) for each pixel of the lower-memory order.
->>>>>>> tool2
 template <class Change>
 void ForEachAlpha(const Layout& layout, Change change) {
     for (int32_t row = 0; row < kHeight; ++row)
@@ -109,10 +101,7 @@ TEST(SetAlphaChannel, RefusesImpossibleArguments) {
     constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u;
     EXPECT_EQ(PK_SetAlphaChannel(1, 1, nullptr, 4, kBGRA, true), PK_ErrFailed);
     EXPECT_EQ(PK_SetAlphaChannel(-1, 1, pixel, 4, kBGRA, true), PK_ErrFailed);
-<<<<<<< HEAD
     EXPECT_EQ(PK_SetAlphaChannel(0x08000000, 1, pixel, 4, kBGRA, true), PK_ErrFailed);
-=======
->>>>>>> tool2
     EXPECT_EQ(PK_SetAlphaChannel(1, -1, pixel, 4, kBGRA, true), PK_ErrFailed);
     EXPECT_EQ(PK_SetAlphaChannel(0, 1, nullptr, 4, kBGRA, true), PK_Success);
     EXPECT_EQ(PK_SetAlphaChannel(1, 0, nullptr, 4, kBGRA, true), PK_Success);
@@ -162,10 +151,7 @@ TEST(InvertAlpha, RefusesImpossibleArguments) {
     EXPECT_EQ(PK_InvertAlpha(nullptr, 4, pixel, 4, kBGRA, 1, 1), PK_ErrFailed);
     EXPECT_EQ(PK_InvertAlpha(pixel, 4, nullptr, 4, kBGRA, 1, 1), PK_ErrFailed);
     EXPECT_EQ(PK_InvertAlpha(pixel, 4, pixel, 4, kBGRA, -1, 1), PK_ErrFailed);
-<<<<<<< HEAD
     EXPECT_EQ(PK_InvertAlpha(pixel, 4, pixel, 4, kBGRA, INT32_MAX, 1), PK_ErrFailed);
-=======
->>>>>>> tool2
     EXPECT_EQ(PK_InvertAlpha(pixel, 4, pixel, 4, kBGRA, 1, -1), PK_ErrFailed);
     EXPECT_EQ(PK_InvertAlpha(nullptr, 4, nullptr, 4, kBGRA, 0, 1), PK_Success);
     EXPECT_EQ(PK_InvertAlpha(nullptr, 4, nullptr, 4, kBGRA, 1, 0), PK_Success);
@@ -191,7 +177,6 @@ TEST(CopyAndSetAlpha, CopiesColourWithOneAlpha) {
         for (int32_t row = 0; row < kHeight; ++row)
             std::copy_n(source.data() + row * layout.step, layout.rowLength,
                         expected.data() + row * layout.step);
-<<<<<<< HEAD
         const uint16_t words = 6554; // 6553.6
         Bytes alpha = BytesOf(format, FullOf(format), 0.2f);
         if (alpha.size() == 2) std::memcpy(alpha.data(), &words, 2);
@@ -208,26 +193,6 @@ TEST(CopyAndSetAlpha, CopiesColourWithOneAlpha) {
         EXPECT_EQ(image, expected);
         EXPECT_EQ(copy(inPlace, inPlace), PK_Success);
         EXPECT_EQ(inPlace, expectedInPlace);
-=======
-        const Bytes alpha = BytesOf(format, FullOf(format), 0.2f); // 51 of 255; 6553.6 of 32768
-        const uint16_t rounded = 6554;
-        ForEachAlpha(layout, [&](size_t at) {
-            std::copy(alpha.begin(), alpha.end(), expected.data() + at);
-            if (alpha.size() == 2) std::memcpy(expected.data() + at, &rounded, 2);
-        });
-        EXPECT_EQ(PK_CopyAndSetAlpha(source.data(), layout.step, image.data(), layout.step, format, kWidth,
-                                     kHeight, 0.2f),
-                  PK_Success);
-        EXPECT_EQ(image, expected);
-        Bytes inPlace = source;
-        EXPECT_EQ(PK_CopyAndSetAlpha(inPlace.data(), layout.step, inPlace.data(), layout.step, format, kWidth,
-                                     kHeight, 0.2f),
-                  PK_Success);
-        ForEachAlpha(layout, [&](size_t at) {
-            EXPECT_TRUE(std::equal(alpha.begin(), alpha.begin() + (alpha.size() == 2 ? 0 : alpha.size()),
-                                   inPlace.data() + at));
-        });
->>>>>>> tool2
     }
 }
 
@@ -292,10 +257,7 @@ TEST(CopyAndSetAlpha, DoesNothingBelowOnePixelAndRefusesNull) {
     EXPECT_EQ(PK_CopyAndSetAlpha(pixel, 4, pixel, 4, kBGRA, 1, -5, 1), PK_Success);
     EXPECT_EQ(PK_CopyAndSetAlpha(nullptr, 4, pixel, 4, kBGRA, 1, 1, 1), PK_ErrFailed);
     EXPECT_EQ(PK_CopyAndSetAlpha(pixel, 4, nullptr, 4, kBGRA, 1, 1, 1), PK_ErrFailed);
-<<<<<<< HEAD
     EXPECT_EQ(PK_CopyAndSetAlpha(pixel, 4, pixel, 4, kBGRA, INT32_MAX, 1, 1), PK_ErrFailed);
-=======
->>>>>>> tool2
     EXPECT_EQ(PK_CopyAndSetAlpha(pixel, 4, pixel, 4, 0x01000004, 1, 1, 1), PK_ErrNotSupported);
     EXPECT_EQ(pixel[3], 4);
 }

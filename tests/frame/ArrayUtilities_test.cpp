@@ -24,10 +24,7 @@ TEST(MultiplyByConstant, RefusesImpossibleArguments) {
     EXPECT_EQ(PK_MultiplyByConstant(1, 1, pixel, 4, nullptr, 4, pixel, 0), PK_ErrFailed);
     EXPECT_EQ(PK_MultiplyByConstant(1, 1, pixel, 4, pixel, 4, nullptr, 0), PK_ErrFailed);
     EXPECT_EQ(PK_MultiplyByConstant(-1, 1, pixel, 4, pixel, 4, pixel, 0), PK_ErrFailed);
-<<<<<<< HEAD
     EXPECT_EQ(PK_MultiplyByConstant(INT32_MAX, 1, pixel, 4, pixel, 4, pixel, 0), PK_ErrFailed);
-=======
->>>>>>> tool2
     EXPECT_EQ(PK_MultiplyByConstant(0, -1, pixel, 4, pixel, 4, pixel, 0), PK_ErrFailed);
     EXPECT_EQ(PK_MultiplyByConstant(-1, 0, pixel, 4, pixel, 4, pixel, 0), PK_ErrFailed);
     EXPECT_EQ(PK_MultiplyByConstant(0, 1, nullptr, 4, nullptr, 4, nullptr, 0), PK_Success);
