@@ -1,6 +1,5 @@
 #include "convert/FillImage.h"
 
-#include "frame/Dispatch.h"
 #include "primitives/FillPixels.h"
 
 #include <PixelKiln/Buffers.h>
@@ -26,7 +25,7 @@ template <class Sample, class Fill>
 int32_t FillWith(Fill fill, const DestinationImage& image, const FillUnit& unit, int32_t units) {
     Sample samples[4];
     std::memcpy(samples, unit.bytes, sizeof samples);
-    return fill(Best<FillKernels>(), samples, image.pixels, image.rowBytes, units, image.height);
+    return fill(samples, image.pixels, image.rowBytes, units, image.height);
 }
 
 } // namespace

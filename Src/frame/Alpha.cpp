@@ -96,19 +96,16 @@ std::optional<Inversion> InversionOf(PK_PixelFormat format) {
 }
 
 int32_t SetAlpha8u(int32_t width, int32_t height, uint8_t* pixels, int32_t rowBytes, bool opaque) {
-    return SetChannel8u(Best<ChannelKernels>(), opaque ? kFull8 : uint8_t{0}, pixels + 3, rowBytes, width,
-                        height);
+    return SetChannel8u(opaque ? kFull8 : uint8_t{0}, pixels + 3, rowBytes, width, height);
 }
 
 int32_t SetAlpha15u(int32_t width, int32_t height, uint8_t* pixels, int32_t rowBytes, bool opaque) {
-    return SetChannel16u(Best<ChannelKernels>(), opaque ? kFull15 : uint16_t{0}, pixels + 6, rowBytes, width,
-                         height);
+    return SetChannel16u(opaque ? kFull15 : uint16_t{0}, pixels + 6, rowBytes, width, height);
 }
 
 template <int kOffset>
 int32_t SetAlpha32f(int32_t width, int32_t height, uint8_t* pixels, int32_t rowBytes, bool opaque) {
-    return SetChannel32f(Best<ChannelKernels>(), opaque ? 1.0f : 0.0f, pixels + kOffset, rowBytes, width,
-                         height);
+    return SetChannel32f(opaque ? 1.0f : 0.0f, pixels + kOffset, rowBytes, width, height);
 }
 
 using SetAlpha = int32_t (*)(int32_t width, int32_t height, uint8_t* pixels, int32_t rowBytes, bool opaque);

@@ -1,6 +1,5 @@
 // The primitives on arrays of samples, as a host calls them.
 
-#include "frame/Dispatch.h"
 #include "frame/PixelFormat.h"
 #include "primitives/ALaw.h"
 #include "primitives/ConvertFloat.h"
@@ -25,26 +24,24 @@ PK_Result PK_MultiplyByConstant(int32_t width, int32_t height, const void* sourc
                                 int32_t scaleFactor) noexcept {
     if ((width == 0 && height >= 0) || (height == 0 && width >= 0)) return PK_Success;
     if (width > kMaximumWidth) return PK_ErrFailed;
-    return ResultOf(MultiplyConstant(Best<MultiplyConstantKernels>(), static_cast<const uint8_t*>(source),
-                                     sourceRowBytes, constants, static_cast<uint8_t*>(destination),
-                                     destinationRowBytes, width, height, scaleFactor));
+    return ResultOf(MultiplyConstant(static_cast<const uint8_t*>(source), sourceRowBytes, constants,
+                                     static_cast<uint8_t*>(destination), destinationRowBytes, width, height,
+                                     scaleFactor));
 }
 
 PK_Result PK_Convert_32f32sSfs(const float* source, int32_t* destination, int32_t length, int32_t rounding,
                                int32_t scaleFactor) noexcept {
     if (length == 0) return PK_Success;
-    return ResultOf(
-        ConvertFloatToInt32(Best<ConvertFloatKernels>(), source, destination, length, rounding, scaleFactor));
+    return ResultOf(ConvertFloatToInt32(source, destination, length, rounding, scaleFactor));
 }
 
 PK_Result PK_Convert_32f16sSfs(const float* source, int16_t* destination, int32_t length, int32_t rounding,
                                int32_t scaleFactor) noexcept {
     if (length == 0) return PK_Success;
-    return ResultOf(
-        ConvertFloatToInt16(Best<ConvertFloatKernels>(), source, destination, length, rounding, scaleFactor));
+    return ResultOf(ConvertFloatToInt16(source, destination, length, rounding, scaleFactor));
 }
 
 PK_Result PK_DecodeALawTo16Bit(const uint8_t* source, int32_t length, int16_t* destination) noexcept {
     if (length == 0) return PK_Success;
-    return ResultOf(ALawToLinear16(Best<ALawKernels>(), source, destination, length));
+    return ResultOf(ALawToLinear16(source, destination, length));
 }

@@ -1,14 +1,15 @@
 #include "primitives/ALaw.h"
 
+#include "frame/Dispatch.h"
 #include "primitives/Status.h"
 
 namespace PK {
 
-int32_t ALawToLinear16(const ALawKernels& kernels, const uint8_t* source, int16_t* destination,
-                       int32_t count) noexcept {
+int32_t ALawToLinear16(const uint8_t* source, int16_t* destination, int32_t count) noexcept {
     if (source == nullptr || destination == nullptr) return kStatusNullPointer;
     if (count < 0) return kStatusBadSize;
-    kernels.toLinear16(source, reinterpret_cast<uint8_t*>(destination), static_cast<size_t>(count));
+    Best<ALawKernels>().toLinear16(source, reinterpret_cast<uint8_t*>(destination),
+                                   static_cast<size_t>(count));
     return kStatusOk;
 }
 

@@ -18,9 +18,7 @@ struct ALawKernels {
 };
 
 /// A-law codes to 16-bit linear samples: the 13 bits of the law, sign included, in the highest places.
-/// \param kernels  the bodies to run.
 /// \return 0; -8 for a null pointer, -6 for a negative count.
-int32_t ALawToLinear16(const ALawKernels& kernels, const uint8_t* source, int16_t* destination,
-                       int32_t count) noexcept;
+int32_t ALawToLinear16(const uint8_t* source, int16_t* destination, int32_t count) noexcept;
 
 } // namespace PK

@@ -1,5 +1,6 @@
 #include "primitives/Channels.h"
 
+#include "frame/Dispatch.h"
 #include "primitives/Status.h"
 
 #include <cstring>
@@ -24,11 +25,11 @@ ChannelPattern Pattern(int32_t channel, Sample value) {
 }
 
 template <class Sample>
-int32_t SetChannel(const ChannelKernels& kernels, Sample value, uint8_t* channelStart, ptrdiff_t step,
-                   int32_t width, int32_t height) {
+int32_t SetChannel(Sample value, uint8_t* channelStart, ptrdiff_t step, int32_t width, int32_t height) {
     if (channelStart == nullptr) return kStatusNullPointer;
     if (width < 0 || height < 0) return kStatusBadSize;
     if (width == 0) return kStatusOk;
+    const ChannelKernels& kernels = Best<ChannelKernels>();
     const ChannelPattern pattern = Pattern(0, value);
     const size_t bytes = (static_cast<size_t>(width - 1) * kChannels + 1) * sizeof value;
     for (ptrdiff_t row = 0; row < height; ++row) {
@@ -52,19 +53,19 @@ ChannelPattern PatternOfChannel(int32_t channel, float value) noexcept {
     return Pattern(channel, value);
 }
 
-int32_t SetChannel8u(const ChannelKernels& kernels, uint8_t value, uint8_t* channelStart, ptrdiff_t step,
-                     int32_t width, int32_t height) noexcept {
-    return SetChannel(kernels, value, channelStart, step, width, height);
+int32_t SetChannel8u(uint8_t value, uint8_t* channelStart, ptrdiff_t step, int32_t width,
+                     int32_t height) noexcept {
+    return SetChannel(value, channelStart, step, width, height);
 }
 
-int32_t SetChannel16u(const ChannelKernels& kernels, uint16_t value, uint8_t* channelStart, ptrdiff_t step,
-                      int32_t width, int32_t height) noexcept {
-    return SetChannel(kernels, value, channelStart, step, width, height);
+int32_t SetChannel16u(uint16_t value, uint8_t* channelStart, ptrdiff_t step, int32_t width,
+                      int32_t height) noexcept {
+    return SetChannel(value, channelStart, step, width, height);
 }
 
-int32_t SetChannel32f(const ChannelKernels& kernels, float value, uint8_t* channelStart, ptrdiff_t step,
-                      int32_t width, int32_t height) noexcept {
-    return SetChannel(kernels, value, channelStart, step, width, height);
+int32_t SetChannel32f(float value, uint8_t* channelStart, ptrdiff_t step, int32_t width,
+                      int32_t height) noexcept {
+    return SetChannel(value, channelStart, step, width, height);
 }
 
 } // namespace PK

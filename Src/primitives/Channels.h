@@ -37,16 +37,15 @@ ChannelPattern PatternOfChannel(int32_t channel, uint16_t value) noexcept;
 ChannelPattern PatternOfChannel(int32_t channel, float value) noexcept;
 
 /// Writes a value to one channel of `height` rows of `width` pixels.
-/// \param kernels       the bodies to run.
 /// \param channelStart  the sample of the first pixel; what lies before it is not touched, nor what lies
 ///                      behind the sample of the last pixel.
 /// \param step          bytes from one row to the next, of either sign.
 /// \return 0; -8 for a null pointer, -6 for a negative width or height.
-int32_t SetChannel8u(const ChannelKernels& kernels, uint8_t value, uint8_t* channelStart, ptrdiff_t step,
-                     int32_t width, int32_t height) noexcept;
-int32_t SetChannel16u(const ChannelKernels& kernels, uint16_t value, uint8_t* channelStart, ptrdiff_t step,
-                      int32_t width, int32_t height) noexcept;
-int32_t SetChannel32f(const ChannelKernels& kernels, float value, uint8_t* channelStart, ptrdiff_t step,
-                      int32_t width, int32_t height) noexcept;
+int32_t SetChannel8u(uint8_t value, uint8_t* channelStart, ptrdiff_t step, int32_t width,
+                     int32_t height) noexcept;
+int32_t SetChannel16u(uint16_t value, uint8_t* channelStart, ptrdiff_t step, int32_t width,
+                      int32_t height) noexcept;
+int32_t SetChannel32f(float value, uint8_t* channelStart, ptrdiff_t step, int32_t width,
+                      int32_t height) noexcept;
 
 } // namespace PK

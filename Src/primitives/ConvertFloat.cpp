@@ -1,5 +1,6 @@
 #include "primitives/ConvertFloat.h"
 
+#include "frame/Dispatch.h"
 #include "primitives/Status.h"
 
 #include <algorithm>
@@ -46,14 +47,16 @@ int32_t Convert(ConvertFloatKernels::Run run, const void* source, void* destinat
 
 } // namespace
 
-int32_t ConvertFloatToInt32(const ConvertFloatKernels& kernels, const float* source, int32_t* destination,
-                            int32_t count, int32_t roundMode, int32_t scale) noexcept {
+int32_t ConvertFloatToInt32(const float* source, int32_t* destination, int32_t count, int32_t roundMode,
+                            int32_t scale) noexcept {
+    const ConvertFloatKernels& kernels = Best<ConvertFloatKernels>();
     const auto run = roundMode == kRoundNearest ? kernels.nearestToInt32 : kernels.truncatedToInt32;
     return Convert(run, source, destination, count, scale);
 }
 
-int32_t ConvertFloatToInt16(const ConvertFloatKernels& kernels, const float* source, int16_t* destination,
-                            int32_t count, int32_t roundMode, int32_t scale) noexcept {
+int32_t ConvertFloatToInt16(const float* source, int16_t* destination, int32_t count, int32_t roundMode,
+                            int32_t scale) noexcept {
+    const ConvertFloatKernels& kernels = Best<ConvertFloatKernels>();
     const auto run = roundMode == kRoundNearest ? kernels.nearestToInt16 : kernels.truncatedToInt16;
     return Convert(run, source, destination, count, scale);
 }

@@ -29,13 +29,12 @@ inline constexpr int32_t kRoundNearest = 1; // ties to even
 
 /// destination[i] = saturate(round(source[i] x 2^-scale)), whatever rounding mode the caller has set, which
 /// stays. NaN gives 0. The 32-bit form may work in place.
-/// \param kernels    the bodies to run.
 /// \param roundMode  kRoundNearest; anything else truncates towards zero.
 /// \param scale      any number.
 /// \return 0; -8 for a null pointer, -6 for a negative count.
-int32_t ConvertFloatToInt32(const ConvertFloatKernels& kernels, const float* source, int32_t* destination,
-                            int32_t count, int32_t roundMode, int32_t scale) noexcept;
-int32_t ConvertFloatToInt16(const ConvertFloatKernels& kernels, const float* source, int16_t* destination,
-                            int32_t count, int32_t roundMode, int32_t scale) noexcept;
+int32_t ConvertFloatToInt32(const float* source, int32_t* destination, int32_t count, int32_t roundMode,
+                            int32_t scale) noexcept;
+int32_t ConvertFloatToInt16(const float* source, int16_t* destination, int32_t count, int32_t roundMode,
+                            int32_t scale) noexcept;
 
 } // namespace PK

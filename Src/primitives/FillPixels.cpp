@@ -1,5 +1,6 @@
 #include "primitives/FillPixels.h"
 
+#include "frame/Dispatch.h"
 #include "primitives/Status.h"
 
 #include <algorithm>
@@ -64,8 +65,8 @@ void FillLongRun(const FillKernels& kernels, uint8_t* destination, size_t bytes,
     kernels.run(destination + head + lines, bytes - head - lines, aligned);
 }
 
-int32_t FillPixels(const FillKernels& kernels, const void* value, size_t pixelBytes, uint8_t* destination,
-                   ptrdiff_t step, int32_t width, int32_t height) {
+int32_t FillPixels(const void* value, size_t pixelBytes, uint8_t* destination, ptrdiff_t step, int32_t width,
+                   int32_t height) {
     if (value == nullptr || destination == nullptr) return kStatusNullPointer;
     if (width < 0 || height < 0) return kStatusBadSize;
     size_t bytes = static_cast<size_t>(width) * pixelBytes;
@@ -75,6 +76,7 @@ int32_t FillPixels(const FillKernels& kernels, const void* value, size_t pixelBy
         rows = std::min<ptrdiff_t>(rows, 1);
     }
     const FillPattern pattern = Repeat(value, pixelBytes);
+    const FillKernels& kernels = Best<FillKernels>();
     for (ptrdiff_t row = 0; row < rows; ++row) {
         if (bytes < kStringFrom)
             kernels.run(destination + row * step, bytes, pattern);
@@ -86,19 +88,19 @@ int32_t FillPixels(const FillKernels& kernels, const void* value, size_t pixelBy
 
 } // namespace
 
-int32_t FillPixels4x8u(const FillKernels& kernels, const uint8_t value[4], uint8_t* destination,
-                       ptrdiff_t step, int32_t width, int32_t height) noexcept {
-    return FillPixels(kernels, value, 4, destination, step, width, height);
+int32_t FillPixels4x8u(const uint8_t value[4], uint8_t* destination, ptrdiff_t step, int32_t width,
+                       int32_t height) noexcept {
+    return FillPixels(value, 4, destination, step, width, height);
 }
 
-int32_t FillPixels4x16u(const FillKernels& kernels, const uint16_t value[4], uint8_t* destination,
-                        ptrdiff_t step, int32_t width, int32_t height) noexcept {
-    return FillPixels(kernels, value, 8, destination, step, width, height);
+int32_t FillPixels4x16u(const uint16_t value[4], uint8_t* destination, ptrdiff_t step, int32_t width,
+                        int32_t height) noexcept {
+    return FillPixels(value, 8, destination, step, width, height);
 }
 
-int32_t FillPixels4x32f(const FillKernels& kernels, const float value[4], uint8_t* destination,
-                        ptrdiff_t step, int32_t width, int32_t height) noexcept {
-    return FillPixels(kernels, value, 16, destination, step, width, height);
+int32_t FillPixels4x32f(const float value[4], uint8_t* destination, ptrdiff_t step, int32_t width,
+                        int32_t height) noexcept {
+    return FillPixels(value, 16, destination, step, width, height);
 }
 
 } // namespace PK

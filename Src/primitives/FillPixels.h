@@ -25,15 +25,14 @@ struct FillKernels {
 };
 
 /// Fills `height` rows of `width` pixels.
-/// \param kernels  the bodies to run.
 /// \param value    the pixel.
 /// \param step     bytes from one row to the next, of either sign.
 /// \return 0; -8 for a null pointer, -6 for a negative width or height.
-int32_t FillPixels4x8u(const FillKernels& kernels, const uint8_t value[4], uint8_t* destination,
-                       ptrdiff_t step, int32_t width, int32_t height) noexcept;
-int32_t FillPixels4x16u(const FillKernels& kernels, const uint16_t value[4], uint8_t* destination,
-                        ptrdiff_t step, int32_t width, int32_t height) noexcept;
-int32_t FillPixels4x32f(const FillKernels& kernels, const float value[4], uint8_t* destination,
-                        ptrdiff_t step, int32_t width, int32_t height) noexcept;
+int32_t FillPixels4x8u(const uint8_t value[4], uint8_t* destination, ptrdiff_t step, int32_t width,
+                       int32_t height) noexcept;
+int32_t FillPixels4x16u(const uint16_t value[4], uint8_t* destination, ptrdiff_t step, int32_t width,
+                        int32_t height) noexcept;
+int32_t FillPixels4x32f(const float value[4], uint8_t* destination, ptrdiff_t step, int32_t width,
+                        int32_t height) noexcept;
 
 } // namespace PK

@@ -1,5 +1,6 @@
 #include "primitives/MultiplyConstant.h"
 
+#include "frame/Dispatch.h"
 #include "primitives/Status.h"
 
 #include <algorithm>
@@ -29,11 +30,12 @@ ChannelFactors ScaledFactors(const uint8_t value[4], int32_t scale) {
 
 } // namespace
 
-int32_t MultiplyConstant(const MultiplyConstantKernels& kernels, const uint8_t* source, ptrdiff_t sourceStep,
-                         const uint8_t value[4], uint8_t* destination, ptrdiff_t destinationStep,
-                         int32_t width, int32_t height, int32_t scale) noexcept {
+int32_t MultiplyConstant(const uint8_t* source, ptrdiff_t sourceStep, const uint8_t value[4],
+                         uint8_t* destination, ptrdiff_t destinationStep, int32_t width, int32_t height,
+                         int32_t scale) noexcept {
     if (source == nullptr || value == nullptr || destination == nullptr) return kStatusNullPointer;
     if (width < 0 || height < 0) return kStatusBadSize;
+    const MultiplyConstantKernels& kernels = Best<MultiplyConstantKernels>();
     const bool isScaled = scale > 0;
     const auto multiplyRow = isScaled ? kernels.scaled : kernels.unscaled;
     const ChannelFactors factors = isScaled ? ScaledFactors(value, scale) : UnscaledFactors(value, scale);

@@ -28,12 +28,11 @@ struct MultiplyConstantKernels {
 
 /// destination = saturate(round(source x value x 2^-scale)), channel by channel; to the nearest, ties to
 /// even. Works in place.
-/// \param kernels  the bodies to run.
 /// \param value    the constants of the four channels.
 /// \param scale    any number.
 /// \return 0; -8 for a null pointer, -6 for a negative width or height.
-int32_t MultiplyConstant(const MultiplyConstantKernels& kernels, const uint8_t* source, ptrdiff_t sourceStep,
-                         const uint8_t value[4], uint8_t* destination, ptrdiff_t destinationStep,
-                         int32_t width, int32_t height, int32_t scale) noexcept;
+int32_t MultiplyConstant(const uint8_t* source, ptrdiff_t sourceStep, const uint8_t value[4],
+                         uint8_t* destination, ptrdiff_t destinationStep, int32_t width, int32_t height,
+                         int32_t scale) noexcept;
 
 } // namespace PK

@@ -2,8 +2,9 @@
 
 #include "primitives/ALaw.h"
 
-#include "support/EnabledTargets.h"
+#include "primitives/Targets.h"
 #include "support/RowBuffer.h"
+#include "support/TargetScope.h"
 
 #include <cstring>
 #include <gtest/gtest.h>
@@ -23,9 +24,8 @@ int16_t Expected(uint8_t code) {
 
 std::vector<int16_t> Decode(Target target, const std::vector<uint8_t>& codes) {
     std::vector<int16_t> samples(codes.size());
-    EXPECT_EQ(ALawToLinear16(KernelsFor<ALawKernels>(target), codes.data(), samples.data(),
-                             static_cast<int32_t>(codes.size())),
-              0);
+    const TargetScope scope(target);
+    EXPECT_EQ(ALawToLinear16(codes.data(), samples.data(), static_cast<int32_t>(codes.size())), 0);
     return samples;
 }
 
@@ -33,12 +33,12 @@ TEST(ALaw, DecodesKnownCodes) {
     // least, end of segment 0, begin of 1, begin of 2, greatest; positive and negative
     const std::vector<uint8_t> codes = {0xd5, 0x55, 0xda, 0xc5, 0xf5, 0xaa, 0x2a, 0x80, 0x00};
     const std::vector<int16_t> samples = {8, -8, 248, 264, 528, 32256, -32256, 5504, -5504};
-    for (const Target target : EnabledTargets())
+    for (const Target target : TargetsOfThisProcessor())
         EXPECT_EQ(Decode(target, codes), samples) << TargetName(target);
 }
 
 TEST(ALaw, DecodesEveryCodeAtEveryPlace) {
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (int32_t shift = 0; shift < 256; ++shift) {
             std::vector<uint8_t> codes(256);
             std::vector<int16_t> expected(256);
@@ -52,15 +52,16 @@ TEST(ALaw, DecodesEveryCodeAtEveryPlace) {
 }
 
 TEST(ALaw, TouchesExactlyItsElements) {
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
+        const TargetScope scope(target);
         for (size_t count = 0; count <= 140; ++count) {
             for (const Placement place :
                  {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
                   Placement{Placement::kAtOffset, 1}}) {
                 const RowBuffer source(count, place), result(2 * count, place);
                 for (size_t i = 0; i < count; ++i) source.Data()[i] = static_cast<uint8_t>(i * 37);
-                ALawToLinear16(KernelsFor<ALawKernels>(target), source.Data(),
-                               reinterpret_cast<int16_t*>(result.Data()), static_cast<int32_t>(count));
+                ALawToLinear16(source.Data(), reinterpret_cast<int16_t*>(result.Data()),
+                               static_cast<int32_t>(count));
                 for (size_t i = 0; i < count; ++i) {
                     int16_t sample;
                     std::memcpy(&sample, result.Data() + 2 * i, sizeof sample);
@@ -76,10 +77,9 @@ TEST(ALaw, TouchesExactlyItsElements) {
 TEST(ALaw, RefusesNullPointersAndNegativeCounts) {
     const uint8_t code = 0;
     int16_t sample = 5;
-    const ALawKernels& kernels = KernelsFor<ALawKernels>(Target::plain);
-    EXPECT_EQ(ALawToLinear16(kernels, nullptr, &sample, 1), -8);
-    EXPECT_EQ(ALawToLinear16(kernels, &code, nullptr, 1), -8);
-    EXPECT_EQ(ALawToLinear16(kernels, &code, &sample, -1), -6);
+    EXPECT_EQ(ALawToLinear16(nullptr, &sample, 1), -8);
+    EXPECT_EQ(ALawToLinear16(&code, nullptr, 1), -8);
+    EXPECT_EQ(ALawToLinear16(&code, &sample, -1), -6);
     EXPECT_EQ(sample, 5);
 }
 

@@ -2,9 +2,10 @@
 
 #include "primitives/Channels.h"
 
-#include "support/EnabledTargets.h"
+#include "primitives/Targets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
+#include "support/TargetScope.h"
 
 #include <algorithm>
 #include <cmath>
@@ -23,24 +24,22 @@ constexpr Placement kPlaces[] = {{Placement::kBeforeGuard},
                                  {Placement::kAtOffset, 4},
                                  {Placement::kAtOffset, 7}};
 
-int32_t Set(const ChannelKernels& kernels, uint8_t value, uint8_t* start, ptrdiff_t step, int32_t width,
-            int32_t height) {
-    return SetChannel8u(kernels, value, start, step, width, height);
+int32_t Set(uint8_t value, uint8_t* start, ptrdiff_t step, int32_t width, int32_t height) {
+    return SetChannel8u(value, start, step, width, height);
 }
-int32_t Set(const ChannelKernels& kernels, uint16_t value, uint8_t* start, ptrdiff_t step, int32_t width,
-            int32_t height) {
-    return SetChannel16u(kernels, value, start, step, width, height);
+int32_t Set(uint16_t value, uint8_t* start, ptrdiff_t step, int32_t width, int32_t height) {
+    return SetChannel16u(value, start, step, width, height);
 }
-int32_t Set(const ChannelKernels& kernels, float value, uint8_t* start, ptrdiff_t step, int32_t width,
-            int32_t height) {
-    return SetChannel32f(kernels, value, start, step, width, height);
+int32_t Set(float value, uint8_t* start, ptrdiff_t step, int32_t width, int32_t height) {
+    return SetChannel32f(value, start, step, width, height);
 }
 
 /// Sets the channel of single rows that end with their last sample, and compares sample by sample.
 template <class Sample>
 void CheckSet(Sample value) {
     Random random(21);
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
+        const TargetScope scope(target);
         for (const Placement place : kPlaces) {
             for (size_t width = 1; width <= 70; ++width) {
                 SCOPED_TRACE(testing::Message()
@@ -50,9 +49,7 @@ void CheckSet(Sample value) {
                 std::vector<uint8_t> expected(row.Data(), row.Data() + row.Size());
                 for (size_t x = 0; x < width; ++x)
                     std::memcpy(expected.data() + 4 * x * sizeof value, &value, sizeof value);
-                ASSERT_EQ(Set(KernelsFor<ChannelKernels>(target), value, row.Data(), 0,
-                              static_cast<int32_t>(width), 1),
-                          0);
+                ASSERT_EQ(Set(value, row.Data(), 0, static_cast<int32_t>(width), 1), 0);
                 ASSERT_TRUE(std::equal(expected.begin(), expected.end(), row.Data()));
                 ASSERT_TRUE(row.MarginsIntact());
             }
@@ -70,20 +67,19 @@ TEST(SetChannel, WalksRowsOfEitherStep) {
     for (const ptrdiff_t step : {12, -12}) {
         uint8_t rows[24] = {};
         uint8_t* start = step > 0 ? rows + 3 : rows + 15;
-        EXPECT_EQ(SetChannel8u(KernelsFor<ChannelKernels>(Target::plain), 255, start, step, 2, 2), 0);
+        EXPECT_EQ(SetChannel8u(255, start, step, 2, 2), 0);
         for (int i = 0; i < 24; ++i) EXPECT_EQ(rows[i], i % 12 < 8 && i % 4 == 3 ? 255 : 0) << i;
     }
 }
 
 TEST(SetChannel, RefusesNullPointersAndNegativeSizes) {
     uint8_t pixel[4] = {1, 2, 3, 4};
-    const ChannelKernels& kernels = KernelsFor<ChannelKernels>(Target::plain);
-    EXPECT_EQ(SetChannel8u(kernels, 0, nullptr, 4, 1, 1), -8);
-    EXPECT_EQ(SetChannel16u(kernels, 0, nullptr, 4, 1, 1), -8);
-    EXPECT_EQ(SetChannel32f(kernels, 0, nullptr, 4, 1, 1), -8);
-    EXPECT_EQ(SetChannel8u(kernels, 0, pixel, 4, -1, 1), -6);
-    EXPECT_EQ(SetChannel8u(kernels, 0, pixel, 4, 1, -1), -6);
-    EXPECT_EQ(SetChannel8u(kernels, 0, pixel, 4, 0, 1), 0);
+    EXPECT_EQ(SetChannel8u(0, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(SetChannel16u(0, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(SetChannel32f(0, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(SetChannel8u(0, pixel, 4, -1, 1), -6);
+    EXPECT_EQ(SetChannel8u(0, pixel, 4, 1, -1), -6);
+    EXPECT_EQ(SetChannel8u(0, pixel, 4, 0, 1), 0);
     EXPECT_EQ(pixel[0], 1);
 }
 
@@ -93,7 +89,7 @@ TEST(SetChannel, RefusesNullPointersAndNegativeSizes) {
 template <class Sample, class RowOf, class Alpha>
 void CheckRow(RowOf rowOf, bool copiesColour, Sample patternValue, Alpha alpha) {
     Random random(22);
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (const int32_t channel : {0, 3}) {
             for (size_t width = 0; width <= 40; ++width) {
                 const Placement place = kPlaces[width % std::size(kPlaces)];
@@ -138,7 +134,7 @@ TEST(InvertChannel, SubtractsIntegersFromTheValueAndLeavesColour) {
 
 TEST(InvertChannel, SubtractsFloatsFromTheValueAndLeavesColour) {
     const float alphas[] = {0.0f, 1.0f, 0.25f, 1.5f, -0.1f, 3e38f, std::numeric_limits<float>::infinity()};
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (const int32_t channel : {0, 3}) {
             std::vector<float> row;
             for (const float alpha : alphas)
@@ -157,7 +153,7 @@ TEST(InvertChannel, SubtractsFloatsFromTheValueAndLeavesColour) {
 
 TEST(InvertChannel, LeavesColourThatIsNoNumber) {
     const float nan = std::numeric_limits<float>::signaling_NaN();
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         float row[4] = {nan, nan, nan, 0.25f}, before[4];
         std::memcpy(before, row, sizeof row);
         auto* bytes = reinterpret_cast<uint8_t*>(row);

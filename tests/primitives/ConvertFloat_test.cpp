@@ -2,10 +2,11 @@
 
 #include "primitives/ConvertFloat.h"
 
-#include "support/EnabledTargets.h"
+#include "primitives/Targets.h"
 #include "support/FloatEnvironment.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
+#include "support/TargetScope.h"
 
 #include <cmath>
 #include <cstring>
@@ -39,13 +40,13 @@ Integer Expected(float x, int32_t roundMode, int32_t scale) {
 
 int32_t Convert(Target target, const float* source, int32_t* destination, int32_t count, int32_t roundMode,
                 int32_t scale) {
-    return ConvertFloatToInt32(KernelsFor<ConvertFloatKernels>(target), source, destination, count, roundMode,
-                               scale);
+    const TargetScope scope(target);
+    return ConvertFloatToInt32(source, destination, count, roundMode, scale);
 }
 int32_t Convert(Target target, const float* source, int16_t* destination, int32_t count, int32_t roundMode,
                 int32_t scale) {
-    return ConvertFloatToInt16(KernelsFor<ConvertFloatKernels>(target), source, destination, count, roundMode,
-                               scale);
+    const TargetScope scope(target);
+    return ConvertFloatToInt16(source, destination, count, roundMode, scale);
 }
 
 template <class Integer>
@@ -77,7 +78,7 @@ TEST(ConvertFloat, GivesWhatIsWorkedOutByHand) {
     const std::vector<int32_t> truncated = {2, 3, -2, 2, -2, 7, 40000, 0};
     const std::vector<int16_t> halves = {1,  2, -1,    1,
                                          -1, 4, 20000, 0}; // nearest at scale 1: 1.25, 1.75, ... 3.5
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         std::vector<int32_t> result(source.size());
         Convert(target, source.data(), result.data(), 8, 1, 0);
         EXPECT_EQ(result, nearest) << TargetName(target);
@@ -93,7 +94,7 @@ TEST(ConvertFloat, GivesWhatIsWorkedOutByHand) {
 
 TEST(ConvertFloat, RoundsAndSaturatesAtEveryScale) {
     const std::vector<float> source = AwkwardFloats();
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (const int32_t roundMode : {0, 1, 2, -1}) {
             for (int32_t scale = -40; scale <= 40; ++scale) {
                 CheckAgainstReference<int32_t>(target, source, roundMode, scale);
@@ -110,7 +111,7 @@ TEST(ConvertFloat, RoundsAndSaturatesAtEveryScale) {
 
 TEST(ConvertFloat, RoundsRandomBitsAtAnyScale) {
     Random random(31);
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (int round = 0; round < 40; ++round) {
             std::vector<float> source(997);
             random.Fill(reinterpret_cast<uint8_t*>(source.data()), source.size() * sizeof(float));
@@ -124,7 +125,7 @@ TEST(ConvertFloat, RoundsRandomBitsAtAnyScale) {
 TEST(ConvertFloat, IsTheSameUnderEveryFloatingPointMode) {
     const std::vector<float> source = AwkwardFloats();
     for (const uint32_t bits : {kRoundDown, kRoundUp, kRoundToZero, kFlushToZero | kDenormalsAreZero}) {
-        for (const Target target : EnabledTargets()) {
+        for (const Target target : TargetsOfThisProcessor()) {
             for (const int32_t scale : {0, -140, 5}) {
                 std::vector<int32_t> result(source.size());
                 {
@@ -143,7 +144,7 @@ TEST(ConvertFloat, IsTheSameUnderEveryFloatingPointMode) {
 template <class Integer>
 void CheckEveryLength() {
     Random random(32);
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (size_t count = 0; count <= 70; ++count) {
             for (const Placement place :
                  {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
@@ -175,7 +176,7 @@ TEST(ConvertFloat, TouchesExactlyItsElements) {
 }
 
 TEST(ConvertFloat, To32BitsWorksInPlace) {
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         std::vector<float> floats(37);
         for (size_t i = 0; i < floats.size(); ++i) floats[i] = static_cast<float>(i) * 1.5f;
         std::vector<int32_t> expected(floats.size());

@@ -3,9 +3,10 @@
 
 #include "primitives/FillPixels.h"
 
-#include "support/EnabledTargets.h"
+#include "primitives/Targets.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
+#include "support/TargetScope.h"
 
 #include <algorithm>
 #include <cstring>
@@ -27,18 +28,18 @@ struct Rectangle {
 
 int32_t Fill(Target target, const std::vector<uint8_t>& pixel, uint8_t* destination, ptrdiff_t step,
              const Rectangle& size) {
-    const FillKernels& kernels = KernelsFor<FillKernels>(target);
+    const TargetScope scope(target);
     uint16_t words[4];
     float floats[4];
     switch (pixel.size()) {
     case 4:
-        return FillPixels4x8u(kernels, pixel.data(), destination, step, size.width, size.height);
+        return FillPixels4x8u(pixel.data(), destination, step, size.width, size.height);
     case 8:
         std::memcpy(words, pixel.data(), sizeof words);
-        return FillPixels4x16u(kernels, words, destination, step, size.width, size.height);
+        return FillPixels4x16u(words, destination, step, size.width, size.height);
     default:
         std::memcpy(floats, pixel.data(), sizeof floats);
-        return FillPixels4x32f(kernels, floats, destination, step, size.width, size.height);
+        return FillPixels4x32f(floats, destination, step, size.width, size.height);
     }
 }
 
@@ -69,7 +70,7 @@ void CheckFill(Target target, const std::vector<uint8_t>& pixel, const Rectangle
 
 TEST(FillPixels, FillsRowsOfEveryWidthAndAlignment) {
     Random random(11);
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (const size_t pixelBytes : {4, 8, 16}) {
             const std::vector<uint8_t> pixel = random.Bytes(pixelBytes);
             for (int32_t width = 1; width <= 80; ++width) {
@@ -89,7 +90,7 @@ TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
     constexpr int32_t kBytes = 1 << 20; // from here on runs are long
     std::vector<uint8_t> periodic = random.Bytes(16);
     std::copy_n(periodic.begin(), 8, periodic.begin() + 8);
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
         for (const std::vector<uint8_t>& pixel :
              {random.Bytes(4), random.Bytes(8), random.Bytes(16), periodic}) {
             const auto size = static_cast<int32_t>(pixel.size());
@@ -114,13 +115,12 @@ TEST(FillPixels, OfNothingWritesNothing) {
 
 TEST(FillPixels, RefusesNullPointersAndNegativeSizes) {
     uint8_t bytes[4] = {1, 2, 3, 4};
-    const FillKernels& kernels = KernelsFor<FillKernels>(Target::plain);
     const float floats[4] = {};
-    EXPECT_EQ(FillPixels4x8u(kernels, bytes, nullptr, 4, 1, 1), -8);
-    EXPECT_EQ(FillPixels4x16u(kernels, nullptr, bytes, 4, 1, 1), -8);
-    EXPECT_EQ(FillPixels4x32f(kernels, floats, nullptr, 4, 1, 1), -8);
-    EXPECT_EQ(FillPixels4x32f(kernels, floats, bytes, 4, -1, 1), -6);
-    EXPECT_EQ(FillPixels4x32f(kernels, floats, bytes, 4, 1, -1), -6);
+    EXPECT_EQ(FillPixels4x8u(bytes, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(FillPixels4x16u(nullptr, bytes, 4, 1, 1), -8);
+    EXPECT_EQ(FillPixels4x32f(floats, nullptr, 4, 1, 1), -8);
+    EXPECT_EQ(FillPixels4x32f(floats, bytes, 4, -1, 1), -6);
+    EXPECT_EQ(FillPixels4x32f(floats, bytes, 4, 1, -1), -6);
     EXPECT_EQ(bytes[0], 1);
 }
 

@@ -2,9 +2,10 @@
 
 #include "primitives/MultiplyConstant.h"
 
-#include "support/EnabledTargets.h"
+#include "primitives/Targets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
+#include "support/TargetScope.h"
 
 #include <algorithm>
 #include <cmath>
@@ -33,11 +34,11 @@ TEST(MultiplyConstant, GivesWhatIsWorkedOutByHand) {
     const uint8_t source[8] = {0, 1, 3, 255, 128, 2, 5, 254}, value[4] = {255, 128, 128, 2};
     const std::vector<uint8_t> scaled = {0, 0, 2, 2, 128, 1, 2, 2}; // 128 / 256 and 1.5 and 2.5 are ties
     const std::vector<uint8_t> unscaled = {0, 128, 255, 255, 255, 255, 255, 255};
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
+        const TargetScope scope(target);
         std::vector<uint8_t> result(8);
         const auto multiply = [&](int32_t scale) {
-            return MultiplyConstant(KernelsFor<MultiplyConstantKernels>(target), source, 8, value,
-                                    result.data(), 8, 2, 1, scale);
+            return MultiplyConstant(source, 8, value, result.data(), 8, 2, 1, scale);
         };
         ASSERT_EQ(multiply(8), 0);
         EXPECT_EQ(result, scaled) << TargetName(target);
@@ -47,7 +48,8 @@ TEST(MultiplyConstant, GivesWhatIsWorkedOutByHand) {
 }
 
 TEST(MultiplyConstant, IsExactForEveryCodeConstantAndScale) {
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
+        const TargetScope scope(target);
         for (const int32_t scale : kScales) {
             for (int32_t constant = 0; constant < 256; ++constant) {
                 uint8_t value[4];
@@ -57,8 +59,7 @@ TEST(MultiplyConstant, IsExactForEveryCodeConstantAndScale) {
                     pixels[static_cast<size_t>(i)] = static_cast<uint8_t>(i / 4);
                     expected[static_cast<size_t>(i)] = Expected(i / 4, value[i % 4], scale);
                 }
-                MultiplyConstant(KernelsFor<MultiplyConstantKernels>(target), pixels.data(), 1024, value,
-                                 pixels.data(), 1024, 256, 1, scale);
+                MultiplyConstant(pixels.data(), 1024, value, pixels.data(), 1024, 256, 1, scale);
                 ASSERT_EQ(pixels, expected)
                     << TargetName(target) << ", constant " << constant << ", scale " << scale;
             }
@@ -69,15 +70,16 @@ TEST(MultiplyConstant, IsExactForEveryCodeConstantAndScale) {
 TEST(MultiplyConstant, TouchesExactlyItsPixels) {
     Random random(41);
     const uint8_t value[4] = {200, 100, 50, 25};
-    for (const Target target : EnabledTargets()) {
+    for (const Target target : TargetsOfThisProcessor()) {
+        const TargetScope scope(target);
         for (size_t width = 0; width <= 70; ++width) {
             for (const Placement place :
                  {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
                   Placement{Placement::kAtOffset, 5}}) {
                 const RowBuffer source(4 * width, place), result(4 * width, place);
                 random.Fill(source.Data(), source.Size());
-                MultiplyConstant(KernelsFor<MultiplyConstantKernels>(target), source.Data(), 0, value,
-                                 result.Data(), 0, static_cast<int32_t>(width), 1, 7);
+                MultiplyConstant(source.Data(), 0, value, result.Data(), 0, static_cast<int32_t>(width), 1,
+                                 7);
                 for (size_t i = 0; i < 4 * width; ++i)
                     ASSERT_EQ(result.Data()[i], Expected(source.Data()[i], value[i % 4], 7));
                 ASSERT_TRUE(result.MarginsIntact());
@@ -89,21 +91,18 @@ TEST(MultiplyConstant, TouchesExactlyItsPixels) {
 TEST(MultiplyConstant, WalksRowsOfEitherStep) {
     const uint8_t source[24] = {1, 2, 3, 4, 0, 0, 0, 0, 5, 6, 7, 8}, value[4] = {2, 2, 2, 2};
     uint8_t result[12] = {};
-    EXPECT_EQ(MultiplyConstant(KernelsFor<MultiplyConstantKernels>(Target::plain), source, 8, value,
-                               result + 8, -8, 1, 2, 0),
-              0);
+    EXPECT_EQ(MultiplyConstant(source, 8, value, result + 8, -8, 1, 2, 0), 0);
     const uint8_t expected[12] = {10, 12, 14, 16, 0, 0, 0, 0, 2, 4, 6, 8};
     EXPECT_TRUE(std::equal(result, result + 12, expected));
 }
 
 TEST(MultiplyConstant, RefusesNullPointersAndNegativeSizes) {
     uint8_t pixel[4] = {1, 2, 3, 4};
-    const MultiplyConstantKernels& kernels = KernelsFor<MultiplyConstantKernels>(Target::plain);
-    EXPECT_EQ(MultiplyConstant(kernels, nullptr, 4, pixel, pixel, 4, 1, 1, 0), -8);
-    EXPECT_EQ(MultiplyConstant(kernels, pixel, 4, nullptr, pixel, 4, 1, 1, 0), -8);
-    EXPECT_EQ(MultiplyConstant(kernels, pixel, 4, pixel, nullptr, 4, 1, 1, 0), -8);
-    EXPECT_EQ(MultiplyConstant(kernels, pixel, 4, pixel, pixel, 4, -1, 1, 0), -6);
-    EXPECT_EQ(MultiplyConstant(kernels, pixel, 4, pixel, pixel, 4, 1, -1, 0), -6);
+    EXPECT_EQ(MultiplyConstant(nullptr, 4, pixel, pixel, 4, 1, 1, 0), -8);
+    EXPECT_EQ(MultiplyConstant(pixel, 4, nullptr, pixel, 4, 1, 1, 0), -8);
+    EXPECT_EQ(MultiplyConstant(pixel, 4, pixel, nullptr, 4, 1, 1, 0), -8);
+    EXPECT_EQ(MultiplyConstant(pixel, 4, pixel, pixel, 4, -1, 1, 0), -6);
+    EXPECT_EQ(MultiplyConstant(pixel, 4, pixel, pixel, 4, 1, -1, 0), -6);
     EXPECT_EQ(pixel[3], 4);
 }
 

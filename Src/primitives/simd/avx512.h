@@ -307,6 +307,18 @@ inline I32 AverageHalves(I32 a, I32 b) {
 inline I32 MinHalves(I32 a, I32 b) {
     return {_mm512_min_epi16(a.v, b.v)};
 }
+/// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
+inline I32 LookUpBytes(I32 table, I32 places) {
+    return {_mm512_shuffle_epi8(table.v, places.v)};
+}
+/// Twice the products of unsigned bytes of `a` with signed bytes of `b`, in 16-bit halves in their order. They
+/// must fit.
+inline void DoubleByteProducts(I32 a, I32 b, I32& first, I32& second) {
+    const __m512i order = _mm512_setr_epi64(0, 4, 1, 5, 2, 6, 3, 7);
+    const __m512i x = _mm512_permutexvar_epi64(order, a.v), y = _mm512_permutexvar_epi64(order, b.v);
+    first = {_mm512_maddubs_epi16(_mm512_unpacklo_epi8(x, x), _mm512_unpacklo_epi8(y, y))};
+    second = {_mm512_maddubs_epi16(_mm512_unpackhi_epi8(x, x), _mm512_unpackhi_epi8(y, y))};
+}
 /// Swaps the two bytes of each 16-bit half.
 inline I32 SwapBytes(I32 a) {
     return ShuffleBytes(a, _mm_setr_epi8(1, 0, 3, 2, 5, 4, 7, 6, 9, 8, 11, 10, 13, 12, 15, 14));
@@ -337,6 +349,10 @@ inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
 /// The lanes of two vectors, each from 0 to 65535, to 16-bit halves in their order.
 inline I32 PackLanesToHalves(I32 a, I32 b) {
     return InOrderOfPairs(_mm512_packus_epi32(a.v, b.v));
+}
+/// The lanes of two vectors to signed 16-bit halves in their order, saturated.
+inline I32 PackSignedLanes(I32 a, I32 b) {
+    return InOrderOfPairs(_mm512_packs_epi32(a.v, b.v));
 }
 /// Lanes for even and for odd places to 2 x kLanes interleaved lanes.
 inline void StoreLanePairs(void* destination, I32 even, I32 odd) {
