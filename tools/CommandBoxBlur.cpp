@@ -6,6 +6,8 @@
 #include "Operations.h"
 
 #include <algorithm>
+#include <cmath>
+#include <vector>
 
 namespace tool {
 namespace {
@@ -42,6 +44,7 @@ void Blur(Frame& frame, const BoxBlur& blur) {
 }
 
 void RunBoxBlur(const BoxBlurOptions& options) {
+    if (std::isnan(options.radius)) throw Failure(kExitUsage, "the radius is no number");
     const bool both = options.rows == options.columns;
     const BoxBlur blur = {options.radius, options.passes, both || options.rows, both || options.columns,
                           options.renormalise};

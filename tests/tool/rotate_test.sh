@@ -26,8 +26,8 @@ for degrees in 0 45 360 x; do
     expect 2 "--degrees" rotate in/column.raw out/x.png "${column[@]}" --degrees $degrees
 done
 expect 2 "--degrees" rotate in/column.raw out/x.png "${column[@]}"
-expect 1 "cannot rotate a frame of BGRA_4444_32f at 1x3: the source format is not accepted" \
-    rotate in/column.raw out/x.png --from BGRA_4444_32f --size 1x3 --packed --degrees 90 < /dev/null
+expect 1 "cannot rotate a frame of BGRA_4444_32f at 451x300: the source format is not accepted" \
+    rotate "$media/chelsea.png" out/x.png --from BGRA_4444_32f --degrees 90
 expect 2 "number the output" rotate in/two.raw out/x.png "${column[@]}" --degrees 90
 expect 2 "name it with --from" rotate in/column.raw out/x.png --degrees 90
 expect 3 "No such file" rotate in/missing.png out/x.png --degrees 90

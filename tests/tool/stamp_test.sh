@@ -4,13 +4,14 @@
 mkdir in out
 expect 0 "" fill in/black.raw --size 64x32 --to BGRA_4444_8u --colour black
 raw=(--from BGRA_4444_8u --size 64x32)
-# A digit of 16 columns has strokes of 12 pixels. A one has the two on the right: column 4 + 12, rows 4 to 27.
+# The height leaves cells of (32 - 4) / 2 = 14 pixels, and strokes of 10. A one has the two on the right: column
+# 4 + 10, rows 4 to 23.
 picture() { "$program" convert "$1" - --to BGRA_4444_8u "${@:2}" | od -An -v -w256 -tx1 | tr -d ' ' | tac; }
 expect 0 "64x32" stamp in/black.raw one.raw "${raw[@]}" --number 1 --digit 0.25 --at 0,0
 picture one.raw "${raw[@]}" > lines
-is "red pixels" "$(grep -o 0000ffff lines | wc -l)" 24
-is "their rows" "$(grep -n 0000ffff lines | cut -d : -f 1 | xargs)" "$(seq -s ' ' 5 28)"
-is "their column" "$(grep 0000ffff lines | awk '{ print (index($0, "0000ffff") - 1) / 8 }' | sort -u)" 16
+is "red pixels" "$(grep -o 0000ffff lines | wc -l)" 20
+is "their rows" "$(grep -n 0000ffff lines | cut -d : -f 1 | xargs)" "$(seq -s ' ' 5 24)"
+is "their column" "$(grep 0000ffff lines | awk '{ print (index($0, "0000ffff") - 1) / 8 }' | sort -u)" 14
 
 # Numbers go up from frame to frame; hexadecimal digits.
 cat in/black.raw in/black.raw > in/two.raw
@@ -23,7 +24,7 @@ expect 0 "451x300" stamp "$media/chelsea.png" chelsea.png --number=-7
 is "drawn into a picture" "$("$program" compare "$media/chelsea.png" chelsea.png | grep -c identical)" 0
 expect 0 "to UYVY_422_8u" stamp "$media/chelsea.png" chelsea.raw --number 7 --from UYVY_422_8u
 
-for at in 0 0,0,0 a,b ''; do
+for at in 0 0,0,0 a,b; do
     expect 2 "takes 2 numbers" stamp in/black.raw out/x.png "${raw[@]}" --number 1 "--at=$at"
 done
 expect 1 "cannot stamp a frame of BGRA_4444_8u at 64x32" stamp in/black.raw out/x.png "${raw[@]}" --number 1 --at 0,1.5
