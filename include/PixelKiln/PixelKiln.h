@@ -12,8 +12,8 @@
 #include <PixelKiln/Overlay.h>
 #include <PixelKiln/PixelFormat.h>
 #include <PixelKiln/Planar.h>
+#include <PixelKiln/QuadWarp.h>
 #include <PixelKiln/QuarterScale.h>
 #include <PixelKiln/Rotate.h>
-#include <PixelKiln/QuadWarp.h>
 #include <PixelKiln/Types.h>
 #include <PixelKiln/Utilities.h>
