@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstddef>
+#include <utility>
 
 namespace PK {
 
@@ -29,6 +30,14 @@ bool IsFinite(const WarpPolygon& polygon) {
         return std::isfinite(vertex.x) && std::isfinite(vertex.y) && std::isfinite(vertex.u) &&
                std::isfinite(vertex.v) && std::isfinite(vertex.a);
     });
+}
+
+/// Sorts a handful. Equal elements keep their order, and comparisons with not-a-number do no harm.
+template <class Iterator, class Less>
+void SortFew(Iterator first, Iterator last, Less isLess) {
+    for (Iterator next = first; next != last; ++next)
+        for (Iterator place = next; place != first && isLess(*place, *(place - 1)); --place)
+            std::swap(*place, *(place - 1));
 }
 
 float NonZero(float divisor) {
@@ -60,8 +69,8 @@ void QuadRasterizer::Draw(const WarpPolygon& polygon) {
 
 void QuadRasterizer::SortVertices() {
     fSortedVertices = {0, 1, 2, 3};
-    std::sort(fSortedVertices.begin(), fSortedVertices.end(),
-              [this](int32_t a, int32_t b) { return fPolygon[a].y < fPolygon[b].y; });
+    SortFew(fSortedVertices.begin(), fSortedVertices.end(),
+            [this](int32_t a, int32_t b) { return fPolygon[a].y < fPolygon[b].y; });
 }
 
 void QuadRasterizer::VisitVertex(int32_t index, double centre) {
@@ -100,11 +109,8 @@ void QuadRasterizer::EndEdge(int32_t edge) {
 }
 
 void QuadRasterizer::SortEdges() {
-    // What overflowed to not-a-number goes last: the order must be one.
-    std::sort(fActiveEdges.begin(), fActiveEdges.begin() + fActiveCount,
-              [](const EdgeState& a, const EdgeState& b) {
-                  return a.x.value < b.x.value || (std::isnan(b.x.value) && !std::isnan(a.x.value));
-              });
+    SortFew(fActiveEdges.begin(), fActiveEdges.begin() + fActiveCount,
+            [](const EdgeState& a, const EdgeState& b) { return a.x.value < b.x.value; });
 }
 
 void QuadRasterizer::AdvanceEdges() {

@@ -20,14 +20,20 @@ struct Walk {
     explicit Walk(const WarpSpan& span)
         : place(PixelFloats(span.u, span.v, span.a, 0)), step(PixelFloats(span.du, span.dv, span.da, 0)) {}
 
+    /// \param pixels  those left of the span, at least 1. The last one stands for lanes without a pixel, so
+    ///                that nothing is read for them that the span does not ask for.
+    Coordinates Next(int64_t pixels) {
+        return pixels > kLanes ? Take(kLanes + 1) : Take(static_cast<int32_t>(pixels));
+    }
+
     /// Adds the slopes once for each pixel: start + k x slope would round otherwise.
-    Coordinates Next() {
+    Coordinates Take(int32_t pixels) {
         // Every store but the last reaches beyond its pixel where lanes are more than four; the next one
         // mends that.
         alignas(64) float places[5 * kLanes - 4];
         for (int32_t i = 0; i < kLanes; ++i) {
             Store(places + 4 * i, place);
-            place = place + step;
+            if (i + 1 < pixels) place = place + step;
         }
         const Channels channels = LoadFloatChannels(places);
         return {channels.c0, channels.c1, channels.c2};
@@ -270,13 +276,13 @@ void FillSpan(const WarpSource& from, const WarpPaint& by, const WarpSpan& span)
     alignas(64) uint8_t scratch[4 * kLanes] = {};
     uint8_t* destination = span.pixels;
     typename Sampling::Places places[2];
-    Sampling::Find(source, walk.Next(), places[0]);
+    Sampling::Find(source, walk.Next(span.count), places[0]);
     for (int64_t count = span.count, turn = 0; count > 0;
          count -= kLanes, destination += 4 * kLanes, turn ^= 1) {
         const bool isWhole = count >= kLanes;
         if (!isWhole) std::memcpy(scratch, destination, 4 * static_cast<size_t>(count));
         uint8_t* pixels = isWhole ? destination : scratch;
-        Sampling::Find(source, walk.Next(), places[turn ^ 1]);
+        if (count > kLanes) Sampling::Find(source, walk.Next(count - kLanes), places[turn ^ 1]);
         Store(pixels, Rule::Apply(paint, Sampling::Read(source, places[turn]), pixels));
         if (!isWhole) std::memcpy(destination, scratch, 4 * static_cast<size_t>(count));
     }

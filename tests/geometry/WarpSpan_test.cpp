@@ -10,9 +10,8 @@
 #include <PixelKiln/QuadWarp.h>
 
 #include <algorithm>
-#include <cstring>
+#include <cfenv>
 #include <gtest/gtest.h>
-#include <memory>
 #include <vector>
 
 using namespace PKTest;
@@ -100,6 +99,17 @@ PK_Result Call(const QuadWarp& warp) {
                              warp.featherOver, warp.feather);
 }
 
+class RoundingScope {
+public:
+    explicit RoundingScope(int mode) : fSaved(std::fegetround()) { std::fesetround(mode); }
+    ~RoundingScope() { std::fesetround(fSaved); }
+    RoundingScope(const RoundingScope&) = delete;
+    RoundingScope& operator=(const RoundingScope&) = delete;
+
+private:
+    int fSaved;
+};
+
 /// Leaves the capabilities of a target, and of those that it stands on.
 void AllowUpTo(PK::Target target) {
     FlagScope::ClearAll();
@@ -126,6 +136,8 @@ TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
         warp.sourceRowBytes = 4 * (random.Below(2) == 0 ? sourceStride : -sourceStride);
         warp.destinationRowBytes = 4 * (random.Below(2) == 0 ? destinationStride : -destinationStride);
 
+        constexpr int kModes[] = {FE_TONEAREST, FE_TONEAREST, FE_UPWARD, FE_DOWNWARD};
+        const RoundingScope rounding(kModes[random.Below(4)]);
         const std::vector<uint8_t> before = destination.Copy();
         DrawQuadWarp(warp);
         const std::vector<uint8_t> expected = destination.Copy();
@@ -146,7 +158,7 @@ TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
     }
 }
 
-/// All alphas of both with every 17th byte, as one row of pixels.
+/// Every alpha over every alpha, as one row of pixels.
 TEST(WarpSpan, EveryBodyMixesAsTheRestatement) {
     const FlagScope flags;
     constexpr int32_t kWidth = 65536;

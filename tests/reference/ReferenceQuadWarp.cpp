@@ -5,7 +5,6 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdlib>
-#include <numeric>
 #include <vector>
 
 namespace PKReference {
@@ -164,8 +163,8 @@ struct Painter {
         return warp.field == 0 || (warp.field == 1 && row % 2 == 0) || (warp.field == 2 && row % 2 != 0);
     }
 
-    // Not as a list that vertices enter and leave: an edge is crossed by a row whose centre is at or below its
-    // upper end and above its lower end.
+    // An edge is crossed by a row whose centre is at or below its upper end and above its lower end. Edges that
+    // cross at one place stay in the order in which their upper ends were passed.
     void Fill(const Polygon& polygon) const {
         const PK_Rect& rect = warp.destinationRect;
         float least = polygon[0][Y], greatest = least;
@@ -177,8 +176,9 @@ struct Painter {
         const int last = std::min(rect.bottom - 1, static_cast<int>(std::floor(greatest - 0.5f)));
 
         std::vector<Corner> values(polygon.size()), changes(polygon.size());
-        std::vector<bool> started(polygon.size(), false);
-        std::vector<size_t> crossed;
+        std::vector<size_t> crossed, vertices = {0, 1, 2, 3}; // those not yet passed, by y
+        std::stable_sort(vertices.begin(), vertices.end(),
+                         [&](size_t a, size_t b) { return polygon[a][Y] < polygon[b][Y]; });
         for (int row = first; row <= last; ++row) {
             const float centre = static_cast<float>(row) + 0.5f;
             std::vector<size_t> remaining;
@@ -186,15 +186,18 @@ struct Painter {
                 if (std::max(polygon[edge][Y], polygon[(edge + 1) % 4][Y]) > centre)
                     remaining.push_back(edge);
             crossed = remaining;
-            for (size_t edge = 0; edge < polygon.size(); ++edge) {
-                Corner upper = polygon[edge], lower = polygon[(edge + 1) % 4];
-                if (upper[Y] > lower[Y]) std::swap(upper, lower);
-                if (started[edge] || upper[Y] > centre || lower[Y] <= centre) continue;
-                started[edge] = true;
-                crossed.push_back(edge);
-                for (const int k : {X, U, V, A}) {
-                    changes[edge][k] = (lower[k] - upper[k]) / (lower[Y] - upper[Y]);
-                    values[edge][k] = upper[k] + changes[edge][k] * (centre - upper[Y]);
+            while (!vertices.empty() && polygon[vertices.front()][Y] <= centre) {
+                const size_t v = vertices.front();
+                vertices.erase(vertices.begin());
+                for (const size_t edge : {(v + 3) % 4, v}) {
+                    const Corner& upper = polygon[v];
+                    const Corner& lower = polygon[edge == v ? (v + 1) % 4 : edge];
+                    if (lower[Y] <= centre) continue;
+                    crossed.push_back(edge);
+                    for (const int k : {X, U, V, A}) {
+                        changes[edge][k] = (lower[k] - upper[k]) / (lower[Y] - upper[Y]);
+                        values[edge][k] = upper[k] + changes[edge][k] * (centre - upper[Y]);
+                    }
                 }
             }
             std::stable_sort(crossed.begin(), crossed.end(),
