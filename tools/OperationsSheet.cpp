@@ -23,9 +23,11 @@ Frame Filled(const Frame& like, const char* colour) {
     return frame;
 }
 
+/// A picture too small for the blur stays as it is.
 Frame Blurred(const Frame& picture, const BoxBlur& blur) {
+    constexpr int32_t kLeastSide = 4;
     Frame frame = Copied(picture);
-    Blur(frame, blur);
+    if (picture.Width() >= kLeastSide && picture.Height() >= kLeastSide) Blur(frame, blur);
     return frame;
 }
 
