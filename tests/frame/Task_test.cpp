@@ -29,16 +29,16 @@ std::atomic<int> sAllocations = 0;
 
 } // namespace
 
-// Counted in the whole test program.
-void* operator new(size_t size) {
+// Counted in the whole test program. Not inlined: g++ 12 would see a mismatch where it inlines only one of a pair.
+[[gnu::noinline]] void* operator new(size_t size) {
     ++sAllocations;
     if (void* memory = std::malloc(size != 0 ? size : 1)) return memory;
     throw std::bad_alloc();
 }
-void operator delete(void* memory) noexcept {
+[[gnu::noinline]] void operator delete(void* memory) noexcept {
     std::free(memory);
 }
-void operator delete(void* memory, size_t) noexcept {
+[[gnu::noinline]] void operator delete(void* memory, size_t) noexcept {
     std::free(memory);
 }
 
