@@ -35,6 +35,10 @@ std::atomic<int> sAllocations = 0;
     if (void* memory = std::malloc(size != 0 ? size : 1)) return memory;
     throw std::bad_alloc();
 }
+[[gnu::noinline]] void* operator new(size_t size, const std::nothrow_t&) noexcept {
+    ++sAllocations;
+    return std::malloc(size != 0 ? size : 1);
+}
 [[gnu::noinline]] void operator delete(void* memory) noexcept {
     std::free(memory);
 }

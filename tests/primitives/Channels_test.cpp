@@ -102,7 +102,7 @@ void CheckRow(RowOf rowOf, bool copiesColour, Sample patternValue, Alpha alpha) 
                 random.Fill(reinterpret_cast<uint8_t*>(expected.data()), expected.size() * sizeof(Sample));
                 if (inPlace) expected = source;
                 const RowBuffer row(expected.size() * sizeof(Sample), place);
-                std::memcpy(row.Data(), expected.data(), row.Size());
+                std::copy_n(reinterpret_cast<const uint8_t*>(expected.data()), row.Size(), row.Data());
                 for (size_t i = 0; i < expected.size(); ++i) {
                     if (static_cast<int32_t>(i % 4) == channel)
                         expected[i] = alpha(source[i]);
