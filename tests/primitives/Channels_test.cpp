@@ -112,7 +112,8 @@ void CheckRow(RowOf rowOf, bool copiesColour, Sample patternValue, Alpha alpha) 
                 const auto* from = inPlace ? row.Data() : reinterpret_cast<const uint8_t*>(source.data());
                 rowOf(KernelsFor<ChannelKernels>(target))(from, row.Data(), row.Size(),
                                                           PatternOfChannel(channel, patternValue));
-                ASSERT_EQ(std::memcmp(expected.data(), row.Data(), row.Size()), 0);
+                ASSERT_TRUE(std::equal(row.Data(), row.Data() + row.Size(),
+                                       reinterpret_cast<const uint8_t*>(expected.data())));
                 ASSERT_TRUE(row.MarginsIntact());
             }
         }
