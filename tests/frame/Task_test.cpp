@@ -83,7 +83,7 @@ class ThrowingTask : public Task {
 public:
     int32_t GetPartCount() const override { return 16; }
     void RunPart(int32_t partIndex) const override {
-        if (partIndex == 7) throw std::runtime_error("part 7");
+        if (partIndex == 7) throw std::runtime_error("the seventh fails");
     }
 };
 
