@@ -6,9 +6,9 @@
 #include "convert/ConversionChain.h"
 #include "convert/Image.h"
 #include "convert/RasterFormats.h"
-#include "frame/Dispatch.h"
 #include "frame/FloatMode.h"
 #include "frame/RowScratch.h"
+#include "primitives/Dispatch.h"
 
 namespace PK {
 namespace {

@@ -1,7 +1,7 @@
 // The bridges between four-word pixels and ten-bit RGB. Rows follow each other without a gap at both ends.
 
 #include "convert/Bridges.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
 

@@ -1,8 +1,8 @@
 // The bridges to and from a JPEG 2000 codec, but for that of V210.
 
 #include "convert/Bridges.h"
-#include "frame/Dispatch.h"
 #include "frame/FloatMode.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
 

@@ -4,7 +4,7 @@
 // micro-benchmark all read this one table.
 
 #include "convert/Kernel.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/Types.h>
 

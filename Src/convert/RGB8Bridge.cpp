@@ -1,7 +1,7 @@
 // The bridge from three-byte RGB.
 
 #include "convert/Bridges.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
 

@@ -6,8 +6,8 @@
 #include "convert/KernelMembers.h"
 #include "convert/RasterFormats.h"
 #include "convert/RouterTable.h"
-#include "frame/Capabilities.h"
 #include "frame/PixelFormat.h"
+#include "primitives/CapabilityFlags.h"
 
 #include <optional>
 

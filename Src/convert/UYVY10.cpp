@@ -1,7 +1,7 @@
 // The bridges between V210 and its samples unpacked.
 
 #include "convert/Bridges.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
 

@@ -1,7 +1,7 @@
 // The bridges from three planes of 10-bit words.
 
 #include "convert/Bridges.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
 

@@ -1,9 +1,9 @@
 // The bridges from 10- and 16-bit words to 15-bit samples.
 
 #include "convert/Bridges.h"
-#include "frame/Capabilities.h"
-#include "frame/Dispatch.h"
 #include "frame/FloatMode.h"
+#include "primitives/CapabilityFlags.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
 

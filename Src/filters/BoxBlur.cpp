@@ -3,9 +3,9 @@
 #include <PixelKiln/BoxBlur.h>
 
 #include "filters/BoxBlurKernels.h"
-#include "frame/Dispatch.h"
 #include "frame/FloatMode.h"
 #include "frame/RowScratch.h"
+#include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
 
 #include <algorithm>

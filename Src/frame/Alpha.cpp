@@ -1,9 +1,9 @@
 // Alpha of whole images: set, inverted, or replaced in a copy.
 
-#include "frame/Dispatch.h"
 #include "frame/FloatMode.h"
 #include "frame/PixelFormat.h"
 #include "primitives/Channels.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/Utilities.h>
 

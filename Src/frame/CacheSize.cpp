@@ -1,6 +1,6 @@
 #include "frame/CacheSize.h"
 
-#include "frame/Capabilities.h"
+#include "primitives/CapabilityFlags.h"
 
 #include <unistd.h>
 

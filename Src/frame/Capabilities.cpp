@@ -9,16 +9,6 @@
 
 namespace PK {
 
-uint8_t sCPUHasSSE = 0;
-uint8_t sCPUHasSSE2 = 0;
-uint8_t sCPUHasSSE3 = 0;
-uint8_t sCPUHasSSSE3 = 0;
-uint8_t sCPUHasSSE4 = 0;
-uint8_t sCPUHasSSE42 = 0;
-uint8_t sCPUHasAVX = 0;
-uint8_t sCPUHasAVX2 = 0;
-uint8_t sCPUHasAVX512 = 0;
-
 namespace {
 
 constexpr uint32_t kLeaf1EDX_SSE = 1u << 25;

@@ -2,7 +2,7 @@
 
 #include "frame/DebugSwitches.h"
 
-#include "frame/Capabilities.h"
+#include "primitives/CapabilityFlags.h"
 
 #include <PixelKiln/Lifecycle.h>
 

@@ -2,9 +2,9 @@
 
 #include <PixelKiln/Rotate.h>
 
-#include "frame/Capabilities.h"
-#include "frame/Dispatch.h"
 #include "frame/PixelFormat.h"
+#include "primitives/CapabilityFlags.h"
+#include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
 
 #include <cstring>

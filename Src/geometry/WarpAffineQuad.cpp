@@ -1,7 +1,7 @@
 // PK_WarpAffineQuad: the polygon, its soft rim and the choice of kernels.
 
-#include "frame/Dispatch.h"
 #include "geometry/QuadRasterizer.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/QuadWarp.h>
 

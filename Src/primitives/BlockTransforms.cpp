@@ -1,6 +1,6 @@
 #include "primitives/BlockTransforms.h"
 
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "primitives/Status.h"
 
 namespace PK {

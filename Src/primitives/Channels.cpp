@@ -1,6 +1,6 @@
 #include "primitives/Channels.h"
 
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "primitives/Status.h"
 
 #include <cstring>

@@ -2,7 +2,7 @@
 
 #include <PixelKiln/QuarterScale.h>
 
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "scale/QuarterScaleKernels.h"
 
 #include <cstddef>

@@ -8,7 +8,7 @@
 #include "support/GuardedRows.h"
 #include "support/Random.h"
 
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <PixelKiln/Types.h>
 

@@ -5,7 +5,7 @@
 #include <PixelKiln/Rotate.h>
 
 #include "frame/Capabilities.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"

@@ -1,7 +1,7 @@
 // Every body of the quad warp against the restatement, pixel for pixel.
 
 #include "frame/Capabilities.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "reference/ReferenceQuadWarp.h"
 #include "support/FlagScope.h"
 #include "support/GuardedRows.h"

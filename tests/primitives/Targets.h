@@ -2,7 +2,7 @@
 
 // Every instruction set that this processor has and the library offers, for tests of all bodies.
 
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
 
 #include <PixelKiln/Lifecycle.h>

@@ -4,7 +4,7 @@
 #include "scale/QuarterScaleKernels.h"
 
 #include "frame/Capabilities.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
 #include "support/RowBuffer.h"
 

@@ -5,7 +5,7 @@
 #include "support/FlagScope.h"
 
 #include "frame/Capabilities.h"
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
 #include <gtest/gtest.h>
 

@@ -1,6 +1,6 @@
-#include "frame/Dispatch.h"
+#include "primitives/Dispatch.h"
 
-#include "frame/Capabilities.h"
+#include "primitives/CapabilityFlags.h"
 
 #include <cstddef>
 
