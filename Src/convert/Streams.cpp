@@ -101,35 +101,12 @@ PK_Result ChooseEncodeSource(PK_PixelFormat source, PK_PixelFormat stream, int32
     return PK_ErrNotSupported;
 }
 
-PK_Result DecodeStream(const SourceImage& source, int32_t, const DestinationImage&, int32_t) noexcept {
-    switch (CodecOf(source.format)) {
-    case Codec::DV25:
-        return PK_ErrNotSupported;
-    case Codec::DV50:
-        return PK_ErrNotSupported;
-    case Codec::DV100:
-        return PK_ErrNotSupported;
-    case Codec::Planar420:
-        return PK_ErrNotSupported;
-    case Codec::None:
-        break;
-    }
+// No codec of a stream is built yet. A decoder or encoder is taken in here, chosen by CodecOf.
+PK_Result DecodeStream(const SourceImage&, int32_t, const DestinationImage&, int32_t) noexcept {
     return PK_ErrNotSupported;
 }
 
-PK_Result EncodeStream(const SourceImage&, const DestinationImage& destination, int32_t) noexcept {
-    switch (CodecOf(destination.format)) {
-    case Codec::DV25:
-        return PK_ErrNotSupported;
-    case Codec::DV50:
-        return PK_ErrNotSupported;
-    case Codec::DV100:
-        return PK_ErrNotSupported;
-    case Codec::Planar420:
-        return PK_ErrNotSupported;
-    case Codec::None:
-        break;
-    }
+PK_Result EncodeStream(const SourceImage&, const DestinationImage&, int32_t) noexcept {
     return PK_ErrNotSupported;
 }
 
