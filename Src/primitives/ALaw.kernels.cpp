@@ -37,7 +37,7 @@ struct ALawToLinear {
 };
 
 void ALawToLinear16Run(const uint8_t* source, uint8_t* destination, size_t count) {
-    RunGroups(ALawToLinear(), source, destination, count);
+    RunGroups(ALawToLinear(), static_cast<ptrdiff_t>(count), destination, source);
 }
 
 } // namespace

@@ -50,7 +50,7 @@ struct InvertFloat : Channel {
 
 template <class Formula>
 void ChannelRow(const uint8_t* source, uint8_t* destination, size_t bytes, const ChannelPattern& pattern) {
-    RunGroups(Formula(pattern), source, destination, bytes);
+    RunGroups(Formula(pattern), static_cast<ptrdiff_t>(bytes), destination, source);
 }
 
 } // namespace

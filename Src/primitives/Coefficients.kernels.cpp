@@ -1,7 +1,7 @@
 // The bodies for coefficients. Two values of 16 bits stand in each lane.
 
 #include "primitives/Coefficients.h"
-#include "primitives/simd/Arrays.h"
+#include "primitives/simd/RunGroups.h"
 #include "primitives/simd/Target.h"
 
 namespace PK {
@@ -28,17 +28,17 @@ uint32_t CountZeros(const int16_t* block) {
 /// matters can be added to it.
 template <class Scaling>
 struct ScaledProduct {
-    static constexpr int32_t kBytes = 2;
-    static constexpr int32_t kElements = 2 * kLanes;
+    static constexpr int kElements = 2 * kLanes;
+    static constexpr int kSourceElement = 2, kDestinationElement = 2;
     Scaling scaling;
 
-    void Group(const uint8_t* data, const uint8_t* factors, uint8_t* result) const {
+    void Group(const uint8_t* factors, uint8_t* data) const {
         const I32 values = LoadInts(data), factor = LoadInts(factors);
         const I32 even = scaling.Apply(MultiplyAddHalves(values & Ints(0xffff), factor));
         const I32 odd = scaling.Apply(MultiplyAddHalves(values & Ints(-0x10000), factor));
         I32 low, high;
         InterleaveInBlocks(even, odd, low, high);
-        Store(result, PackSignedInBlocks(low, high));
+        Store(data, PackSignedInBlocks(low, high));
     }
 };
 
@@ -65,10 +65,10 @@ void MultiplyScaled(const int16_t* factors, int16_t* data, int32_t count, int32_
     constexpr int32_t kMostDivided = 31, kMostMultiplied = 15;
     if (scale > 0) {
         const ScaledProduct<Divided> formula = {{scale < kMostDivided ? scale : kMostDivided}};
-        ForElements(formula, data, factors, data, count);
+        RunGroups(formula, count, data, factors);
     } else {
         const ScaledProduct<Multiplied> formula = {{scale > -kMostMultiplied ? -scale : kMostMultiplied}};
-        ForElements(formula, data, factors, data, count);
+        RunGroups(formula, count, data, factors);
     }
 }
 

@@ -61,7 +61,7 @@ struct ToInt16 : Scale {
 
 template <class Formula>
 void ConvertRun(const uint8_t* source, uint8_t* destination, size_t count, PowerOfTwo scale) {
-    RunGroups(Formula(scale), source, destination, count);
+    RunGroups(Formula(scale), static_cast<ptrdiff_t>(count), destination, source);
 }
 
 } // namespace

@@ -55,7 +55,7 @@ struct Multiply {
 
 template <bool kScaled>
 void MultiplyRow(const uint8_t* source, uint8_t* destination, size_t pixels, ChannelFactors factors) {
-    RunGroups(Multiply<kScaled>(factors), source, destination, pixels);
+    RunGroups(Multiply<kScaled>(factors), static_cast<ptrdiff_t>(pixels), destination, source);
 }
 
 } // namespace

@@ -1,8 +1,8 @@
 // The bodies of the vector mathematics.
 
 #include "primitives/VectorMath.h"
-#include "primitives/simd/Arrays.h"
 #include "primitives/simd/Elementary.h"
+#include "primitives/simd/RunGroups.h"
 #include "primitives/simd/Target.h"
 
 namespace PK {
@@ -10,8 +10,8 @@ namespace PK_TARGET {
 namespace {
 
 struct LaneGroup {
-    static constexpr int32_t kBytes = 4;
-    static constexpr int32_t kElements = kLanes;
+    static constexpr int kElements = kLanes;
+    static constexpr int kSourceElement = 4, kDestinationElement = 4;
 };
 
 struct Powers : LaneGroup {
@@ -24,11 +24,11 @@ struct Powers : LaneGroup {
 };
 
 struct MaskedExponentials : LaneGroup {
-    static void Group(const uint8_t* values, const uint8_t* mask, uint8_t* result) {
+    static void Group(const uint8_t* mask, uint8_t* values) {
         const F32 x = LoadFloats(values);
         F32 exponential[1] = {x};
         Exp(exponential);
-        Store(result, Select(LoadInts(mask), exponential[0], x));
+        Store(values, Select(LoadInts(mask), exponential[0], x));
     }
 };
 
@@ -39,15 +39,15 @@ struct Quotients : LaneGroup {
 };
 
 void PowArray(const float* x, const float* y, float* result, int32_t count) {
-    ForElements(Powers{}, x, y, result, count);
+    RunGroups(Powers{}, count, result, x, y);
 }
 
 void ExpArray(const int32_t* mask, float* values, int32_t count) {
-    ForElements(MaskedExponentials{}, values, mask, values, count);
+    RunGroups(MaskedExponentials{}, count, values, mask);
 }
 
 void DivideArray(const int32_t* dividends, const int32_t* divisors, int32_t* quotients, int32_t count) {
-    ForElements(Quotients{}, dividends, divisors, quotients, count);
+    RunGroups(Quotients{}, count, quotients, dividends, divisors);
 }
 
 constexpr VectorMathKernels kKernels = {PowArray, ExpArray, DivideArray};
