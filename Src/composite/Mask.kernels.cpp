@@ -66,7 +66,7 @@ void SelectRow(const uint8_t* first, const uint8_t* second, const uint8_t* mask,
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::MaskKernels& PK::MaskKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::MaskKernels& PK::MaskKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr MaskKernels kernels = {SelectRow<4>, SelectRow<8>, SelectRow<16>};
     return kernels;

@@ -94,7 +94,7 @@ struct Interpolate32f : FloatPairs, Neighbours<2, 16, 1, 2> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::ChromaBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::ChromaBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::Downsample444To422Row, DownsampleRow<PackedVUYA>},

@@ -47,7 +47,7 @@ void RGB10ToDNxHDRow(const void* sourceRow, void* destinationRow, int32_t width)
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::DNxHDKernels& PK::DNxHDKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::DNxHDKernels& PK::DNxHDKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr DNxHDKernels kernels = {Row<DNxHDToRGB10>, RGB10ToDNxHDRow};
     return kernels;

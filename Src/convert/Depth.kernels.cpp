@@ -103,7 +103,7 @@ struct ScaleBytesTo15u : SampleGroup<1, 2, 1, 2> {
 /// 16-byte boundary of the destination, and the rounded form after it; hosts compare against both.
 void Expand8uTo15uRow(const void* source, void* destination, int32_t width) {
     int32_t head = width;
-    if constexpr (kTarget != Target::plain) {
+    if constexpr (Target::PK_TARGET != Target::plain) {
         const auto bytesToBoundary = static_cast<int32_t>(-reinterpret_cast<uintptr_t>(destination) & 15);
         const int32_t pixelsToBoundary = (bytesToBoundary + 7) / 8;
         if (head > pixelsToBoundary) head = pixelsToBoundary;
@@ -130,7 +130,7 @@ struct PackWordsToBytes : SampleGroup<2, 1, 1, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::DepthBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::DepthBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::ExpandTo32fRow_RGB_8u, Row<ExpandBytes<RGBSamples>>},

@@ -44,7 +44,7 @@ struct StraightRGB {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::FusedBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::FusedBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::RGBToUYVY601, DownsampleRow<OpaqueRGB<kRGB8ToYUV601>>},

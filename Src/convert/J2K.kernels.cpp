@@ -61,7 +61,7 @@ struct ZYXToBGR32f : PixelGroup<16, 16> {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::J2KKernels& PK::J2KKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::J2KKernels& PK::J2KKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr J2KKernels kernels = {Row<BGR16ToRGB10>, Row<RGB10ToBGR16>, Row<OffsetUYVY32f>,
                                            Row<ZYXToBGR32f>};

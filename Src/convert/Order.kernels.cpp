@@ -81,7 +81,7 @@ struct SwapPairs32f : VectorGroup<4, 2> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::OrderBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::OrderBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::ForceOpaqueRow_BGRA_8u, Row<ForceOpaqueBGRA8>},

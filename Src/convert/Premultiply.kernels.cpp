@@ -151,7 +151,7 @@ struct ExpandPremultipliedVUYA8 : SampleGroup<1, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::PremultiplyBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::PremultiplyBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::PremultiplyRow_BGRA_8u, Row<PremultiplyBGRA8>},

@@ -137,7 +137,7 @@ struct RGB10ToBGR32f : PixelGroup<4, 16> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::RGB10Bodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::RGB10Bodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::BGR8uToRGB10uRow, Row<BGR8ToRGB10<ScaleBytesTo10u>>},

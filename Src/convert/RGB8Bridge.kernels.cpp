@@ -40,7 +40,7 @@ struct RGB8ToBGRA : NoNeighbours {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::RGB8Kernels& PK::RGB8Kernels::For<PK::PK_TARGET::kTarget>() {
+const PK::RGB8Kernels& PK::RGB8Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr RGB8Kernels kernels = {WindowRow<RGB8ToBGRA>};
     return kernels;

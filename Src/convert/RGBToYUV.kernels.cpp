@@ -34,7 +34,7 @@ struct RGBFloatToYUV8 : PixelGroup<16, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::RGBToYUVBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::RGBToYUVBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::RGBToYUV601Row, Row<RGBToYUV8<kRGB8ToYUV601>>},

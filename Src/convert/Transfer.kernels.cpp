@@ -60,7 +60,7 @@ struct LinearFloat32ToGamma8u : PixelGroup<16, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::TransferBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::TransferBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::GammaToLinearRow, Row<GammaToLinear>},

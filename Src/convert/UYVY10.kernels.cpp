@@ -33,7 +33,7 @@ struct V210ToUYVY10 : NoNeighbours {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::UYVY10Kernels& PK::UYVY10Kernels::For<PK::PK_TARGET::kTarget>() {
+const PK::UYVY10Kernels& PK::UYVY10Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr UYVY10Kernels kernels = {WindowRow<UYVY10ToV210>, WindowRow<V210ToUYVY10>};
     return kernels;

@@ -178,7 +178,7 @@ struct UYVY32fToV210 : NoNeighbours {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::V210Bodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::V210Bodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::UYVY8uToV210Row, WindowRow<UYVY8ToV210>},

@@ -163,7 +163,7 @@ struct QuarterToVUYX {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::W210Kernels& PK::W210Kernels::For<PK::PK_TARGET::kTarget>() {
+const PK::W210Kernels& PK::W210Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr W210Kernels kernels = {FromPlanesRow<ToV210>, FromPlanesRow<AverageToV210>,
                                             FromPlanesRow<QuarterToV210>, FromPlanesRow<QuarterToVUYX>};

@@ -51,7 +51,7 @@ struct Halve : SampleGroup<2, 2, 1, 2> {
 };
 
 constexpr BridgeRow XRGBRow() {
-    if constexpr (kTarget >= Target::sse41) return WindowRow<RoundRGBToXRGB>;
+    if constexpr (Target::PK_TARGET >= Target::sse41) return WindowRow<RoundRGBToXRGB>;
     return TruncateRGBToXRGBRow;
 }
 
@@ -59,7 +59,7 @@ constexpr BridgeRow XRGBRow() {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::Words15uKernels& PK::Words15uKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::Words15uKernels& PK::Words15uKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr Words15uKernels kernels = {XRGBRow(), Row<Halve<false>>, Row<Halve<true>>};
     return kernels;

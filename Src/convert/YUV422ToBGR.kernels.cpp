@@ -21,7 +21,7 @@ using YUYVToBGR = UpsamplePairs<true, PixelBGRX<kMatrix>>;
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::YUV422ToBGRBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::YUV422ToBGRBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::UYVY601ToBGR8uRow, WindowRow<UYVYToBGR<kYUV8ToRGB8_601>>},

@@ -51,14 +51,14 @@ struct YUVToRGBFloat : PixelGroup<16, 16> {
 
 /// The direct kernels exist from SSE2 up: without it the router takes the way over VUYX8uToRGB8uRow.
 constexpr RowKernel FromSSE2(RowKernel body) {
-    return kTarget == Target::plain ? nullptr : body;
+    return Target::PK_TARGET == Target::plain ? nullptr : body;
 }
 
 } // namespace
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::YUVToRGBBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::YUVToRGBBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::YUV601ToRGBRow, Row<YUVToRGB8<kYUV8ToRGB8_601>>},

@@ -65,7 +65,7 @@ struct YUYVToYUYV : PairGroup {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::YUVToYUVBodies<PK::PK_TARGET::kTarget>() {
+PK::KernelBodies PK::YUVToYUVBodies<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr KernelBody bodies[] = {
         {Kernel::YUV601To709Row, Row<YUVToYUV8<kYUV601To709>>},

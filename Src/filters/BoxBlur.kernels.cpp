@@ -199,7 +199,7 @@ void BlurLine(const BoxPass& pass, const uint8_t* source, uint8_t* destination) 
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::BoxBlurKernels& PK::BoxBlurKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::BoxBlurKernels& PK::BoxBlurKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr BoxBlurKernels kernels = {BlurBundle, BlurLine};
     return kernels;

@@ -44,7 +44,7 @@ void ALawToLinear16Run(const uint8_t* source, uint8_t* destination, size_t count
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::ALawKernels& PK::ALawKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::ALawKernels& PK::ALawKernels::For<PK::Target::PK_TARGET>() {
     static constexpr ALawKernels kernels = {PK_TARGET::ALawToLinear16Run};
     return kernels;
 }

@@ -57,7 +57,7 @@ void ChannelRow(const uint8_t* source, uint8_t* destination, size_t bytes, const
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::ChannelKernels& PK::ChannelKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::ChannelKernels& PK::ChannelKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr ChannelKernels kernels = {ChannelRow<Replace>, ChannelRow<InvertInteger>,
                                                ChannelRow<InvertFloat>};

@@ -68,7 +68,7 @@ void ConvertRun(const uint8_t* source, uint8_t* destination, size_t count, Power
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::ConvertFloatKernels& PK::ConvertFloatKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::ConvertFloatKernels& PK::ConvertFloatKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr ConvertFloatKernels kernels = {ConvertRun<ToInt32<true>>, ConvertRun<ToInt32<false>>,
                                                     ConvertRun<ToInt16<true>>, ConvertRun<ToInt16<false>>};

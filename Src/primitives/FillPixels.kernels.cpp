@@ -36,7 +36,7 @@ void FillRun(uint8_t* destination, size_t bytes, const FillPattern& pattern) {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::FillKernels& PK::FillKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::FillKernels& PK::FillKernels::For<PK::Target::PK_TARGET>() {
     static constexpr FillKernels kernels = {PK_TARGET::FillRun};
     return kernels;
 }

@@ -62,7 +62,7 @@ void MultiplyRow(const uint8_t* source, uint8_t* destination, size_t pixels, Cha
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::MultiplyConstantKernels& PK::MultiplyConstantKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::MultiplyConstantKernels& PK::MultiplyConstantKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr MultiplyConstantKernels kernels = {MultiplyRow<false>, MultiplyRow<true>};
     return kernels;

@@ -99,7 +99,7 @@ void ReverseRow(const void* sourceRow, void* destinationRow, int32_t width) {
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::TransposeKernels& PK::TransposeKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::TransposeKernels& PK::TransposeKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr TransposeKernels kernels = {Transpose<Tile4>, Transpose<Tile8>, Transpose<Tile16>,
                                                  ReverseRow};

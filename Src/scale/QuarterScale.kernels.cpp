@@ -54,7 +54,7 @@ void InterleaveRow(const uint8_t* luma, const uint8_t* chroma1, const uint8_t* c
 } // namespace PK::PK_TARGET
 
 template <>
-const PK::QuarterScaleKernels& PK::QuarterScaleKernels::For<PK::PK_TARGET::kTarget>() {
+const PK::QuarterScaleKernels& PK::QuarterScaleKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr QuarterScaleKernels kernels = {Row<EvenBytes>, InterleaveRow<First::kLuma>,
                                                     InterleaveRow<First::kChroma>};

@@ -6,6 +6,7 @@
 #include <PixelKiln/BoxBlur.h>
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/CodecBridges.h>
+#include <PixelKiln/ColorSpace.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/Lifecycle.h>

@@ -1,7 +1,7 @@
 #pragma once
 
 // The vector types of the instruction set that this translation unit is compiled for. Kernel sources include
-// this header, Targets.h, the fixed-width integer and memory headers, and nothing of the standard library: an
+// this header, the fixed-width integer and memory headers, and nothing of the standard library: an
 // inline function of the library compiled for AVX2 might be the copy that the linker keeps for all.
 //
 // Every target has the same types and the same functions on them:
@@ -20,13 +20,9 @@
 //                            places of their own in memory
 //   LoadChannels, ...        kLanes four-channel pixels to and from four vectors, one a channel
 
-#include "primitives/simd/Targets.h"
-
 #include PK_TARGET_HEADER
 
 namespace PK::PK_TARGET {
-
-inline constexpr Target kTarget = Target::PK_TARGET;
 
 /// Four channels of kLanes pixels, in memory order: B, G, R, A or V, U, Y, A.
 struct Channels {

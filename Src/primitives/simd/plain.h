@@ -86,6 +86,9 @@ inline F32 Min(F32 a, F32 b) {
 inline F32 Max(F32 a, F32 b) {
     return Map<F32>(a, b, [](float x, float y) { return x > y ? x : y; });
 }
+inline F32 SquareRoot(F32 a) {
+    return Map<F32>(a, [](float x) { return _mm_cvtss_f32(_mm_sqrt_ss(_mm_set_ss(x))); });
+}
 inline F32 ReciprocalEstimate(F32 a) {
     return Map<F32>(a, [](float x) { return _mm_cvtss_f32(_mm_rcp_ss(_mm_set_ss(x))); });
 }

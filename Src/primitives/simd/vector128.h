@@ -68,6 +68,9 @@ inline F32 Min(F32 a, F32 b) {
 inline F32 Max(F32 a, F32 b) {
     return {_mm_max_ps(a.v, b.v)};
 }
+inline F32 SquareRoot(F32 a) {
+    return {_mm_sqrt_ps(a.v)};
+}
 inline F32 ReciprocalEstimate(F32 a) {
     return {_mm_rcp_ps(a.v)};
 }

@@ -1,0 +1,69 @@
+// The bodies of HLG.
+
+#include "colour/ApproxPower.h"
+#include "colour/ColourKernels.h"
+#include "colour/ColourLanes.h"
+#include "colour/HDRCurves.h"
+
+namespace PK {
+namespace PK_TARGET {
+namespace {
+
+void ToRec709(const float* source, float* destination, int32_t count, const float* matrix,
+              const float* table) {
+    const F32 outExponent = Floats(0.41666666f), ootfExponent = Floats(HLG::kOOTFExponent);
+    const Weights luma(HLG::kLuma);
+    const MatrixLanes lanes(matrix);
+    ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
+        LookUpSignals(colour, table, 2047);
+        F32 gain[1] = {luma.Sum(colour)};
+        ApproxPow(gain, ootfExponent);
+        gain[0] = gain[0] * Floats(HLG::kPeak);
+        for (F32& c : colour) c = c * gain[0];
+        lanes.Apply(colour);
+        const Signs signs = TakeSigns(colour);
+        ApproxPow(colour, outExponent);
+        PutSigns(colour, signs);
+    });
+}
+
+/// The signal of scene light E.
+inline F32 Encode(F32 E) {
+    constexpr float kSmallestNormal = 0x1p-126f;
+    const F32 root = SquareRoot(Floats(3) * E);
+    const I32 isRoot = Less(E, Floats(HLG::kSquareRootEnd));
+    if (!AnyNegative(isRoot ^ Ints(-1))) return root;
+    const F32 logarithm = ApproxLn(Max(E - Floats(HLG::kB12), Floats(kSmallestNormal)));
+    return Select(isRoot, root, MultiplyAdd(logarithm, Floats(HLG::kA), Floats(HLG::kC)));
+}
+
+void FromRec709(const float* source, float* destination, int32_t count, const float* matrix) {
+    const F32 inExponent = Floats(2.4f), ootfExponent = Floats(HLG::kInverseOOTFExponent);
+    const Weights luma(HLG::kLuma);
+    const MatrixLanes lanes(matrix);
+    ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
+        Signs signs = TakeSigns(colour);
+        ApproxPow(colour, inExponent);
+        PutSigns(colour, signs);
+        lanes.Apply(colour);
+        signs = TakeSigns(colour);
+        for (F32& c : colour) c = c * Floats(HLG::kLinearScale);
+        F32 power[1] = {luma.Sum(colour)};
+        ApproxPow(power, ootfExponent);
+        const F32 gain = Reciprocal(Max(power[0], Floats(HLG::kLeastLuminancePower)));
+        for (F32& c : colour) c = Encode(c * gain);
+        PutSigns(colour, signs);
+    });
+}
+
+constexpr HLGKernels kKernels = {ToRec709, FromRec709};
+
+} // namespace
+} // namespace PK_TARGET
+
+template <>
+const HLGKernels& HLGKernels::For<FloatTarget::PK_TARGET>() {
+    return PK_TARGET::kKernels;
+}
+
+} // namespace PK
