@@ -24,6 +24,6 @@ inline constexpr float kPeak = 10;                      ///< 1000 cd/m2
 inline constexpr float kInverseOOTFExponent = 1.0f / 6; ///< 1 / 1.2 - 1, but for the sign
 inline constexpr float kOOTFExponent = 0.2f;            ///< 1.2 - 1
 inline constexpr float kLeastLuminancePower = 0.0001f;  ///< keeps black from division by 0
-inline constexpr float kLuma[3] = {0.2627f, 0.678f, 0.0593f};
+constexpr float kLuma[3] = {0.2627f, 0.678f, 0.0593f};
 
 } // namespace PK::HLG
