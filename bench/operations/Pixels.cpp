@@ -62,8 +62,12 @@ Run ToInt16(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+template <int32_t kPixelBytes>
 Run Transpose(const uint8_t* source, uint8_t* destination) {
-    return [=] { PK_Transpose(source, kBGRARowBytes, destination, kTurnedRowBytes, kWidth, kHeight, 4); };
+    return [=] {
+        PK_Transpose(source, kPixelBytes * kWidth, destination, kPixelBytes * kHeight, kWidth, kHeight,
+                     kPixelBytes);
+    };
 }
 
 template <int32_t kDegrees>
@@ -123,7 +127,14 @@ const AddOperations add = {
      0.7, ToInt16<0>},
     {"Float to 16-bit integer, rounding mode 1", 4 * kCount, 2 * kCount, Samples::Floats, Against::Memcpy,
      0.7, ToInt16<1>},
-    {"Transpose BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Transpose},
+    {"Transpose BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Transpose<4>},
+    {"Transpose pixels of 1 byte", kCount, kCount, Samples::Bytes, Against::Peer, 0.95, Transpose<1>},
+    {"Transpose pixels of 2 bytes", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<2>},
+    {"Transpose pixels of 8 bytes", 8 * kCount, 8 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<8>},
+    {"Transpose pixels of 16 bytes", 16 * kCount, 16 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<16>},
     {"Rotate BGRA 8u by 90 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Rotate<90>},
     {"Rotate BGRA 8u by 180 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95,
      Rotate<180>},
