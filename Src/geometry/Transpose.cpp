@@ -14,7 +14,7 @@ namespace {
 
 using TransposeKernel = void (*)(const TransposeArea&);
 
-/// One pixel after the other, for small pixels and where no vectors are used. Tiles of 16 by 16 keep the columns'
+/// One pixel after the other, where no vectors are used. Tiles of 16 by 16 keep the columns'
 /// cache lines.
 template <int32_t kPixelBytes>
 void TransposePixelwise(const TransposeArea& area) {
@@ -30,6 +30,10 @@ TransposeKernel VectorKernel(uint8_t pixelBytes) {
     if (!sCPUHasSSE2) return nullptr;
     const TransposeKernels& kernels = Best<TransposeKernels>();
     switch (pixelBytes) {
+    case 1:
+        return kernels.pixels1;
+    case 2:
+        return kernels.pixels2;
     case 4:
         return kernels.pixels4;
     case 8:
@@ -100,10 +104,11 @@ PK_Result PK_Transpose(const void* source, int32_t sourceRowBytes, void* dest, i
     if (width == 0 || height == 0) return PK_Success;
     if (!source || !dest) return PK_ErrFailed;
 
-    // Deliberate: only the vector form takes steps that are no multiple of the pixel as they are.
-    kernel({static_cast<const uint8_t*>(source),
-            vector ? sourceRowBytes : WholePixels(sourceRowBytes, pixelBytes), static_cast<uint8_t*>(dest),
-            vector ? destRowBytes : WholePixels(destRowBytes, pixelBytes), height, width});
+    // Deliberate: only the vector form of pixels from 4 bytes on takes steps that are no multiple of the pixel as
+    // they are.
+    const int32_t unit = vector && pixelBytes >= 4 ? 1 : pixelBytes;
+    kernel({static_cast<const uint8_t*>(source), WholePixels(sourceRowBytes, unit),
+            static_cast<uint8_t*>(dest), WholePixels(destRowBytes, unit), height, width});
     return PK_Success;
 }
 

@@ -1,5 +1,5 @@
 // Transposition in tiles: a tile takes as many source rows as fill a vector, and one block of four lanes from each.
-// Its transposed vectors are runs of destination rows.
+// Its transposed vectors are runs of destination rows. Tiles are moved in blocks, whose largest sizes are measured.
 
 #include "primitives/TransposeKernels.h"
 #include "primitives/simd/Target.h"
@@ -7,12 +7,41 @@
 namespace PK::PK_TARGET {
 namespace {
 
-/// Source rows that are walked together. A cache line of each stays in the cache while the columns go by, and
-/// destination rows are written in runs of whole lines.
-inline constexpr int32_t kBandRows = 16;
+/// Rows of the pixels that fill a block, one a vector, to columns. To interleave every row with the one half the rows
+/// on turns the bits of a pixel's place, those of its row before those of its column, by one.
+template <void kInterleave(I32, I32, I32&, I32&), int kSide>
+inline void TransposeBlocks(I32 (&rows)[kSide]) {
+    for (int bit = 1; bit < kSide; bit *= 2) {
+        I32 turned[kSide];
+        for (int i = 0; i < kSide / 2; ++i)
+            kInterleave(rows[i], rows[i + kSide / 2], turned[2 * i], turned[2 * i + 1]);
+        for (int i = 0; i < kSide; ++i) rows[i] = turned[i];
+    }
+}
+
+/// As many rows in each block as pixels.
+template <int32_t kBytes, void kInterleave(I32, I32, I32&, I32&)>
+struct SquareTile {
+    static constexpr int32_t kPixelBytes = kBytes, kColumns = 16 / kBytes, kRows = kColumns * kLanes / 4;
+    static constexpr int32_t kBlockRows = 64 / kBytes, kBlockColumns = 2 * kColumns;
+
+    static void Move(const uint8_t* source, int64_t sourceStep, uint8_t* destination,
+                     int64_t destinationStep) {
+        I32 pixels[kColumns];
+        for (int32_t row = 0; row < kColumns; ++row)
+            pixels[row] = Bits(LoadFloatBlocks(source + row * sourceStep, kColumns * sourceStep));
+        TransposeBlocks<kInterleave>(pixels);
+        for (int32_t column = 0; column < kColumns; ++column)
+            Store(destination + column * destinationStep, pixels[column]);
+    }
+};
+
+using Tile1 = SquareTile<1, InterleaveBytesInBlocks>;
+using Tile2 = SquareTile<2, InterleaveHalvesInBlocks>;
 
 struct Tile4 {
     static constexpr int32_t kPixelBytes = 4, kRows = kLanes, kColumns = 4;
+    static constexpr int32_t kBlockRows = 16, kBlockColumns = 8;
 
     static void Move(const uint8_t* source, int64_t sourceStep, uint8_t* destination,
                      int64_t destinationStep) {
@@ -30,6 +59,7 @@ struct Tile4 {
 
 struct Tile8 {
     static constexpr int32_t kPixelBytes = 8, kRows = kLanes / 2, kColumns = 2;
+    static constexpr int32_t kBlockRows = 16, kBlockColumns = 8;
 
     static void Move(const uint8_t* source, int64_t sourceStep, uint8_t* destination,
                      int64_t destinationStep) {
@@ -43,6 +73,7 @@ struct Tile8 {
 /// As many columns as share a cache line.
 struct Tile16 {
     static constexpr int32_t kPixelBytes = 16, kRows = kLanes / 4, kColumns = 4;
+    static constexpr int32_t kBlockRows = 32, kBlockColumns = 32;
 
     static void Move(const uint8_t* source, int64_t sourceStep, uint8_t* destination,
                      int64_t destinationStep) {
@@ -52,32 +83,48 @@ struct Tile16 {
     }
 };
 
-/// Rows and columns that fill no tile.
-template <class Tile>
-void MoveRim(const TransposeArea& area, int32_t firstRow, int32_t lastRow, int32_t firstColumn) {
-    for (int32_t column = firstColumn; column < area.columns; ++column)
-        for (int32_t row = firstRow; row < lastRow; ++row)
-            std::memcpy(area.destination + column * area.destinationStep + int64_t{row} * Tile::kPixelBytes,
-                        area.source + row * area.sourceStep + int64_t{column} * Tile::kPixelBytes,
-                        Tile::kPixelBytes);
+/// What is too small for a tile.
+template <int32_t kPixelBytes>
+void TransposePixelwise(const TransposeArea& area) {
+    for (int32_t column = 0; column < area.columns; ++column)
+        for (int32_t row = 0; row < area.rows; ++row)
+            std::memcpy(area.destination + column * area.destinationStep + int64_t{row} * kPixelBytes,
+                        area.source + row * area.sourceStep + int64_t{column} * kPixelBytes, kPixelBytes);
 }
 
+inline int32_t Lesser(int32_t a, int32_t b) {
+    return a < b ? a : b;
+}
+
+/// A part of the area. The last tiles of the area end with its last row and column, and overlap those before them.
+template <class Tile>
+void TransposeBlock(const TransposeArea& area, int32_t firstRow, int32_t endRow, int32_t firstColumn,
+                    int32_t endColumn) {
+    for (int32_t tileColumn = firstColumn; tileColumn < endColumn; tileColumn += Tile::kColumns) {
+        const int32_t column = Lesser(tileColumn, area.columns - Tile::kColumns);
+        for (int32_t tileRow = firstRow; tileRow < endRow; tileRow += Tile::kRows) {
+            const int32_t row = Lesser(tileRow, area.rows - Tile::kRows);
+            Tile::Move(area.source + row * area.sourceStep + int64_t{column} * Tile::kPixelBytes,
+                       area.sourceStep,
+                       area.destination + column * area.destinationStep + int64_t{row} * Tile::kPixelBytes,
+                       area.destinationStep);
+        }
+    }
+}
+
+/// In blocks that use up cache lines of both images while they are in the cache. Blocks follow one another down the
+/// rows: few destination rows are written at a time, and each goes on where it was left.
 template <class Tile>
 void Transpose(const TransposeArea& area) {
-    const int32_t tiledColumns = area.columns - area.columns % Tile::kColumns;
-    const int32_t tiledRows = area.rows - area.rows % Tile::kRows;
-    for (int32_t band = 0; band < tiledRows; band += kBandRows) {
-        const int32_t bandEnd = band + kBandRows < tiledRows ? band + kBandRows : tiledRows;
-        for (int32_t column = 0; column < tiledColumns; column += Tile::kColumns)
-            for (int32_t row = band; row < bandEnd; row += Tile::kRows)
-                Tile::Move(area.source + row * area.sourceStep + int64_t{column} * Tile::kPixelBytes,
-                           area.sourceStep,
-                           area.destination + column * area.destinationStep +
-                               int64_t{row} * Tile::kPixelBytes,
-                           area.destinationStep);
-        MoveRim<Tile>(area, band, bandEnd, tiledColumns);
-    }
-    MoveRim<Tile>(area, tiledRows, area.rows, 0);
+    if (area.rows < Tile::kRows || area.columns < Tile::kColumns)
+        return TransposePixelwise<Tile::kPixelBytes>(area);
+    // A source row of one cache line is read once.
+    const bool areRowsOneLine = area.columns <= 64 / Tile::kPixelBytes;
+    const int32_t blockColumns = areRowsOneLine ? area.columns : Tile::kBlockColumns;
+    for (int32_t column = 0; column < area.columns; column += blockColumns)
+        for (int32_t row = 0; row < area.rows; row += Tile::kBlockRows)
+            TransposeBlock<Tile>(area, row, Lesser(row + Tile::kBlockRows, area.rows), column,
+                                 Lesser(column + blockColumns, area.columns));
 }
 
 void ReverseRow(const void* sourceRow, void* destinationRow, int32_t width) {
@@ -101,7 +148,7 @@ void ReverseRow(const void* sourceRow, void* destinationRow, int32_t width) {
 template <>
 const PK::TransposeKernels& PK::TransposeKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr TransposeKernels kernels = {Transpose<Tile4>, Transpose<Tile8>, Transpose<Tile16>,
-                                                 ReverseRow};
+    static constexpr TransposeKernels kernels = {Transpose<Tile1>, Transpose<Tile2>,  Transpose<Tile4>,
+                                                 Transpose<Tile8>, Transpose<Tile16>, ReverseRow};
     return kernels;
 }

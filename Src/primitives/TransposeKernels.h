@@ -17,6 +17,8 @@ struct TransposeArea {
 };
 
 struct TransposeKernels {
+    void (*pixels1)(const TransposeArea& area);
+    void (*pixels2)(const TransposeArea& area);
     void (*pixels4)(const TransposeArea& area);
     void (*pixels8)(const TransposeArea& area);
     void (*pixels16)(const TransposeArea& area);

@@ -9,23 +9,36 @@
 #include <PixelKiln/Rotate.h>
 #include <PixelKiln/Utilities.h>
 
+#include <cstring>
 #include <memory>
 
 namespace OperationBench {
 namespace {
 
 constexpr size_t kCount = kPixels;
+constexpr size_t kRows = kHeight;
+constexpr int32_t kPadding = 64; // bytes between padded rows
 
 template <PK_PixelFormat kFormat, int32_t kRowBytes>
 Run FillBlack(const uint8_t*, uint8_t* image) {
     return [=] { PK_FillWithOpaqueBlack(image, kRowBytes, kWidth, kHeight, kFormat); };
 }
 
+template <int32_t kRowBytes>
+Run MemsetRows(const uint8_t*, uint8_t* image) {
+    return [=] {
+        for (int32_t row = 0; row < kHeight; ++row)
+            std::memset(image + static_cast<ptrdiff_t>(row) * (kRowBytes + kPadding), 128, kRowBytes);
+    };
+}
+
+/// Frames of so many times the width and height.
+template <int32_t kScale>
 Run FillColour(const uint8_t*, uint8_t* image) {
     return [=] {
         constexpr uint8_t kOrange[] = {0, 128, 255, 255};
-        PK_FillWithColor(image, kBGRARowBytes, kWidth, kHeight, PK_PixelFormat_BGRA_4444_8u, kOrange,
-                         PK_PixelFormat_BGRA_4444_8u);
+        PK_FillWithColor(image, kScale * kBGRARowBytes, kScale * kWidth, kScale * kHeight,
+                         PK_PixelFormat_BGRA_4444_8u, kOrange, PK_PixelFormat_BGRA_4444_8u);
     };
 }
 
@@ -49,8 +62,12 @@ Run ToInt16(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+template <int32_t kPixelBytes>
 Run Transpose(const uint8_t* source, uint8_t* destination) {
-    return [=] { PK_Transpose(source, kBGRARowBytes, destination, kTurnedRowBytes, kWidth, kHeight, 4); };
+    return [=] {
+        PK_Transpose(source, kPixelBytes * kWidth, destination, kPixelBytes * kHeight, kWidth, kHeight,
+                     kPixelBytes);
+    };
 }
 
 template <int32_t kDegrees>
@@ -90,11 +107,17 @@ Run Warp(const uint8_t* source, uint8_t* destination) {
 
 // clang-format off: one row an operation
 const AddOperations add = {
-    {"Fill BGRA 8u with a colour", 0, 4 * kCount, Samples::Bytes, Against::Memset, 0.9, FillColour},
+    {"Fill BGRA 8u with a colour", 0, 4 * kCount, Samples::Bytes, Against::Memset, 0.9, FillColour<1>},
+    {"Fill BGRA 8u of 3840 x 2160 with a colour", 0, 16 * kCount, Samples::Bytes, Against::Memset, 0.9,
+     FillColour<2>},
     {"Fill UYVY 8u with black", 0, 2 * kCount, Samples::Bytes, Against::Memset, 0.9,
      FillBlack<PK_PixelFormat_UYVY_422_8u, 2 * kWidth>},
     {"Fill BGRA 32f with black", 0, 16 * kCount, Samples::Bytes, Against::Memset, 0.9,
      FillBlack<PK_PixelFormat_BGRA_4444_32f, 16 * kWidth>},
+    {"Fill padded rows of BGRA 8u with black", 0, (4 * kWidth + kPadding) * kRows, Samples::Bytes,
+     Against::Peer, 0.9, FillBlack<PK_PixelFormat_BGRA_4444_8u, 4 * kWidth + kPadding>},
+    {"Fill padded rows of BGRA 32f with black", 0, (16 * kWidth + kPadding) * kRows, Samples::Bytes,
+     Against::Peer, 0.9, FillBlack<PK_PixelFormat_BGRA_4444_32f, 16 * kWidth + kPadding>},
     {"A-law to 16 bits", kCount, 2 * kCount, Samples::Bytes, Against::Memcpy, 0.7, DecodeALaw},
     {"Float to 32-bit integer, rounding mode 0", 4 * kCount, 4 * kCount, Samples::Floats, Against::Memcpy,
      0.7, ToInt32<0>},
@@ -104,7 +127,14 @@ const AddOperations add = {
      0.7, ToInt16<0>},
     {"Float to 16-bit integer, rounding mode 1", 4 * kCount, 2 * kCount, Samples::Floats, Against::Memcpy,
      0.7, ToInt16<1>},
-    {"Transpose BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Transpose},
+    {"Transpose BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Transpose<4>},
+    {"Transpose pixels of 1 byte", kCount, kCount, Samples::Bytes, Against::Peer, 0.95, Transpose<1>},
+    {"Transpose pixels of 2 bytes", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<2>},
+    {"Transpose pixels of 8 bytes", 8 * kCount, 8 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<8>},
+    {"Transpose pixels of 16 bytes", 16 * kCount, 16 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<16>},
     {"Rotate BGRA 8u by 90 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Rotate<90>},
     {"Rotate BGRA 8u by 180 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95,
      Rotate<180>},
@@ -117,6 +147,11 @@ const AddOperations add = {
     {"Quad warp, nearest", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 1, Warp<2>},
 };
 // clang-format on
+
+const AddPeers addPeers = {
+    {"Fill padded rows of BGRA 8u with black", "memset row by row", false, MemsetRows<4 * kWidth>},
+    {"Fill padded rows of BGRA 32f with black", "memset row by row", false, MemsetRows<16 * kWidth>},
+};
 
 } // namespace
 } // namespace OperationBench

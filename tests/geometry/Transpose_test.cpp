@@ -6,6 +6,7 @@
 
 #include "frame/Capabilities.h"
 #include "primitives/Dispatch.h"
+#include "primitives/TransposeKernels.h"
 #include "support/FlagScope.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
@@ -14,6 +15,7 @@
 
 #include <algorithm>
 #include <array>
+#include <functional>
 #include <vector>
 
 namespace {
@@ -58,11 +60,57 @@ struct Pixels {
     }
 };
 
+using TransposeFunction = std::function<void(const Pixels& source, const Pixels& destination)>;
+
+void ByInterface(const Pixels& source, const Pixels& destination) {
+    ASSERT_EQ(PK_Success, PK_Transpose(source.First(), static_cast<int32_t>(source.step), destination.First(),
+                                       static_cast<int32_t>(destination.step), source.columns, source.rows,
+                                       static_cast<uint8_t>(source.pixelBytes)));
+}
+
 class TransposeBodies : public testing::TestWithParam<PK::Target> {
 protected:
     void SetUp() override {
         LeaveOnly(GetParam());
         if (!PK::IsEnabled(GetParam())) GTEST_SKIP() << "not on this processor";
+    }
+
+    /// The body of the target itself, which the interface does not choose for all.
+    void ByBody(const Pixels& source, const Pixels& destination) const {
+        const auto& kernels = PK::KernelsFor<PK::TransposeKernels>(GetParam());
+        const PK::TransposeArea area = {source.First(),   source.step, destination.First(),
+                                        destination.step, source.rows, source.columns};
+        switch (source.pixelBytes) {
+        case 1:
+            return kernels.pixels1(area);
+        case 2:
+            return kernels.pixels2(area);
+        case 4:
+            return kernels.pixels4(area);
+        case 8:
+            return kernels.pixels8(area);
+        default:
+            return kernels.pixels16(area);
+        }
+    }
+
+    /// Transposes random pixels in rows of random order and distance, which end or begin at a guard page.
+    void Check(const TransposeFunction& transpose, int32_t width, int32_t height, int32_t pixelBytes) {
+        const int32_t padding = pixelBytes * static_cast<int32_t>(random.Below(3));
+        const bool sourceUpward = random.Below(2) != 0, destinationUpward = random.Below(2) != 0;
+        const Guard guard = random.Below(2) != 0 ? Guard::kAfter : Guard::kBefore;
+        const Pixels source(height, width, pixelBytes, padding, sourceUpward, guard);
+        const Pixels destination(width, height, pixelBytes, 2 * padding, destinationUpward, guard);
+        random.Fill(source.memory.Bytes(), source.memory.Size());
+        std::fill_n(destination.memory.Bytes(), destination.memory.Size(), uint8_t{0xa5});
+
+        transpose(source, destination);
+        for (int32_t row = 0; row < height; ++row)
+            for (int32_t column = 0; column < width; ++column)
+                ASSERT_TRUE(source.Same(row, column, destination, column, row))
+                    << pixelBytes << " bytes, " << width << "x" << height << ", row " << row << ", column "
+                    << column << ", seed " << random.Seed();
+        ASSERT_TRUE(destination.PaddingIs(0xa5));
     }
 
     FlagScope flags;
@@ -72,25 +120,23 @@ protected:
 TEST_P(TransposeBodies, EveryPixelChangesItsRowForItsColumn) {
     for (const int32_t pixelBytes : {1, 2, 4, 8, 16})
         for (int round = 0; round < 150; ++round) {
-            const auto width = static_cast<int32_t>(random.Below(round < 100 ? 40 : 150));
-            const auto height = static_cast<int32_t>(random.Below(round < 100 ? 40 : 150));
-            const int32_t padding = pixelBytes * static_cast<int32_t>(random.Below(3));
-            const bool sourceUpward = random.Below(2) != 0, destinationUpward = random.Below(2) != 0;
-            const Guard guard = random.Below(2) != 0 ? Guard::kAfter : Guard::kBefore;
-            const Pixels source(height, width, pixelBytes, padding, sourceUpward, guard);
-            const Pixels destination(width, height, pixelBytes, 2 * padding, destinationUpward, guard);
-            random.Fill(source.memory.Bytes(), source.memory.Size());
-            std::fill_n(destination.memory.Bytes(), destination.memory.Size(), uint8_t{0xa5});
+            const uint32_t limit = round < 100 ? 40 : 150;
+            const auto width = static_cast<int32_t>(random.Below(limit));
+            const auto height = static_cast<int32_t>(random.Below(limit));
+            ASSERT_NO_FATAL_FAILURE(Check(ByInterface, width, height, pixelBytes));
+        }
+}
 
-            ASSERT_EQ(PK_Success, PK_Transpose(source.First(), static_cast<int32_t>(source.step),
-                                               destination.First(), static_cast<int32_t>(destination.step),
-                                               width, height, static_cast<uint8_t>(pixelBytes)));
-            for (int32_t row = 0; row < height; ++row)
-                for (int32_t column = 0; column < width; ++column)
-                    ASSERT_TRUE(source.Same(row, column, destination, column, row))
-                        << pixelBytes << " bytes, " << width << "x" << height << ", row " << row
-                        << ", column " << column << ", seed " << random.Seed();
-            ASSERT_TRUE(destination.PaddingIs(0xa5));
+TEST_P(TransposeBodies, EveryWidthAndHeightThatFillsTilesOrDoesNot) {
+    const auto byBody = [this](const Pixels& source, const Pixels& destination) {
+        ByBody(source, destination);
+    };
+    for (const int32_t pixelBytes : {1, 2, 4, 8, 16})
+        for (int32_t size = 0; size <= 70; ++size) {
+            const auto other = static_cast<int32_t>(random.Below(140));
+            ASSERT_NO_FATAL_FAILURE(Check(byBody, size, other, pixelBytes));
+            ASSERT_NO_FATAL_FAILURE(Check(byBody, other, size, pixelBytes));
+            ASSERT_NO_FATAL_FAILURE(Check(byBody, size, size, pixelBytes));
         }
 }
 
@@ -157,6 +203,26 @@ TEST(Transpose, OnlyTheVectorFormKeepsStepsThatAreNoWholePixels) {
     PK_SetDebugFlag(3, 0);
     ASSERT_EQ(PK_Success, PK_Transpose(source.data(), 7, destination.data(), 8, 1, 2, 4));
     EXPECT_EQ(4, destination[4]);
+}
+
+TEST(Transpose, PixelsOfTwoBytesAreAlwaysWholeStepsApart) {
+    const FlagScope flags;
+    PK::DetectProcessor();
+    constexpr int32_t width = 8, height = 64; // whole tiles of any body
+    constexpr size_t bytes = height * (2 * width + 1);
+    std::array<uint8_t, bytes> source{}, destination{};
+    for (size_t i = 0; i < source.size(); ++i) source[i] = static_cast<uint8_t>(i);
+    for (const int32_t sse2 : {1, 0}) {
+        PK_SetDebugFlag(3, sse2);
+        destination.fill(0);
+        ASSERT_EQ(PK_Success, PK_Transpose(source.data(), 2 * width + 1, destination.data(), 2 * height + 1,
+                                           width, height, 2));
+        for (int32_t row = 0; row < height; ++row)
+            for (int32_t column = 0; column < width; ++column)
+                ASSERT_EQ(source[static_cast<size_t>(2 * (row * width + column))],
+                          destination[static_cast<size_t>(2 * (column * height + row))])
+                    << "SSE2 " << sse2 << ", row " << row << ", column " << column;
+    }
 }
 
 TEST(Transpose, RefusesWhatItCannotMove) {

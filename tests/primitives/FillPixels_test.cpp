@@ -104,6 +104,29 @@ TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
     }
 }
 
+TEST(FillPixels, FillsTheRowsOfLargeImagesBetweenTheirGaps) {
+    Random random(13);
+    constexpr int32_t kRows = 300; // of 4 KiB make an image of more than 1 MiB
+    constexpr int32_t kRowBytes = 4096;
+    std::vector<uint8_t> periodic = random.Bytes(16);
+    std::copy_n(periodic.begin(), 8, periodic.begin() + 8);
+    for (const Target target : TargetsOfThisProcessor()) {
+        for (const std::vector<uint8_t>& pixel :
+             {random.Bytes(4), random.Bytes(8), random.Bytes(16), periodic}) {
+            const auto size = static_cast<int32_t>(pixel.size());
+            const size_t margin = random.Below(70);
+            // Gaps with which rows begin at the same place in a cache line, in a vector, and nowhere in particular.
+            for (const ptrdiff_t padding : {64, 48, 20, 7}) {
+                CheckFill(target, pixel, {kRowBytes / size, kRows, padding, false}, Guard::kAfter, margin);
+                CheckFill(target, pixel, {kRowBytes / size + 3, kRows, padding, true}, Guard::kBefore,
+                          margin);
+            }
+            CheckFill(target, pixel, {kRowBytes / size - 1, kRows, 20, false}, Guard::kAfter, margin);
+            CheckFill(target, pixel, {5 * kRowBytes / size, kRows / 4, 20, false}, Guard::kAfter, margin);
+        }
+    }
+}
+
 TEST(FillPixels, OfNothingWritesNothing) {
     uint8_t bytes[4] = {1, 2, 3, 4};
     const std::vector<uint8_t> pixel = {9, 9, 9, 9};

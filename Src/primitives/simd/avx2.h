@@ -258,6 +258,11 @@ inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
     low = {_mm256_unpacklo_epi16(a.v, b.v)};
     high = {_mm256_unpackhi_epi16(a.v, b.v)};
 }
+/// The same with bytes: a0 b0 to a7 b7 and a8 b8 to a15 b15.
+inline void InterleaveBytesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    low = {_mm256_unpacklo_epi8(a.v, b.v)};
+    high = {_mm256_unpackhi_epi8(a.v, b.v)};
+}
 /// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
 inline I32 PackSignedInBlocks(I32 a, I32 b) {
     return {_mm256_packs_epi32(a.v, b.v)};

@@ -503,6 +503,15 @@ inline void InterleaveHalvesInBlocks(I32 a, I32 b, I32& low, I32& high) {
         result.lane[lane + 1] = a.lane[i] >> 16 | (b.lane[i] & 0xffff0000);
     }
 }
+/// The same with bytes: a0 b0 to a7 b7 and a8 b8 to a15 b15.
+inline void InterleaveBytesInBlocks(I32 a, I32 b, I32& low, I32& high) {
+    uint8_t from[2][16], bytes[32];
+    Store(from[0], a);
+    Store(from[1], b);
+    for (int i = 0; i < 32; ++i) bytes[i] = from[i % 2][i / 2];
+    low = LoadInts(bytes);
+    high = LoadInts(bytes + 16);
+}
 /// In each block: the lanes of a and then those of b, saturated to signed 16-bit halves.
 inline I32 PackSignedInBlocks(I32 a, I32 b) {
     const I32 low = Ints(-32768), high = Ints(32767);

@@ -21,9 +21,14 @@ Run Turn(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+Run TransposeBytes(const uint8_t* source, uint8_t* destination) {
+    return [=] { libyuv::TransposePlane(source, kWidth, destination, kHeight, kWidth, kHeight); };
+}
+
 const AddPeers add = {
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
     {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
+    {"Transpose pixels of 1 byte", "libyuv TransposePlane", true, TransposeBytes},
     {"Rotate BGRA 8u by 90 degrees", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, kHeight>},
     {"Rotate BGRA 8u by 180 degrees", "libyuv ARGBRotate", true, Turn<libyuv::kRotate180, kHeight>},
     {"Rotate BGRA 8u by 270 degrees", "libyuv ARGBRotate", true, Turn<libyuv::kRotate270, kHeight>},

@@ -27,8 +27,11 @@ Run FromRGB(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+template <int kType>
 Run Transpose(const uint8_t* source, uint8_t* destination) {
-    return [from = Upright(source), to = Turned(destination)] { cv::transpose(from, to); };
+    return [from = Wrap(source, kWidth, kHeight, kType), to = Wrap(destination, kHeight, kWidth, kType)] {
+        cv::transpose(from, to);
+    };
 }
 
 template <int kCode>
@@ -59,7 +62,11 @@ Run Warp(const uint8_t* source, uint8_t* destination) {
 
 const AddPeers add = {
     {"RGB 8u to BGRA 8u", "OpenCV cvtColor", true, FromRGB},
-    {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose},
+    {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose<CV_8UC4>},
+    {"Transpose pixels of 1 byte", "OpenCV transpose", true, Transpose<CV_8UC1>},
+    {"Transpose pixels of 2 bytes", "OpenCV transpose", true, Transpose<CV_16UC1>},
+    {"Transpose pixels of 8 bytes", "OpenCV transpose", true, Transpose<CV_16UC4>},
+    {"Transpose pixels of 16 bytes", "OpenCV transpose", true, Transpose<CV_32FC4>},
     {"Rotate BGRA 8u by 90 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_CLOCKWISE>},
     {"Rotate BGRA 8u by 180 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_180>},
     {"Rotate BGRA 8u by 270 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_COUNTERCLOCKWISE>},
