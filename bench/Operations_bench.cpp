@@ -37,6 +37,7 @@ struct PeerResult {
     const char* name;
     double seconds;
     int difference; // negative where none can be told
+    bool setsAim;
 };
 
 struct Result {
@@ -99,7 +100,7 @@ Result Measure(const Operation& operation) {
             peers[i].isComparable
                 ? LargestDifference(destinations[0].get(), destinations[i + 1].get(), operation.bytesWritten)
                 : -1;
-        result.peers.push_back({peers[i].name, seconds[i + 1], difference});
+        result.peers.push_back({peers[i].name, seconds[i + 1], difference, peers[i].setsAim});
     }
     std::sort(result.peers.begin(), result.peers.end(),
               [](const PeerResult& a, const PeerResult& b) { return a.seconds < b.seconds; });
@@ -108,8 +109,9 @@ Result Measure(const Operation& operation) {
 
 std::string Verdict(const Operation& operation, const Result& result) {
     const bool againstPeer = operation.against == Against::Peer;
-    if (operation.against == Against::Nothing || (againstPeer && result.peers.empty())) return "-";
-    const double reference = againstPeer ? result.peers.front().seconds : result.memorySeconds;
+    const auto fastest = std::ranges::find(result.peers, true, &PeerResult::setsAim);
+    if (operation.against == Against::Nothing || (againstPeer && fastest == result.peers.end())) return "-";
+    const double reference = againstPeer ? fastest->seconds : result.memorySeconds;
     char text[32];
     std::snprintf(text, sizeof text, "%g, %s", operation.share,
                   reference / result.seconds >= operation.share ? "met" : "**missed**");

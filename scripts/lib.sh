@@ -41,7 +41,7 @@ build_packages=(g++ cmake ninja-build pkg-config libboost-dev)
 tool_packages=(libpng-dev libcli11-dev libcairo2-dev fonts-dejavu-core)
 test_packages=(libgtest-dev)
 bench_packages=(libbenchmark-dev libyuv-dev libswscale-dev libavcodec-dev libavutil-dev libopencv-core-dev
-    libopencv-imgproc-dev libzimg-dev)
+    libopencv-imgproc-dev libzimg-dev libopencolorio-dev)
 
 # configure DIRECTORY [CMAKE_ARGUMENT...]
 configure() {

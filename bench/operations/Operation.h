@@ -50,6 +50,7 @@ struct Peer {
     const char* name;
     bool isComparable; ///< writes the same bytes but for rounding
     Prepare prepare;
+    bool setsAim = true; ///< not where its result is much less exact than ours
 };
 
 std::vector<Operation>& AllOperations();

@@ -3,55 +3,10 @@
 // "Approximate" allows its gamma by table.
 
 #include "frames/Peer.h"
-#include "frames/peers/Planes.h"
-
-#include <zimg.h>
-
-#include <cstdio>
-#include <cstdlib>
+#include "frames/peers/ZimgGraph.h"
 
 namespace FrameBench {
 namespace {
-
-constexpr size_t kAlignment = 64;
-
-struct Graph {
-    Graph(const zimg_image_format& source, const zimg_image_format& destination, bool approximate) {
-        zimg_graph_builder_params params;
-        zimg_graph_builder_params_default(&params, ZIMG_API_VERSION);
-        params.cpu_type = ZIMG_CPU_AUTO_64B;
-        params.allow_approximate_gamma = approximate;
-        graph.reset(zimg_filter_graph_build(&source, &destination, &params));
-        if (!graph) {
-            char message[256];
-            zimg_get_last_error(message, sizeof message);
-            std::fprintf(stderr, "zimg: %s\n", message);
-            std::exit(1);
-        }
-        size_t bytes = 0;
-        zimg_filter_graph_get_tmp_size(graph.get(), &bytes);
-        scratch = Allocate(bytes + kAlignment);
-    }
-
-    void Process(const zimg_image_buffer_const& source, const zimg_image_buffer& destination) const {
-        zimg_filter_graph_process(graph.get(), &source, &destination, scratch.get(), nullptr, nullptr,
-                                  nullptr, nullptr);
-    }
-
-    struct FreeGraph {
-        void operator()(zimg_filter_graph* each) const { zimg_filter_graph_free(each); }
-    };
-    std::unique_ptr<zimg_filter_graph, FreeGraph> graph;
-    Bytes scratch;
-};
-
-template <class Buffer>
-Buffer EmptyBuffer() {
-    Buffer buffer = {};
-    buffer.version = ZIMG_API_VERSION;
-    for (auto& plane : buffer.plane) plane.mask = ZIMG_BUFFER_MAX;
-    return buffer;
-}
 
 template <class Buffer>
 Buffer BufferOf(const Image& image) {
@@ -59,27 +14,6 @@ Buffer BufferOf(const Image& image) {
     buffer.plane[0].data = image.bytes.get();
     buffer.plane[0].stride = image.rowBytes;
     return buffer;
-}
-
-template <class Buffer>
-Buffer BufferOf(const Planes& planes, int32_t rowBytes) {
-    Buffer buffer = EmptyBuffer<Buffer>();
-    for (int i = 0; i < 3; ++i) {
-        buffer.plane[i].data = planes.Plane(i);
-        buffer.plane[i].stride = rowBytes;
-    }
-    return buffer;
-}
-
-zimg_image_format OfSize(uint32_t width, zimg_pixel_type_e type) {
-    zimg_image_format format;
-    zimg_image_format_default(&format, ZIMG_API_VERSION);
-    format.width = width;
-    format.height = kHeight;
-    format.pixel_type = type;
-    format.depth = type == ZIMG_PIXEL_BYTE ? 8 : type == ZIMG_PIXEL_WORD ? 15 : 32;
-    format.pixel_range = ZIMG_RANGE_FULL;
-    return format;
 }
 
 template <zimg_pixel_type_e kSource, zimg_pixel_type_e kDestination>
