@@ -1,7 +1,6 @@
 #pragma once
 
-// A contact sheet: pictures side by side with words under them. Cairo scales the pictures and sets the words,
-// so that no font and no scaler of our own is needed for it.
+// A contact sheet: pictures side by side with words under them.
 
 #include "Frame.h"
 
