@@ -1,7 +1,8 @@
 // pixelkiln demo: one photograph through a dozen formats and back, and what that did to it; and what the
-// operations on frames make of it.
+// operations on frames and the colour spaces make of it.
 
 #include "Chains.h"
+#include "ColourPictures.h"
 #include "Commands.h"
 #include "Difference.h"
 #include "Failure.h"
@@ -92,6 +93,12 @@ void RunDemo(const DemoOptions& options) {
     WriteSheet(OperationTiles(picture), name + " filled over, turned, blurred, warped and stamped",
                operations);
     Print(operations + " shows what the operations do\n");
+    const std::string colour = (folder / "colour.png").string();
+    WriteSheet(ColourTiles(picture), name + ", the encoded values of each space shown as they are", colour);
+    Print(colour + " shows what colour spaces do\n");
+    const std::string toneRange = (folder / "tone-range.png").string();
+    WriteToneRangePicture(toneRange);
+    Print(toneRange + " shows what tone-range compression does\n");
 }
 
 } // namespace tool

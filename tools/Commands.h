@@ -62,6 +62,22 @@ struct StampOptions : PipeOptions {
 };
 void RunStamp(const StampOptions& options);
 
+/// The frames are BGRA_4444_32f on the way; from and to of PipeOptions stay empty.
+struct ColourOptions : PipeOptions {
+    std::string fromSpace;
+    std::string toSpace;
+    bool gamutClip = false;
+    std::optional<float> exposure;
+    std::optional<float> slope;
+    std::optional<float> knee;
+};
+void RunColour(const ColourOptions& options);
+
+struct CurvesOptions {
+    std::string output;
+};
+void RunCurves(const CurvesOptions& options);
+
 struct CompareOptions {
     std::string first;
     std::string second;

@@ -138,11 +138,11 @@ std::string CountAndSize(int64_t count, const Frame& frame) {
            "x" + std::to_string(frame.Height()) + ", " + FormatName(frame.Format());
 }
 
+} // namespace
+
 bool IsSilent(const PipeOptions& options) {
     return options.quiet || options.output == "-";
 }
-
-} // namespace
 
 Size ParseSize(const std::string& text) {
     Size size;

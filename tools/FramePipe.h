@@ -30,6 +30,9 @@ struct Size {
 /// Reads a size such as 1920x1080. Throws a usage Failure.
 Size ParseSize(const std::string& text);
 
+/// Whether no line about the work is wanted: asked for, or the frames themselves go to standard output.
+bool IsSilent(const PipeOptions& options);
+
 /// What becomes of a frame of the format of --from, before it is taken to that of --to.
 using Step = std::function<Frame(const Frame&)>;
 

@@ -4,6 +4,7 @@
 // place or a direction goes by the picture as one sees it, from its top left corner and clockwise, however the
 // format stores its rows. All throw a Failure if the library refuses.
 
+#include "ColourSpaces.h"
 #include "Frame.h"
 
 #include <array>
@@ -42,5 +43,19 @@ struct Stamp {
     bool hex = false;
 };
 void Burn(Frame& frame, const Stamp& stamp);
+
+/// Takes BGRA_4444_32f pixels from one colour space to another, by way of the hub.
+/// \param gamutClip  pull colours that the destination cannot show towards their luminance.
+void ConvertSpace(Frame& frame, const Space& from, const Space& to, bool gamutClip);
+
+struct ToneRange {
+    float exposure = 1;
+    float slope = 1;
+    float knee = 0.5F;
+};
+/// Bends the luminance of encoded BGRA_4444_32f pixels into the range of standard video; they stay encoded.
+void CompressToneRange(Frame& frame, const Space& space, const ToneRange& range);
+/// Throws a Failure for a space that has no tone-range compression.
+void RequireToneRange(const Space& space);
 
 } // namespace tool

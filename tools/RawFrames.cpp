@@ -54,7 +54,7 @@ RawReader::RawReader(const std::string& name, const Frame& like, RowPacking pack
 void RawReader::RefuseLength(const Frame& like, int64_t bytes) const {
     const bool packed = fPacking == RowPacking::Packed;
     const RowPacking other = packed ? RowPacking::Padded : RowPacking::Packed;
-    std::string advice = "check --size and --from";
+    std::string advice = "check --size and the format";
     if (bytes > 0 && bytes % RawFrameBytes(like, other) == 0)
         advice = packed ? "without --packed it would fit" : "with --packed it would fit";
     throw Failure(kExitFile, "'" + fName + "' has " + std::to_string(bytes) + " bytes, but a frame of " +
@@ -77,7 +77,7 @@ bool RawReader::Read(Frame& frame) {
     if (got != 0 && got != wanted)
         throw Failure(kExitFile, "'" + fName + "' ends within a frame, " + std::to_string(got) +
                                      " bytes into " + std::to_string(wanted) +
-                                     "; check --size, --from and --packed");
+                                     "; check --size, the format and --packed");
     ++fFramesRead;
     return got != 0;
 }

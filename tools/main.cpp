@@ -3,6 +3,7 @@
 
 #include "Commands.h"
 #include "Failure.h"
+#include "HelpNotes.h"
 #include "OutputFile.h"
 #include "Terminal.h"
 
@@ -19,39 +20,6 @@
 namespace {
 
 using namespace tool;
-
-constexpr const char* kExitCodes =
-    "Exit codes:\n"
-    "  0  done\n"
-    "  1  the library refuses the operation, or a comparison is above its limit\n"
-    "  2  wrong usage: an option, a size or the name of a format\n"
-    "  3  a file cannot be read or written, or is not what it should be\n";
-
-constexpr const char* kConvertNotes =
-    "A name that ends in .png is a PNG file; all others hold raw frames, and - stands for standard input or\n"
-    "output. Raw frames follow each other with nothing between. Their rows are padded as in memory, or have\n"
-    "no padding with --packed, and the first row in the file is the first in memory: for a format that\n"
-    "'pixelkiln formats' lists with first row 'bottom', the bottom row of the picture.\n"
-    "A PNG is taken in BGRA, with 16 bits a sample as float, and --from takes it on to that format first. "
-    "On\n"
-    "the way to a PNG the picture goes through the format of --to, so that its losses show. Profiles and\n"
-    "gamma notes of a PNG are not applied.\n\n"
-    "Examples:\n"
-    "  pixelkiln convert photo.png photo.v210 --to V210_422_10u\n"
-    "  pixelkiln convert photo.v210 photo.png --from V210_422_10u --size 512x512\n"
-    "  pixelkiln convert clip.yuv frame-%04d.png --from UYVY_422_8u --size 720x576 --packed\n";
-
-constexpr const char* kFillNotes =
-    "A PNG is written from the format of --to, so that its losses show. 4:2:2 formats are filled in whole\n"
-    "pairs of pixels, and V210 with R,G,B,A in whole groups of six: what is left of a row stays 0.\n\n"
-    "Examples:\n"
-    "  pixelkiln fill black.v210 --size 1920x1080 --to V210_422_10u --colour black\n"
-    "  pixelkiln fill orange.png --size 640x360 --colour 255,128,0,255\n";
-
-constexpr const char* kOperationNotes =
-    "Files are named and read as by 'pixelkiln convert'. The work is done in the format of --from; a PNG\n"
-    "without it is BGRA, with 16 bits a sample as float. Directions and places are those of the picture as\n"
-    "one sees it, from its top left corner.\n";
 
 class Library {
 public:
@@ -95,22 +63,28 @@ void AddExplain(CLI::App& program) {
     AddQuality(*explain.app, explain.options->quality);
 }
 
-// What commands from frames to frames share.
+// What commands that write frames share.
 void AddOutput(CLI::App& command, PipeOptions& options) {
     command.add_option("OUT", options.output, "PNG file, raw frames, or -")->required();
     command.add_option("--png-depth", options.pngDepth, "Bits a sample of an output PNG, 8 or 16")
         ->check(CLI::IsMember({8, 16}))
         ->capture_default_str();
     command.add_flag("--quiet", options.quiet, "No summary");
-    AddQuality(command, options.quality);
 }
 
-void AddPipe(CLI::App& command, PipeOptions& options) {
+// What commands from frames to frames share.
+void AddFrames(CLI::App& command, PipeOptions& options) {
     command.add_option("IN", options.input, "PNG file, raw frames, or -")->required();
     AddOutput(command, options);
-    command.add_option("--from", options.from, "Format to start from; needed for raw frames");
     command.add_option("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
     command.add_flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+}
+
+// The same where they have a format of choice.
+void AddPipe(CLI::App& command, PipeOptions& options) {
+    AddFrames(command, options);
+    AddQuality(command, options.quality);
+    command.add_option("--from", options.from, "Format to start from; needed for raw frames");
 }
 
 void AddConvert(CLI::App& program) {
@@ -125,6 +99,7 @@ void AddFill(CLI::App& program) {
     const Command<FillOptions> fill(program, "fill", "Make a frame of one colour", RunFill);
     FillOptions& options = *fill.options;
     AddOutput(*fill.app, options);
+    AddQuality(*fill.app, options.quality);
     fill.app->add_option("--size", options.size, "Width x height of the frame, such as 1920x1080")
         ->required();
     fill.app->add_option("--to", options.to, "Format to fill; needed for raw frames");
@@ -196,6 +171,26 @@ void AddStamp(CLI::App& program) {
         ->capture_default_str();
 }
 
+void AddColour(CLI::App& program) {
+    const Command<ColourOptions> colour(program, "colour", "Convert frames from one colour space to another",
+                                        RunColour);
+    ColourOptions& options = *colour.options;
+    AddFrames(*colour.app, options);
+    colour.app->add_option("--from", options.fromSpace, "Space of the input, such as srgb")->required();
+    colour.app->add_option("--to", options.toSpace, "Space of the output, such as pq")->required();
+    colour.app->add_flag("--gamut-clip", options.gamutClip,
+                         "Pull colours that the output cannot show towards their luminance");
+    colour.app->add_option("--exposure", options.exposure, "Tone range: factor on linear light, above 0");
+    colour.app->add_option("--slope", options.slope, "Tone range: gain around the centre, above 0");
+    colour.app->add_option("--knee", options.knee, "Tone range: where the curve bends, 0 to below 1");
+    colour.app->footer(kColourNotes);
+
+    const Command<CurvesOptions> curves(program, "curves", "Draw the transfer functions and the tone curve",
+                                        RunCurves);
+    curves.app->add_option("OUT", curves.options->output, "SVG or PNG file to write")->required();
+    curves.app->footer(kCurvesNotes);
+}
+
 void AddPictures(CLI::App& program) {
     const Command<CompareOptions> compare(program, "compare", "Tell how far two PNG files are apart",
                                           RunCompare);
@@ -227,7 +222,7 @@ void AddPictures(CLI::App& program) {
 
 int Run(int count, char** words) {
     CLI::App program(
-        "Pixel formats of video: list them, convert between them, and see what a conversion does");
+        "Pixel formats and colour spaces of video: list them, convert between them, and see what that does");
     program.set_version_flag("--version", "pixelkiln " PIXELKILN_VERSION);
     program.require_subcommand(0, 1);
     program.footer(kExitCodes);
@@ -238,6 +233,7 @@ int Run(int count, char** words) {
     AddGeometry(program);
     AddFilters(program);
     AddStamp(program);
+    AddColour(program);
     AddPictures(program);
     try {
         program.parse(count, words);

@@ -5,11 +5,13 @@ expect 0 "2 pictures" sheet sheet.png "$media/coffee.png" "$media/chelsea.png"
 expect 0 "identical" compare sheet.png sheet.png
 
 expect 0 "demo/sheet.png shows all 12" demo "$media/chelsea.png" demo
-is "pictures of the demonstration" "$(ls -A demo | wc -l)" 14
+is "pictures of the demonstration" "$(ls -A demo | wc -l)" 16
 for picture in demo/[01]*.png; do
     expect 0 "size                451x300" compare "$media/chelsea.png" "$picture" --limit 255
 done
 expect 0 "identical" compare "$media/chelsea.png" demo/08-BGRA_4444_15u.png --limit 0
+expect 0 "size                832x684" compare demo/colour.png demo/colour.png
+expect 0 "size                928x544" compare demo/tone-range.png demo/tone-range.png
 
 expect 0 "2209 pairs of 47 formats" pairs pairs.csv
 is "lines of numbers" "$(wc -l < pairs.csv)" 2210
