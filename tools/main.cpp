@@ -214,7 +214,8 @@ void AddPictures(CLI::App& program) {
     AddQuality(*pairs.app, pairs.options->quality);
 
     const Command<DemoOptions> demo(
-        program, "demo", "Take a picture through a dozen formats and back and draw a contact sheet", RunDemo);
+        program, "demo",
+        "Take a picture through formats, operations and colour spaces, and draw what they do", RunDemo);
     demo.app->add_option("IMAGE", demo.options->image, "PNG file")->required();
     demo.app->add_option("OUTDIR", demo.options->folder, "Folder for the pictures, made if it is missing")
         ->required();
