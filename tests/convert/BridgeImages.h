@@ -1,14 +1,11 @@
 #pragma once
 
-// Images for the tests of codec bridges: rows of either direction with padding, ending at a guard page, and
-// the capability states in which a bridge must give the same bytes.
+// Images for the tests of codec bridges: rows of either direction with padding, ending at a guard page.
 
 #include "reference/ReferenceBridges.h"
-#include "support/FlagScope.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
-
-#include "primitives/Dispatch.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/Types.h>
 
@@ -70,19 +67,5 @@ private:
     GuardedRows fMemory;
     Bytes fBefore;
 };
-
-/// Runs a check with all capabilities of the processor, and without the highest one, two, and so on, down to none.
-template <class Check>
-void AtEveryCapability(Check check) {
-    const FlagScope restore;
-    PK::DetectProcessor();
-    check();
-    for (uint8_t* flag :
-         {&PK::sCPUHasAVX512, &PK::sCPUHasAVX2, &PK::sCPUHasSSE4, &PK::sCPUHasSSSE3, &PK::sCPUHasSSE2}) {
-        *flag = 0;
-        SCOPED_TRACE(PK::TargetName(PK::BestTarget()));
-        check();
-    }
-}
 
 } // namespace PKTest

@@ -18,7 +18,7 @@ void CheckBothWays(int width, int32_t height, Random& random) {
     const BridgeImage words(OneRun(width, height, 8), random);
     const BridgeImage packed(OneRun(width, height, 4), random);
     const Bytes wordsBefore = words.RowContent(0), packedBefore = packed.RowContent(0);
-    AtEveryCapability([&] {
+    AtEveryTarget([&] {
         ASSERT_EQ(PK_Convert_DNxHD16u_To_RGB_444_10u(words.Pixels(), packed.Pixels(), width, height),
                   PK_Success);
         packed.ExpectRows({ReferenceDNxHDToRGB10(wordsBefore, width * height)});

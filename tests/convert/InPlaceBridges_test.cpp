@@ -62,7 +62,7 @@ TEST(InPlaceBridges, GiveWhatTheRuleSays) {
             const size_t rowLength = bridge.pixelBytes * static_cast<size_t>(width);
             const BridgeImage image(
                 {rowLength, height, random.Below(2) * random.Below(40), random.Below(2) == 0}, random);
-            AtEveryCapability([&] {
+            AtEveryTarget([&] {
                 image.Restore();
                 RemoveNaN(image, height, rowLength);
                 std::vector<Bytes> expected;
@@ -133,7 +133,7 @@ TEST(ZYXToBGR, IsTheMatrixBetweenTwoSignedPowers) {
         for (size_t i = 0; i < samples; ++i)
             before.push_back(static_cast<float>(static_cast<int32_t>(random.Next())) * 0x1p-30f); // -2 to 2
         Bytes plain;
-        AtEveryCapability([&] {
+        AtEveryTarget([&] {
             std::memcpy(image.Pixels(), before.data(), 4 * samples);
             ASSERT_EQ(
                 PK_Convert_j2k_ZYXx_32f_To_BGRX_32f_In_Place(image.Pixels(), image.RowBytes(), width, 1),

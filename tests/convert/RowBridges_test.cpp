@@ -54,7 +54,7 @@ void CheckBridge(const RowBridge& bridge, int width, int32_t height, Random& ran
         expected.push_back(bridge.reference(source.RowContent(row), width));
     SCOPED_TRACE(testing::Message() << bridge.name << ", " << width << " x " << height << ", seed "
                                     << random.Seed());
-    AtEveryCapability([&] {
+    AtEveryTarget([&] {
         destination.Restore();
         ASSERT_EQ(bridge.convert(source.Pixels(), source.RowBytes(), destination.Pixels(),
                                  destination.RowBytes(), width, height),

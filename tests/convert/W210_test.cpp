@@ -136,7 +136,7 @@ TEST(W210, GivesWhatTheRuleSays) {
                                            random.Below(2) * random.Below(40), random.Below(2) == 0},
                                           random);
             const Rows expected = bridge.expected(image, width, height);
-            AtEveryCapability([&] {
+            AtEveryTarget([&] {
                 destination.Restore();
                 ASSERT_EQ(image.Run(bridge.convert, height, destination), PK_Success);
                 destination.ExpectRows(expected);

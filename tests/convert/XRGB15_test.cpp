@@ -77,7 +77,7 @@ TEST(XRGB15, GivesWhatTheRuleSaysForAnyWords) {
         const int32_t height = 1 + static_cast<int32_t>(random.Below(3));
         const BridgeImage source({6 * static_cast<size_t>(width), height, 0, false}, random);
         const BridgeImage destination({8 * static_cast<size_t>(width), height, 0, false}, random);
-        AtEveryCapability([&] {
+        AtEveryTarget([&] {
             destination.Restore();
             std::vector<Bytes> expected;
             for (int32_t row = height; row-- > 0;)
@@ -95,7 +95,7 @@ TEST(XRGB15, GivesWhatTheRuleSaysForAllCodes) {
         std::memcpy(&source[2 * c], &word, sizeof word);
     }
     Bytes result(8 * 21846);
-    AtEveryCapability([&] {
+    AtEveryTarget([&] {
         PK_ConvertRGB_444_16u_To_XRGB_4444_15u(source.data(), result.data(), 21846, 1);
         ASSERT_EQ(result, ReferenceXRGB15(source, 21846, IsRounded()));
     });

@@ -5,11 +5,11 @@
 #include <PixelKiln/Rotate.h>
 
 #include "frame/Capabilities.h"
-#include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
 #include "support/FlagScope.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 
@@ -21,14 +21,6 @@
 namespace {
 
 using namespace PKTest;
-
-/// Switches the capabilities down to those that a target stands on.
-void LeaveOnly(PK::Target target) {
-    PK::DetectProcessor();
-    uint8_t* const flags[PK::kTargetCount] = {nullptr,          &PK::sCPUHasSSE2, &PK::sCPUHasSSSE3,
-                                              &PK::sCPUHasSSE4, &PK::sCPUHasAVX2, &PK::sCPUHasAVX512};
-    for (size_t i = static_cast<size_t>(target) + 1; i < std::size(flags); ++i) *flags[i] = 0;
-}
 
 /// An image of whole pixels whose rows are `step` bytes apart, in memory that ends at guard pages.
 struct Pixels {
@@ -68,13 +60,8 @@ void ByInterface(const Pixels& source, const Pixels& destination) {
                                        static_cast<uint8_t>(source.pixelBytes)));
 }
 
-class TransposeBodies : public testing::TestWithParam<PK::Target> {
+class TransposeBodies : public TargetTest {
 protected:
-    void SetUp() override {
-        LeaveOnly(GetParam());
-        if (!PK::IsEnabled(GetParam())) GTEST_SKIP() << "not on this processor";
-    }
-
     /// The body of the target itself, which the interface does not choose for all.
     void ByBody(const Pixels& source, const Pixels& destination) const {
         const auto& kernels = PK::KernelsFor<PK::TransposeKernels>(GetParam());
@@ -113,7 +100,6 @@ protected:
         ASSERT_TRUE(destination.PaddingIs(0xa5));
     }
 
-    FlagScope flags;
     Random random{54};
 };
 
@@ -168,12 +154,7 @@ TEST_P(TransposeBodies, QuarterTurnsLandWhereTheRuleSays) {
         }
 }
 
-INSTANTIATE_TEST_SUITE_P(Targets, TransposeBodies,
-                         testing::Values(PK::Target::plain, PK::Target::sse2, PK::Target::ssse3,
-                                         PK::Target::sse41, PK::Target::avx2, PK::Target::avx512),
-                         [](const auto& param) {
-                             return "target" + std::to_string(static_cast<int>(param.param));
-                         });
+INSTANTIATE_TEST_SUITE_P(Targets, TransposeBodies, EveryTarget(), TargetOf);
 
 TEST(Transpose, TwiceIsTheImageItself) {
     const FlagScope flags;

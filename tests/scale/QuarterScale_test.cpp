@@ -4,9 +4,9 @@
 #include "scale/QuarterScaleKernels.h"
 
 #include "frame/Capabilities.h"
-#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
 #include "support/RowBuffer.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/QuarterScale.h>
 
@@ -124,15 +124,8 @@ protected:
 };
 
 /// Every body that this processor can run, by itself.
-class QuarterScaleBodies : public testing::TestWithParam<int> {
+class QuarterScaleBodies : public TargetTest {
 protected:
-    QuarterScaleBodies() { PK::SetCapabilities(PK::ReadProcessor()); }
-    void SetUp() override {
-        if (!PK::IsEnabled(Target())) GTEST_SKIP() << "not on this processor";
-    }
-    static PK::Target Target() { return static_cast<PK::Target>(GetParam()); }
-
-    FlagScope fFlags;
     Random fRandom{331};
 };
 
@@ -144,7 +137,7 @@ constexpr Placement kPlacements[] = {{Placement::kBeforeGuard},
 } // namespace
 
 TEST_P(QuarterScaleBodies, TakesEveryEvenByte) {
-    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(Target());
+    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(GetParam());
     for (const Placement& place : kPlacements)
         for (size_t count = 0; count <= 300; ++count) {
             SCOPED_TRACE(testing::Message() << count << " bytes " << place << ", seed " << fRandom.Seed());
@@ -157,7 +150,7 @@ TEST_P(QuarterScaleBodies, TakesEveryEvenByte) {
 }
 
 TEST_P(QuarterScaleBodies, InterleavesLumaWithChroma) {
-    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(Target());
+    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(GetParam());
     for (const Placement& place : kPlacements)
         for (size_t pairs = 0; pairs <= 150; ++pairs) {
             SCOPED_TRACE(testing::Message() << pairs << " pairs " << place << ", seed " << fRandom.Seed());
@@ -178,8 +171,7 @@ TEST_P(QuarterScaleBodies, InterleavesLumaWithChroma) {
         }
 }
 
-INSTANTIATE_TEST_SUITE_P(All, QuarterScaleBodies, testing::Range(0, PK::kTargetCount),
-                         [](const auto& body) { return "Target" + std::to_string(body.param); });
+INSTANTIATE_TEST_SUITE_P(Targets, QuarterScaleBodies, EveryTarget(), TargetOf);
 
 TEST_F(QuarterScale, TheSecondFieldTakesLumaRows1And3AndChromaRow0) {
     const uint8_t luma[4][4] = {{1, 2, 3, 4}, {5, 6, 7, 8}, {9, 10, 11, 12}, {13, 14, 15, 16}};
