@@ -4,10 +4,10 @@
 #include "convert/RasterFormats.h"
 #include "frame/Capabilities.h"
 #include "frame/PixelFormat.h"
-#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
 #include "support/RowBuffer.h"
 #include "support/Samples.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Overlay.h>
@@ -27,16 +27,10 @@ bool BitOf(const uint8_t* mask, size_t bit) {
     return (byte & weights[bit % 8]) != 0;
 }
 
-class MaskBodies : public testing::TestWithParam<int> {
+class MaskBodies : public TargetTest {
 protected:
-    MaskBodies() { PK::SetCapabilities(PK::ReadProcessor()); }
-    void SetUp() override {
-        if (!PK::IsEnabled(Target())) GTEST_SKIP() << "not on this processor";
-    }
-    static PK::Target Target() { return static_cast<PK::Target>(GetParam()); }
-
     static PK::MaskKernels::Select Kernel(size_t pixelBytes) {
-        const auto& kernels = PK::KernelsFor<PK::MaskKernels>(Target());
+        const auto& kernels = PK::KernelsFor<PK::MaskKernels>(GetParam());
         return pixelBytes == 4 ? kernels.pixels4 : pixelBytes == 8 ? kernels.pixels8 : kernels.pixels16;
     }
 
@@ -56,7 +50,6 @@ protected:
         ASSERT_TRUE(destination.MarginsIntact());
     }
 
-    FlagScope fFlags;
     Random fRandom{460};
 };
 
@@ -126,8 +119,7 @@ TEST_P(MaskBodies, WorkInPlaceOfEitherRow) {
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(All, MaskBodies, testing::Range(0, PK::kTargetCount),
-                         [](const auto& body) { return "Target" + std::to_string(body.param); });
+INSTANTIATE_TEST_SUITE_P(Targets, MaskBodies, EveryTarget(), TargetOf);
 
 TEST_F(OneBitMaskComposite, OffsetCountsFromTheTopBitAndOnlyItsLowThreeBitsCount) {
     const uint32_t first[5] = {1, 2, 3, 4, 5}, second[5] = {11, 12, 13, 14, 15};

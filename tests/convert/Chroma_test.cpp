@@ -12,8 +12,7 @@ namespace {
 using PK::Kernel;
 using PK::RowKernel;
 using PK::Target;
-using PKTest::ForEachBody;
-using PKTest::RunRow;
+using namespace PKTest;
 
 using Bytes = std::vector<uint8_t>;
 using Floats = std::vector<float>;
@@ -74,7 +73,7 @@ TEST(Downsample444To422Row, FiltersAllTriplesOfCodes) {
 }
 
 TEST(Downsample444To422Float32Row, FiltersInTheOrderOfTheFormula) {
-    PKTest::Random random(3);
+    Random random(3);
     for (int32_t width = 0; width <= 40; ++width) {
         Floats vuya(PixelSamples(width)), expected;
         for (float& sample : vuya) sample = (float(random.Below(4000)) - 1500) * 0.00137f;
@@ -166,7 +165,7 @@ TEST(Upsample422To444Float32Row, InterpolatesOverFourPairs) {
 }
 
 TEST(Upsample422To444Float32Row, InterpolatesInTheOrderOfTheFormula) {
-    PKTest::Random random(4);
+    Random random(4);
     for (int32_t width = 0; width <= 40; ++width) {
         const int64_t pairs = (width + 1) / 2;
         Floats uyvy(PairSamples(width)), expected;

@@ -3,14 +3,13 @@
 #include <PixelKiln/Convert.h>
 
 #include "convert/RasterFormats.h"
-#include "support/GuardedRows.h"
+#include "support/GuardedImage.h"
 #include "support/Random.h"
 
 #include <PixelKiln/Buffers.h>
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
 #include <cstring>
 #include <vector>
 #include <xmmintrin.h>
@@ -18,6 +17,7 @@
 namespace {
 
 using PKTest::Guard;
+using PKTest::GuardedImage;
 using PKTest::GuardedRows;
 using PKTest::Random;
 
@@ -25,66 +25,26 @@ constexpr int32_t kQuality = 2;
 constexpr uint8_t kFill = 0xa5;
 constexpr PK_PixelFormat kUnknownStream = 0x0d000821;
 
-/// An image whose rows touch a guard page with their first or last byte of pixels.
-class GuardedImage {
-public:
-    GuardedImage(PK_PixelFormat format, int32_t width, int32_t height, int32_t rowBytes, Guard guard)
-        : fRowLength(PK_PixelFormatPackedRowBytes(format, width)), fHeight(height), fRowBytes(rowBytes),
-          fRows(static_cast<size_t>(std::abs(rowBytes)) * static_cast<size_t>(height - 1) +
-                    static_cast<size_t>(fRowLength),
-                guard) {
-        std::fill_n(fRows.Bytes(), fRows.Size(), kFill);
-    }
-
-    uint8_t* FirstRow() const {
-        return fRowBytes < 0 ? fRows.Bytes() - (fHeight - 1) * fRowBytes : fRows.Bytes();
-    }
-    uint8_t* Row(int32_t row) const { return FirstRow() + row * fRowBytes; }
-    int32_t RowBytes() const { return fRowBytes; }
-    int32_t RowLength() const { return fRowLength; }
-
-    void FillRandomly(Random& random) { random.Fill(fRows.Bytes(), fRows.Size()); }
-
-    /// Whether the bytes between the rows are those of a fresh image.
-    bool PaddingIsUntouched() const {
-        for (int32_t row = 0; row + 1 < fHeight; ++row) {
-            const uint8_t* end = fRows.Bytes() + row * std::abs(fRowBytes) + fRowLength;
-            for (int32_t i = 0; i < std::abs(fRowBytes) - fRowLength; ++i) {
-                if (end[i] != kFill) return false;
-            }
-        }
-        return true;
-    }
-
-private:
-    int32_t fRowLength, fHeight, fRowBytes;
-    GuardedRows fRows;
-};
-
-PK_Result Copy(PK_PixelFormat format, const GuardedImage& source, const GuardedImage& destination,
-               int32_t width, int32_t height) {
-    return PK_Convert(source.FirstRow(), source.RowBytes(), format, destination.FirstRow(),
-                      destination.RowBytes(), format, width, height, kQuality);
-}
-
 /// Copies with these gaps between rows, the sign of a gap being that of the row bytes.
 void ExpectCopy(PK_PixelFormat format, int32_t width, int32_t sourceSign, int32_t sourceGap,
                 int32_t destinationSign, int32_t destinationGap, Guard guard) {
     constexpr int32_t height = 3;
     Random random(format + static_cast<uint32_t>(width));
     const int32_t length = PK_PixelFormatPackedRowBytes(format, width);
-    GuardedImage source(format, width, height, sourceSign * (length + sourceGap), guard);
-    const GuardedImage destination(format, width, height, destinationSign * (length + destinationGap), guard);
-    source.FillRandomly(random);
+    const auto shape = [=](int32_t sign, int32_t gap) {
+        return PKTest::ImageShape{static_cast<size_t>(length), height, static_cast<size_t>(gap), sign < 0,
+                                  guard};
+    };
+    const GuardedImage source(shape(sourceSign, sourceGap), random);
+    const GuardedImage destination(shape(destinationSign, destinationGap), random);
 
     SCOPED_TRACE(testing::Message() << std::hex << format << std::dec << " width " << width << " row bytes "
                                     << source.RowBytes() << " to " << destination.RowBytes() << " seed "
                                     << random.Seed());
-    ASSERT_EQ(Copy(format, source, destination, width, height), PK_Success);
-    for (int32_t row = 0; row < height; ++row) {
-        EXPECT_EQ(std::memcmp(source.Row(row), destination.Row(row), static_cast<size_t>(length)), 0) << row;
-    }
-    EXPECT_TRUE(destination.PaddingIsUntouched());
+    ASSERT_EQ(PK_Convert(source.Pixels(), source.RowBytes(), format, destination.Pixels(),
+                         destination.RowBytes(), format, width, height, kQuality),
+              PK_Success);
+    destination.ExpectRows(source.Rows());
 }
 
 TEST(ConvertSameFormat, CopiesThePixelsOfEveryFormatAndNoByteMore) {

@@ -1,6 +1,8 @@
 // The bridges of four-word pixels, whose rows have no padding at either end.
 
-#include "convert/BridgeImages.h"
+#include "reference/ReferenceBridges.h"
+#include "support/GuardedImage.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/CodecBridges.h>
 
@@ -15,10 +17,10 @@ ImageShape OneRun(int width, int32_t height, size_t pixelBytes) {
 
 void CheckBothWays(int width, int32_t height, Random& random) {
     SCOPED_TRACE(testing::Message() << width << " x " << height << ", seed " << random.Seed());
-    const BridgeImage words(OneRun(width, height, 8), random);
-    const BridgeImage packed(OneRun(width, height, 4), random);
+    const GuardedImage words(OneRun(width, height, 8), random);
+    const GuardedImage packed(OneRun(width, height, 4), random);
     const Bytes wordsBefore = words.RowContent(0), packedBefore = packed.RowContent(0);
-    AtEveryCapability([&] {
+    AtEveryTarget([&] {
         ASSERT_EQ(PK_Convert_DNxHD16u_To_RGB_444_10u(words.Pixels(), packed.Pixels(), width, height),
                   PK_Success);
         packed.ExpectRows({ReferenceDNxHDToRGB10(wordsBefore, width * height)});

@@ -13,8 +13,7 @@ namespace {
 using PK::Kernel;
 using PK::RowKernel;
 using PK::Target;
-using PKTest::ForEachBody;
-using PKTest::RunRow;
+using namespace PKTest;
 
 constexpr float kInfinity = std::numeric_limits<float>::infinity();
 constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();

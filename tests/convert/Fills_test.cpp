@@ -1,6 +1,6 @@
 // The fills: what is written of each format, byte by byte, and what is refused.
 
-#include "support/GuardedRows.h"
+#include "support/GuardedImage.h"
 #include "support/Random.h"
 
 #include "convert/RasterFormats.h"
@@ -39,25 +39,21 @@ using UnitsOfRow = std::function<int32_t(int32_t row)>;
 void CheckRows(const std::function<PK_Result(void*, int32_t, int32_t, int32_t)>& fill, PK_Result result,
                PK_PixelFormat format, const Bytes& unit, int32_t width, const UnitsOfRow& units) {
     constexpr int32_t kHeight = 3;
-    const int32_t rowLength = PK_PixelFormatPackedRowBytes(format, width);
-    for (const int32_t padding : {0, 13}) {
+    const auto rowLength = static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, width));
+    Random random(19);
+    for (const size_t padding : {0, 13}) {
         for (const bool upwards : {false, true}) {
             SCOPED_TRACE(testing::Message() << PK_PixelFormatName(format) << ", width " << width
                                             << ", padding " << padding << ", upwards " << upwards);
-            const int32_t step = rowLength + padding;
-            const GuardedRows memory(static_cast<size_t>(step * (kHeight - 1) + rowLength), Guard::kAfter);
-            Bytes expected(memory.Size(), kUntouched);
-            std::copy(expected.begin(), expected.end(), memory.Bytes());
-            for (int32_t row = 0; row < kHeight; ++row) {
-                const auto start = static_cast<size_t>(step * (upwards ? kHeight - 1 - row : row));
-                for (size_t i = 0; i < unit.size() * static_cast<size_t>(units(row)); ++i)
-                    expected[start + i] = unit[i % unit.size()];
-            }
-            uint8_t* first = memory.Bytes() + (upwards ? step * (kHeight - 1) : 0);
-            ASSERT_EQ(fill(first, upwards ? -step : step, width, kHeight), result);
-            const auto [wrong, right] =
-                std::mismatch(memory.Bytes(), memory.Bytes() + memory.Size(), expected.begin());
-            ASSERT_EQ(wrong, memory.Bytes() + memory.Size()) << "at byte " << wrong - memory.Bytes();
+            const GuardedImage image({rowLength, kHeight, padding, upwards}, random);
+            std::vector<Bytes> expected(kHeight);
+            for (int32_t row = 0; row < kHeight; ++row)
+                for (int32_t i = 0; i < units(row); ++i) {
+                    Bytes& bytes = expected[static_cast<size_t>(row)];
+                    bytes.insert(bytes.end(), unit.begin(), unit.end());
+                }
+            ASSERT_EQ(fill(image.Pixels(), image.RowBytes(), width, kHeight), result);
+            ASSERT_NO_FATAL_FAILURE(image.ExpectRows(expected));
         }
     }
 }

@@ -1,6 +1,8 @@
 // The bridges that work in their one buffer.
 
-#include "convert/BridgeImages.h"
+#include "reference/ReferenceBridges.h"
+#include "support/GuardedImage.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/CodecBridges.h>
 
@@ -38,14 +40,14 @@ bool IsNaN(const uint8_t* sample) {
 }
 
 /// Random bytes make NaN, whose bits an addition may change: those become 0.25.
-void RemoveNaN(const BridgeImage& image, int32_t height, size_t rowLength) {
+void RemoveNaN(const GuardedImage& image, int32_t height, size_t rowLength) {
     const float quarter = 0.25f;
     for (int32_t row = 0; row < height; ++row)
         for (size_t i = 0; i < rowLength; i += 4)
             if (IsNaN(image.Row(row) + i)) std::memcpy(image.Row(row) + i, &quarter, sizeof quarter);
 }
 
-float Sample(const BridgeImage& image, size_t index) {
+float Sample(const GuardedImage& image, size_t index) {
     float value;
     std::memcpy(&value, image.Pixels() + 4 * index, sizeof value);
     return value;
@@ -60,9 +62,9 @@ TEST(InPlaceBridges, GiveWhatTheRuleSays) {
             SCOPED_TRACE(testing::Message() << bridge.name << " " << width << ", seed " << random.Seed());
             const int32_t height = 1 + static_cast<int32_t>(random.Below(3));
             const size_t rowLength = bridge.pixelBytes * static_cast<size_t>(width);
-            const BridgeImage image(
+            const GuardedImage image(
                 {rowLength, height, random.Below(2) * random.Below(40), random.Below(2) == 0}, random);
-            AtEveryCapability([&] {
+            AtEveryTarget([&] {
                 image.Restore();
                 RemoveNaN(image, height, rowLength);
                 std::vector<Bytes> expected;
@@ -128,12 +130,12 @@ TEST(ZYXToBGR, IsTheMatrixBetweenTwoSignedPowers) {
     for (int width = 1; width <= 40; ++width) {
         SCOPED_TRACE(testing::Message() << width << ", seed " << random.Seed());
         const size_t samples = 4 * static_cast<size_t>(width);
-        const BridgeImage image({4 * samples, 1, 0, false}, random);
+        const GuardedImage image({4 * samples, 1, 0, false}, random);
         std::vector<float> before;
         for (size_t i = 0; i < samples; ++i)
             before.push_back(static_cast<float>(static_cast<int32_t>(random.Next())) * 0x1p-30f); // -2 to 2
         Bytes plain;
-        AtEveryCapability([&] {
+        AtEveryTarget([&] {
             std::memcpy(image.Pixels(), before.data(), 4 * samples);
             ASSERT_EQ(
                 PK_Convert_j2k_ZYXx_32f_To_BGRX_32f_In_Place(image.Pixels(), image.RowBytes(), width, 1),
@@ -156,7 +158,7 @@ TEST(ZYXToBGR, IsTheMatrixBetweenTwoSignedPowers) {
 
 TEST(ZYXToBGR, SurvivesAnyFloatAndLeavesTheFloatingPointState) {
     Random random(45);
-    const BridgeImage image({16 * 1001, 1, 0, false}, random);
+    const GuardedImage image({16 * 1001, 1, 0, false}, random);
     const uint32_t state = _mm_getcsr();
     ASSERT_EQ(PK_Convert_j2k_ZYXx_32f_To_BGRX_32f_In_Place(image.Pixels(), image.RowBytes(), 1001, 1),
               PK_Success);

@@ -3,7 +3,7 @@
 // Runs every body of a row kernel that this processor can, one after the other, on rows of typed samples.
 
 #include "convert/KernelTable.h"
-#include "frame/Capabilities.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 
@@ -12,20 +12,23 @@
 
 namespace PKTest {
 
+/// The instruction sets of this processor for which the kernel has a body.
+inline std::vector<PK::Target> TargetsWithBody(PK::Kernel kernel) {
+    std::vector<PK::Target> targets = TargetsOfThisProcessor();
+    std::erase_if(targets, [kernel](PK::Target target) { return !PK::Body(kernel, target); });
+    return targets;
+}
+
 /// Calls check(target, body) for each body of the kernel that the processor can run.
 template <class Check>
 void ForEachBody(PK::Kernel kernel, Check check) {
-    PK::SetCapabilities(PK::ReadProcessor());
-    int32_t count = 0;
-    for (int i = 0; i < PK::kTargetCount; ++i) {
-        const auto target = static_cast<PK::Target>(i);
-        const PK::RowKernel body = PK::Body(kernel, target);
-        if (!body || !PK::IsEnabled(target)) continue;
-        ++count;
+    const std::vector<PK::Target> targets = TargetsWithBody(kernel);
+    EXPECT_FALSE(targets.empty()) << PK::Info(kernel).name << " has no body";
+    for (const PK::Target target : targets) {
         SCOPED_TRACE(testing::Message() << PK::Info(kernel).name << ", " << PK::TargetName(target));
-        check(target, body);
+        check(target, PK::Body(kernel, target));
+        if (testing::Test::HasFatalFailure()) return;
     }
-    EXPECT_GT(count, 0) << PK::Info(kernel).name << " has no body";
 }
 
 /// The row that a body makes of `source`, `samples` long. Samples behind the row must stay as they are.

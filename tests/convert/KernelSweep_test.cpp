@@ -2,6 +2,7 @@
 // at guard pages, against the plain body and against the slow reference.
 
 #include "convert/Fusion.h"
+#include "convert/KernelBodies.h"
 #include "convert/KernelTable.h"
 #include "frame/Capabilities.h"
 #include "reference/ReferenceKernels.h"
@@ -65,19 +66,8 @@ void RunExpected(Kernel kernel, Target target, const void* source, void* destina
     RunReference(kernel, target, source, destination, width);
 }
 
-std::vector<Target> BodiesOf(Kernel kernel) {
-    std::vector<Target> targets;
-    for (int i = 0; i < kTargetCount; ++i)
-        if (IsEnabled(static_cast<Target>(i)) && Body(kernel, static_cast<Target>(i)))
-            targets.push_back(static_cast<Target>(i));
-    return targets;
-}
-
 class KernelSweep : public testing::TestWithParam<int> {
 protected:
-    void SetUp() override { DetectProcessor(); }
-
-    PKTest::FlagScope flags;
     Kernel kernel = static_cast<Kernel>(GetParam());
     const KernelInfo& info = Info(kernel);
     PKTest::Random random{static_cast<uint64_t>(GetParam())};
@@ -117,14 +107,14 @@ protected:
 };
 
 TEST_P(KernelSweep, EveryWidthAgreesWithTheReferenceUpToTheGuardPages) {
-    for (const Target target : BodiesOf(kernel))
+    for (const Target target : PKTest::TargetsWithBody(kernel))
         for (int32_t width = 0; width <= 257; ++width)
             for (const auto place : {PKTest::Placement::kBeforeGuard, PKTest::Placement::kAfterGuard})
                 ASSERT_NO_FATAL_FAILURE(CheckRow(target, width, {place}, {place}));
 }
 
 TEST_P(KernelSweep, EveryAlignmentAgreesWithTheReference) {
-    for (const Target target : BodiesOf(kernel))
+    for (const Target target : PKTest::TargetsWithBody(kernel))
         for (int offset = 0; offset < 64; ++offset)
             for (const int32_t width : {1, 2, 7, 33, 64})
                 ASSERT_NO_FATAL_FAILURE(CheckRow(target, width, {PKTest::Placement::kAtOffset, offset},
@@ -133,7 +123,7 @@ TEST_P(KernelSweep, EveryAlignmentAgreesWithTheReference) {
 
 TEST_P(KernelSweep, BodiesOfTheSameRuleAgreeToTheBit) {
     constexpr int32_t width = 4099;
-    const std::vector<Target> targets = BodiesOf(kernel);
+    const std::vector<Target> targets = PKTest::TargetsWithBody(kernel);
     ASSERT_FALSE(targets.empty());
     std::vector<uint8_t> source(SourceBytes(width)), first(DestinationBytes(width)), other(first.size());
     for (int round = 0; round < 16; ++round) {

@@ -3,8 +3,7 @@
 // Runs every body of a matrix kernel that this processor has over a row and compares it with a rule for one
 // unit of four samples: a pixel, or a pair of 4:2:2.
 
-#include "convert/KernelTable.h"
-#include "frame/Capabilities.h"
+#include "convert/KernelBodies.h"
 
 #include <gtest/gtest.h>
 
@@ -29,22 +28,6 @@ struct MatrixRule {
     Quad<To> (*convert)(Quad<From>);
     int32_t pixelsInUnit = 1;
 };
-
-struct NamedBody {
-    const char* target;
-    PK::RowKernel run;
-};
-
-inline std::vector<NamedBody> BodiesOf(PK::Kernel kernel) {
-    PK::DetectProcessor();
-    std::vector<NamedBody> bodies;
-    for (int i = 0; i < PK::kTargetCount; ++i) {
-        const auto target = static_cast<PK::Target>(i);
-        if (PK::IsEnabled(target) && PK::Body(kernel, target))
-            bodies.push_back({PK::TargetName(target), PK::Body(kernel, target)});
-    }
-    return bodies;
-}
 
 /// A code by the current rounding mode, limited by value: NaN gives 0.
 inline uint8_t NearestCode(float x) {
@@ -72,13 +55,12 @@ std::string Show(const Quad<Sample>& unit) {
 }
 
 template <class From, class To>
-void ExpectUnits(const MatrixRule<From, To>& rule, const char* target, const std::vector<Quad<From>>& source,
-                 const std::vector<Quad<To>>& expected, const Quad<To>* actual) {
+void ExpectUnits(const std::vector<Quad<From>>& source, const std::vector<Quad<To>>& expected,
+                 const Quad<To>* actual) {
     for (size_t i = 0; i < source.size(); ++i) {
         if (IsSame(expected[i], actual[i])) continue;
-        FAIL() << PK::Info(rule.kernel).name << " " << target << ", unit " << i << " of " << source.size()
-               << ": source " << Show(source[i]) << ", expected " << Show(expected[i]) << ", actual "
-               << Show(actual[i]);
+        FAIL() << "unit " << i << " of " << source.size() << ": source " << Show(source[i]) << ", expected "
+               << Show(expected[i]) << ", actual " << Show(actual[i]);
     }
 }
 
@@ -88,12 +70,12 @@ void ExpectRow(const MatrixRule<From, To>& rule, const std::vector<Quad<From>>& 
     const Quad<To> canary = {To{77}, To{78}, To{79}, To{80}};
     std::vector<Quad<To>> expected;
     for (const Quad<From>& unit : source) expected.push_back(rule.convert(unit));
-    for (const NamedBody& body : BodiesOf(rule.kernel)) {
+    ForEachBody(rule.kernel, [&](PK::Target, PK::RowKernel body) {
         std::vector<Quad<To>> actual(source.size() + 1, canary);
-        body.run(source.data(), actual.data(), static_cast<int32_t>(source.size()) * rule.pixelsInUnit);
-        ASSERT_NO_FATAL_FAILURE(ExpectUnits(rule, body.target, source, expected, actual.data()));
-        ASSERT_EQ(actual.back(), canary) << PK::Info(rule.kernel).name << " " << body.target;
-    }
+        body(source.data(), actual.data(), static_cast<int32_t>(source.size()) * rule.pixelsInUnit);
+        ASSERT_NO_FATAL_FAILURE(ExpectUnits(source, expected, actual.data()));
+        ASSERT_EQ(actual.back(), canary);
+    });
 }
 
 /// All 2^24 combinations of the first three samples.
@@ -153,25 +135,22 @@ void ExpectInPlace(const MatrixRule<Sample, Sample>& rule) {
     const auto source = RandomUnits<Sample>(101, 7);
     std::vector<Quad<Sample>> expected;
     for (const Quad<Sample>& unit : source) expected.push_back(rule.convert(unit));
-    for (const NamedBody& body : BodiesOf(rule.kernel)) {
+    ForEachBody(rule.kernel, [&](PK::Target, PK::RowKernel body) {
         auto row = source;
-        body.run(row.data(), row.data(), static_cast<int32_t>(row.size()) * rule.pixelsInUnit);
-        ASSERT_NO_FATAL_FAILURE(ExpectUnits(rule, body.target, source, expected, row.data()));
-    }
+        body(row.data(), row.data(), static_cast<int32_t>(row.size()) * rule.pixelsInUnit);
+        ASSERT_NO_FATAL_FAILURE(ExpectUnits(source, expected, row.data()));
+    });
 }
 
 /// One unit through all bodies, against a value worked out by hand.
 template <class From, class To>
 void ExpectValue(PK::Kernel kernel, Quad<From> source, Quad<To> expected) {
-    const auto bodies = BodiesOf(kernel);
-    ASSERT_FALSE(bodies.empty());
-    for (const NamedBody& body : bodies) {
+    ForEachBody(kernel, [&](PK::Target, PK::RowKernel body) {
         Quad<To> actual;
-        body.run(&source, &actual, 1);
+        body(&source, &actual, 1);
         EXPECT_TRUE(IsSame(expected, actual))
-            << PK::Info(kernel).name << " " << body.target << ": source " << Show(source) << ", expected "
-            << Show(expected) << ", actual " << Show(actual);
-    }
+            << "source " << Show(source) << ", expected " << Show(expected) << ", actual " << Show(actual);
+    });
 }
 
 } // namespace PKTest

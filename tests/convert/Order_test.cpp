@@ -9,9 +9,7 @@ namespace {
 using PK::Kernel;
 using PK::RowKernel;
 using PK::Target;
-using PKTest::ForEachBody;
-using PKTest::RunRow;
-using PKTest::RunRowInPlace;
+using namespace PKTest;
 
 constexpr int32_t kLongest = 70; // two groups of every body and a tail
 

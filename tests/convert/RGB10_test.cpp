@@ -10,9 +10,7 @@ namespace {
 using PK::Kernel;
 using PK::RowKernel;
 using PK::Target;
-using PKTest::ForEachBody;
-using PKTest::RunRow;
-using PKTest::RunRowInPlace;
+using namespace PKTest;
 
 uint32_t Word(uint32_t blue, uint32_t green, uint32_t red) {
     return blue << 2 | green << 12 | red << 22;

@@ -1,7 +1,9 @@
 // The bridges that convert row by row between two layouts, each against its restatement, at every width from
 // 0 up, with rows of either direction, padded, and ending at a guard page.
 
-#include "convert/BridgeImages.h"
+#include "reference/ReferenceBridges.h"
+#include "support/GuardedImage.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/CodecBridges.h>
 
@@ -47,14 +49,14 @@ void CheckBridge(const RowBridge& bridge, int width, int32_t height, Random& ran
         return ImageShape{rowLength, height, random.Below(2) == 0 ? 0 : random.Below(40),
                           random.Below(2) == 0};
     };
-    const BridgeImage source(shape(bridge.sourceBytes(width)), random);
-    const BridgeImage destination(shape(bridge.destinationBytes(width)), random);
+    const GuardedImage source(shape(bridge.sourceBytes(width)), random);
+    const GuardedImage destination(shape(bridge.destinationBytes(width)), random);
     std::vector<Bytes> expected;
     for (int32_t row = 0; row < height; ++row)
         expected.push_back(bridge.reference(source.RowContent(row), width));
     SCOPED_TRACE(testing::Message() << bridge.name << ", " << width << " x " << height << ", seed "
                                     << random.Seed());
-    AtEveryCapability([&] {
+    AtEveryTarget([&] {
         destination.Restore();
         ASSERT_EQ(bridge.convert(source.Pixels(), source.RowBytes(), destination.Pixels(),
                                  destination.RowBytes(), width, height),

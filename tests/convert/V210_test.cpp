@@ -11,8 +11,7 @@ namespace {
 using PK::Kernel;
 using PK::RowKernel;
 using PK::Target;
-using PKTest::ForEachBody;
-using PKTest::RunRow;
+using namespace PKTest;
 
 using Bytes = std::vector<uint8_t>;
 using Words = std::vector<uint32_t>;
@@ -38,7 +37,7 @@ size_t PairSamples(int32_t width) {
 }
 
 std::vector<uint32_t> RandomSamples(size_t count, uint32_t limit, uint64_t seed) {
-    PKTest::Random random(seed);
+    Random random(seed);
     std::vector<uint32_t> samples(count);
     for (uint32_t& sample : samples) sample = random.Below(limit);
     return samples;

@@ -1,6 +1,8 @@
 // The bridges from three planes of 10-bit words.
 
-#include "convert/BridgeImages.h"
+#include "reference/ReferenceBridges.h"
+#include "support/GuardedImage.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/CodecBridges.h>
 
@@ -33,7 +35,7 @@ public:
                 Words(fV.Row(row), (fWidth + 1) / 2)};
     }
 
-    PK_Result Run(const Convert& convert, int32_t height, const BridgeImage& destination) const {
+    PK_Result Run(const Convert& convert, int32_t height, const GuardedImage& destination) const {
         const void* const planes[3] = {fLuma.Pixels(), fU.Pixels(), fV.Pixels()};
         const int32_t rowBytes[3] = {fLuma.RowBytes(), fU.RowBytes(), fV.RowBytes()};
         return convert(planes, rowBytes, fWidth, height, destination.Pixels(), destination.RowBytes());
@@ -55,7 +57,7 @@ private:
     }
 
     int fWidth;
-    BridgeImage fLuma, fU, fV;
+    GuardedImage fLuma, fU, fV;
 };
 
 size_t V210Bytes(int width) {
@@ -132,11 +134,11 @@ TEST(W210, GivesWhatTheRuleSays) {
             SCOPED_TRACE(testing::Message()
                          << bridge.name << " " << width << " x " << height << ", seed " << random.Seed());
             const PlanarImage image(width, height, random);
-            const BridgeImage destination({bridge.rowLength(width), bridge.rows(height),
-                                           random.Below(2) * random.Below(40), random.Below(2) == 0},
-                                          random);
+            const GuardedImage destination({bridge.rowLength(width), bridge.rows(height),
+                                            random.Below(2) * random.Below(40), random.Below(2) == 0},
+                                           random);
             const Rows expected = bridge.expected(image, width, height);
-            AtEveryCapability([&] {
+            AtEveryTarget([&] {
                 destination.Restore();
                 ASSERT_EQ(image.Run(bridge.convert, height, destination), PK_Success);
                 destination.ExpectRows(expected);

@@ -1,6 +1,9 @@
 // The bridge from three-word RGB to XRGB_4444_15u, whose members differ.
 
-#include "convert/BridgeImages.h"
+#include "reference/ReferenceBridges.h"
+#include "support/FlagScope.h"
+#include "support/GuardedImage.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/CodecBridges.h>
 #include <PixelKiln/Lifecycle.h>
@@ -75,9 +78,9 @@ TEST(XRGB15, GivesWhatTheRuleSaysForAnyWords) {
     for (int width = 1; width <= 70; ++width) {
         SCOPED_TRACE(testing::Message() << width << ", seed " << random.Seed());
         const int32_t height = 1 + static_cast<int32_t>(random.Below(3));
-        const BridgeImage source({6 * static_cast<size_t>(width), height, 0, false}, random);
-        const BridgeImage destination({8 * static_cast<size_t>(width), height, 0, false}, random);
-        AtEveryCapability([&] {
+        const GuardedImage source({6 * static_cast<size_t>(width), height, 0, false}, random);
+        const GuardedImage destination({8 * static_cast<size_t>(width), height, 0, false}, random);
+        AtEveryTarget([&] {
             destination.Restore();
             std::vector<Bytes> expected;
             for (int32_t row = height; row-- > 0;)
@@ -95,7 +98,7 @@ TEST(XRGB15, GivesWhatTheRuleSaysForAllCodes) {
         std::memcpy(&source[2 * c], &word, sizeof word);
     }
     Bytes result(8 * 21846);
-    AtEveryCapability([&] {
+    AtEveryTarget([&] {
         PK_ConvertRGB_444_16u_To_XRGB_4444_15u(source.data(), result.data(), 21846, 1);
         ASSERT_EQ(result, ReferenceXRGB15(source, 21846, IsRounded()));
     });

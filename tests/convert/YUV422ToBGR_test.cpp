@@ -8,8 +8,7 @@ namespace {
 using PK::Kernel;
 using PK::RowKernel;
 using PK::Target;
-using PKTest::ForEachBody;
-using PKTest::RunRow;
+using namespace PKTest;
 
 using Bytes = std::vector<uint8_t>;
 
@@ -60,7 +59,7 @@ TEST(YUV422ToBGR8uRow, TheAverageIsRoundedToEightBitsBeforeTheMatrix) {
 }
 
 TEST(YUV422ToBGR8uRow, GivesWhatItsPartsGiveAtAnyWidth) {
-    PKTest::Random random(5);
+    Random random(5);
     for (const Parts& parts : kParts)
         for (int32_t width = 0; width <= 70; ++width)
             ASSERT_NO_FATAL_FAILURE(

@@ -89,13 +89,12 @@ TEST(YUVToYUV, OddWidthConvertsTheWholeLastPair) {
         if (rule.pixelsInUnit == 1) continue;
         for (int32_t pairs = 1; pairs <= 20; ++pairs) {
             const auto source = RandomUnits<uint8_t>(static_cast<size_t>(pairs), 3);
-            for (const NamedBody& body : BodiesOf(rule.kernel)) {
+            ForEachBody(rule.kernel, [&](PK::Target, PK::RowKernel body) {
                 std::vector<Bytes> odd(source.size()), even(source.size());
-                body.run(source.data(), odd.data(), 2 * pairs - 1);
-                body.run(source.data(), even.data(), 2 * pairs);
-                EXPECT_EQ(odd, even) << PK::Info(rule.kernel).name << " " << body.target << ", pairs "
-                                     << pairs;
-            }
+                body(source.data(), odd.data(), 2 * pairs - 1);
+                body(source.data(), even.data(), 2 * pairs);
+                EXPECT_EQ(odd, even) << "pairs " << pairs;
+            });
         }
     }
 }

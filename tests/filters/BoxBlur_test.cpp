@@ -4,11 +4,9 @@
 #include <PixelKiln/Lifecycle.h>
 
 #include "filters/BoxBlurKernels.h"
-#include "frame/Capabilities.h"
-#include "primitives/Dispatch.h"
-#include "support/FlagScope.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 
@@ -135,27 +133,9 @@ std::vector<int> BlurredRow(const std::vector<int>& values, double radius, int32
     return blurred;
 }
 
-/// Switches the capabilities down to those that a target stands on.
-void LeaveOnly(PK::Target target) {
-    PK::DetectProcessor();
-    const std::array<uint32_t, 4> switches = {3, 5, 6, 9}; // SSE2, SSSE3, SSE4.1, AVX2 and all above
-    for (size_t i = static_cast<size_t>(target); i < switches.size(); ++i) PK_SetDebugFlag(switches[i], 0);
-    if (target < PK::Target::avx512) PK::sCPUHasAVX512 = 0;
-}
+class BoxBlurBodies : public TargetTest {};
 
-class BoxBlurBodies : public testing::TestWithParam<int> {
-protected:
-    void SetUp() override {
-        LeaveOnly(Body());
-        if (PK::BestTarget() != Body()) GTEST_SKIP() << "not on this processor";
-    }
-    PK::Target Body() const { return static_cast<PK::Target>(GetParam()); }
-
-private:
-    FlagScope fFlags;
-};
-
-INSTANTIATE_TEST_SUITE_P(Targets, BoxBlurBodies, testing::Range(0, PK::kTargetCount));
+INSTANTIATE_TEST_SUITE_P(Targets, BoxBlurBodies, EveryTarget(), TargetOf);
 
 } // namespace
 
@@ -309,7 +289,7 @@ TEST_P(BoxBlurBodies, WideWindows) {
 
 // Around 7900 the quotient changes its method; the sums of white are the largest there are.
 TEST_P(BoxBlurBodies, QuotientsAtTheBordersOfTheMethods) {
-    const PK::BoxBlurKernels& kernels = PK::KernelsFor<PK::BoxBlurKernels>(Body());
+    const PK::BoxBlurKernels& kernels = PK::KernelsFor<PK::BoxBlurKernels>(GetParam());
     Random random(7);
     for (const int32_t size : {1, 14, 15, 16, 17, 3949, 3950, 3951, 4000, 9001, 16384})
         for (const int32_t weight : {0, 1, 127, 254})
@@ -335,7 +315,7 @@ TEST_P(BoxBlurBodies, QuotientsAtTheBordersOfTheMethods) {
 
 // One line in 64 bits, against the reference where that is quick, and on sums beyond 32 bits by a value.
 TEST_P(BoxBlurBodies, ASingleLine) {
-    const PK::BoxBlurKernels& kernels = PK::KernelsFor<PK::BoxBlurKernels>(Body());
+    const PK::BoxBlurKernels& kernels = PK::KernelsFor<PK::BoxBlurKernels>(GetParam());
     Random random(8);
     for (int32_t size = 1; size <= 30; ++size)
         for (const int32_t weight : {0, 1, 128, 254}) {

@@ -1,7 +1,6 @@
 // PK_FlipInPlace swaps the pixels of rows and nothing else.
 
-#include "support/GuardedRows.h"
-#include "support/Random.h"
+#include "support/GuardedImage.h"
 
 #include <PixelKiln/Buffers.h>
 
@@ -21,24 +20,20 @@ struct Image {
     int32_t pixelBytes;
 };
 
-// Flips with rows in either direction and compares with a copy that was turned row by row.
+// Flips with rows in either direction and compares with the rows in reverse.
 void CheckFlip(const Image& image, bool upwards) {
     SCOPED_TRACE(testing::Message() << PK_PixelFormatName(image.format) << " " << image.width << "x"
                                     << image.height << " padding " << image.padding << " upwards "
                                     << upwards);
     Random random(3);
-    const size_t step = static_cast<size_t>(image.pixelBytes + image.padding);
-    const size_t rows = static_cast<size_t>(image.height);
-    const GuardedRows memory(step * rows - static_cast<size_t>(image.padding), Guard::kAfter);
-    random.Fill(memory.Bytes(), memory.Size());
-    std::vector<uint8_t> expected(memory.Bytes(), memory.Bytes() + memory.Size());
-    for (size_t row = 0; row < rows; ++row)
-        std::copy_n(memory.Bytes() + row * step, image.pixelBytes, expected.data() + (rows - 1 - row) * step);
-
-    uint8_t* first = memory.Bytes() + (upwards ? step * (rows - 1) : 0);
-    const int32_t rowBytes = upwards ? -static_cast<int32_t>(step) : static_cast<int32_t>(step);
-    ASSERT_EQ(PK_FlipInPlace(first, rowBytes, image.width, image.height, image.format), PK_Success);
-    ASSERT_TRUE(std::equal(expected.begin(), expected.end(), memory.Bytes()));
+    const GuardedImage memory(
+        {static_cast<size_t>(image.pixelBytes), image.height, static_cast<size_t>(image.padding), upwards},
+        random);
+    std::vector<std::vector<uint8_t>> rows = memory.Rows();
+    std::reverse(rows.begin(), rows.end());
+    ASSERT_EQ(PK_FlipInPlace(memory.Pixels(), memory.RowBytes(), image.width, image.height, image.format),
+              PK_Success);
+    memory.ExpectRows(rows);
 }
 
 } // namespace

@@ -5,11 +5,11 @@
 #include <PixelKiln/Rotate.h>
 
 #include "frame/Capabilities.h"
-#include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
 #include "support/FlagScope.h"
-#include "support/GuardedRows.h"
+#include "support/GuardedImage.h"
 #include "support/Random.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 
@@ -22,65 +22,33 @@ namespace {
 
 using namespace PKTest;
 
-/// Switches the capabilities down to those that a target stands on.
-void LeaveOnly(PK::Target target) {
-    PK::DetectProcessor();
-    uint8_t* const flags[PK::kTargetCount] = {nullptr,          &PK::sCPUHasSSE2, &PK::sCPUHasSSSE3,
-                                              &PK::sCPUHasSSE4, &PK::sCPUHasAVX2, &PK::sCPUHasAVX512};
-    for (size_t i = static_cast<size_t>(target) + 1; i < std::size(flags); ++i) *flags[i] = 0;
-}
-
-/// An image of whole pixels whose rows are `step` bytes apart, in memory that ends at guard pages.
-struct Pixels {
-    int32_t rows, columns, pixelBytes;
-    int64_t step;
-    GuardedRows memory;
-
-    Pixels(int32_t rowCount, int32_t columnCount, int32_t bytes, int32_t padding, bool upward, Guard guard)
-        : rows(rowCount), columns(columnCount), pixelBytes(bytes),
-          step((upward ? 1 : -1) * (int64_t{columns} * bytes + padding)),
-          memory(static_cast<size_t>(rows ? (rows - 1) * std::abs(step) + int64_t{columns} * bytes : 0),
-                 guard) {}
-
-    uint8_t* First() const { return memory.Bytes() + (step < 0 ? (rows - 1) * -step : 0); }
-    uint8_t* At(int32_t row, int32_t column) const {
-        return First() + row * step + int64_t{column} * pixelBytes;
-    }
-    bool Same(int32_t row, int32_t column, const Pixels& other, int32_t otherRow, int32_t otherColumn) const {
-        return std::equal(At(row, column), At(row, column) + pixelBytes, other.At(otherRow, otherColumn));
-    }
-    /// The bytes between the rows, which nobody may write.
-    bool PaddingIs(uint8_t value) const {
-        for (int32_t row = 0; row + 1 < rows; ++row) {
-            const uint8_t* lower = std::min(At(row, 0), At(row + 1, 0)) + int64_t{columns} * pixelBytes;
-            const uint8_t* upper = std::max(At(row, 0), At(row + 1, 0));
-            if (!std::all_of(lower, upper, [value](uint8_t byte) { return byte == value; })) return false;
+/// The rows of an image whose pixel `column` of row `row` is what pixelAt(row, column) points to.
+template <class PixelAt>
+std::vector<std::vector<uint8_t>> RowsOf(int32_t width, int32_t height, int32_t pixelBytes, PixelAt pixelAt) {
+    std::vector<std::vector<uint8_t>> rows(static_cast<size_t>(height));
+    for (int32_t row = 0; row < height; ++row)
+        for (int32_t column = 0; column < width; ++column) {
+            const uint8_t* pixel = pixelAt(row, column);
+            std::vector<uint8_t>& bytes = rows[static_cast<size_t>(row)];
+            bytes.insert(bytes.end(), pixel, pixel + pixelBytes);
         }
-        return true;
-    }
-};
-
-using TransposeFunction = std::function<void(const Pixels& source, const Pixels& destination)>;
-
-void ByInterface(const Pixels& source, const Pixels& destination) {
-    ASSERT_EQ(PK_Success, PK_Transpose(source.First(), static_cast<int32_t>(source.step), destination.First(),
-                                       static_cast<int32_t>(destination.step), source.columns, source.rows,
-                                       static_cast<uint8_t>(source.pixelBytes)));
+    return rows;
 }
 
-class TransposeBodies : public testing::TestWithParam<PK::Target> {
-protected:
-    void SetUp() override {
-        LeaveOnly(GetParam());
-        if (!PK::IsEnabled(GetParam())) GTEST_SKIP() << "not on this processor";
-    }
+using TransposeFunction = std::function<void(const PK::TransposeArea& area, int32_t pixelBytes)>;
 
+void ByInterface(const PK::TransposeArea& area, int32_t pixelBytes) {
+    ASSERT_EQ(PK_Success, PK_Transpose(area.source, static_cast<int32_t>(area.sourceStep), area.destination,
+                                       static_cast<int32_t>(area.destinationStep), area.columns, area.rows,
+                                       static_cast<uint8_t>(pixelBytes)));
+}
+
+class TransposeBodies : public TargetTest {
+protected:
     /// The body of the target itself, which the interface does not choose for all.
-    void ByBody(const Pixels& source, const Pixels& destination) const {
+    void ByBody(const PK::TransposeArea& area, int32_t pixelBytes) const {
         const auto& kernels = PK::KernelsFor<PK::TransposeKernels>(GetParam());
-        const PK::TransposeArea area = {source.First(),   source.step, destination.First(),
-                                        destination.step, source.rows, source.columns};
-        switch (source.pixelBytes) {
+        switch (pixelBytes) {
         case 1:
             return kernels.pixels1(area);
         case 2:
@@ -94,26 +62,28 @@ protected:
         }
     }
 
-    /// Transposes random pixels in rows of random order and distance, which end or begin at a guard page.
-    void Check(const TransposeFunction& transpose, int32_t width, int32_t height, int32_t pixelBytes) {
-        const int32_t padding = pixelBytes * static_cast<int32_t>(random.Below(3));
-        const bool sourceUpward = random.Below(2) != 0, destinationUpward = random.Below(2) != 0;
-        const Guard guard = random.Below(2) != 0 ? Guard::kAfter : Guard::kBefore;
-        const Pixels source(height, width, pixelBytes, padding, sourceUpward, guard);
-        const Pixels destination(width, height, pixelBytes, 2 * padding, destinationUpward, guard);
-        random.Fill(source.memory.Bytes(), source.memory.Size());
-        std::fill_n(destination.memory.Bytes(), destination.memory.Size(), uint8_t{0xa5});
-
-        transpose(source, destination);
-        for (int32_t row = 0; row < height; ++row)
-            for (int32_t column = 0; column < width; ++column)
-                ASSERT_TRUE(source.Same(row, column, destination, column, row))
-                    << pixelBytes << " bytes, " << width << "x" << height << ", row " << row << ", column "
-                    << column << ", seed " << random.Seed();
-        ASSERT_TRUE(destination.PaddingIs(0xa5));
+    /// Rows of either direction.
+    GuardedImage MakeImage(int32_t width, int32_t height, int32_t pixelBytes, size_t padding, Guard guard) {
+        return {{static_cast<size_t>(width * pixelBytes), height, padding, random.Below(2) != 0, guard},
+                random};
     }
 
-    FlagScope flags;
+    /// Transposes random pixels in rows of random order and distance, which end or begin at a guard page.
+    void Check(const TransposeFunction& transpose, int32_t width, int32_t height, int32_t pixelBytes) {
+        SCOPED_TRACE(testing::Message()
+                     << pixelBytes << " bytes, " << width << "x" << height << ", seed " << random.Seed());
+        const size_t padding = static_cast<size_t>(pixelBytes) * random.Below(3);
+        const Guard guard = random.Below(2) != 0 ? Guard::kAfter : Guard::kBefore;
+        const GuardedImage source = MakeImage(width, height, pixelBytes, padding, guard);
+        const GuardedImage destination = MakeImage(height, width, pixelBytes, 2 * padding, guard);
+        transpose(
+            {source.Pixels(), source.RowBytes(), destination.Pixels(), destination.RowBytes(), height, width},
+            pixelBytes);
+        destination.ExpectRows(RowsOf(height, width, pixelBytes, [&](int32_t row, int32_t column) {
+            return source.Row(column) + row * pixelBytes;
+        }));
+    }
+
     Random random{54};
 };
 
@@ -128,8 +98,8 @@ TEST_P(TransposeBodies, EveryPixelChangesItsRowForItsColumn) {
 }
 
 TEST_P(TransposeBodies, EveryWidthAndHeightThatFillsTilesOrDoesNot) {
-    const auto byBody = [this](const Pixels& source, const Pixels& destination) {
-        ByBody(source, destination);
+    const auto byBody = [this](const PK::TransposeArea& area, int32_t pixelBytes) {
+        ByBody(area, pixelBytes);
     };
     for (const int32_t pixelBytes : {1, 2, 4, 8, 16})
         for (int32_t size = 0; size <= 70; ++size) {
@@ -145,35 +115,26 @@ TEST_P(TransposeBodies, QuarterTurnsLandWhereTheRuleSays) {
         for (int round = 0; round < 100; ++round) {
             const auto width = static_cast<int32_t>(1 + random.Below(70));
             const auto height = static_cast<int32_t>(1 + random.Below(70));
+            SCOPED_TRACE(testing::Message()
+                         << degrees << " degrees, " << width << "x" << height << ", seed " << random.Seed());
             const bool half = degrees % 180 == 0;
-            const Pixels source(height, width, 4, 4, random.Below(2) != 0, Guard::kAfter);
-            const Pixels destination(half ? height : width, half ? width : height, 4, 8, random.Below(2) != 0,
-                                     Guard::kAfter);
-            random.Fill(source.memory.Bytes(), source.memory.Size());
-            std::fill_n(destination.memory.Bytes(), destination.memory.Size(), uint8_t{0xa5});
-
-            ASSERT_EQ(PK_Success, PK_RotateImage(source.First(), static_cast<int32_t>(source.step),
-                                                 destination.First(), static_cast<int32_t>(destination.step),
-                                                 width, height, PK_PixelFormat_BGRA_4444_8u, degrees));
-            for (int32_t r = 0; r < destination.rows; ++r)
-                for (int32_t c = 0; c < destination.columns; ++c) {
+            const int32_t columns = half ? width : height, rows = half ? height : width;
+            const GuardedImage source = MakeImage(width, height, 4, 4, Guard::kAfter);
+            const GuardedImage destination = MakeImage(columns, rows, 4, 8, Guard::kAfter);
+            ASSERT_EQ(PK_Success, PK_RotateImage(source.Pixels(), source.RowBytes(), destination.Pixels(),
+                                                 destination.RowBytes(), width, height,
+                                                 PK_PixelFormat_BGRA_4444_8u, degrees));
+            ASSERT_NO_FATAL_FAILURE(
+                destination.ExpectRows(RowsOf(columns, rows, 4, [&](int32_t r, int32_t c) {
                     int32_t row = height - 1 - r, column = width - 1 - c; // 180
                     if (degrees == 90 || degrees == -270) row = height - 1 - c, column = r;
                     if (degrees == 270 || degrees == -90) row = c, column = width - 1 - r;
-                    ASSERT_TRUE(destination.Same(r, c, source, row, column))
-                        << degrees << " degrees, " << width << "x" << height << ", row " << r << ", column "
-                        << c;
-                }
-            ASSERT_TRUE(destination.PaddingIs(0xa5));
+                    return source.Row(row) + 4 * column;
+                })));
         }
 }
 
-INSTANTIATE_TEST_SUITE_P(Targets, TransposeBodies,
-                         testing::Values(PK::Target::plain, PK::Target::sse2, PK::Target::ssse3,
-                                         PK::Target::sse41, PK::Target::avx2, PK::Target::avx512),
-                         [](const auto& param) {
-                             return "target" + std::to_string(static_cast<int>(param.param));
-                         });
+INSTANTIATE_TEST_SUITE_P(Targets, TransposeBodies, EveryTarget(), TargetOf);
 
 TEST(Transpose, TwiceIsTheImageItself) {
     const FlagScope flags;

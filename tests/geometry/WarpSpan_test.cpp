@@ -1,11 +1,9 @@
 // Every body of the quad warp against the restatement, pixel for pixel.
 
-#include "frame/Capabilities.h"
-#include "primitives/Dispatch.h"
 #include "reference/ReferenceQuadWarp.h"
-#include "support/FlagScope.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/QuadWarp.h>
 
@@ -110,18 +108,9 @@ private:
     int fSaved;
 };
 
-/// Leaves the capabilities of a target, and of those that it stands on.
-void AllowUpTo(PK::Target target) {
-    FlagScope::ClearAll();
-    PK::SetCapabilities(PK::ReadProcessor());
-    uint8_t* const flags[] = {&PK::sCPUHasSSE2, &PK::sCPUHasSSSE3, &PK::sCPUHasSSE4, &PK::sCPUHasAVX2};
-    for (size_t i = static_cast<size_t>(target); i < std::size(flags); ++i) *flags[i] = 0;
-}
-
 } // namespace
 
 TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
-    const FlagScope flags;
     Random random(53);
     for (int32_t round = 0; round < 6000; ++round) {
         QuadWarp warp = DrawWarp(random);
@@ -141,26 +130,23 @@ TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
         const std::vector<uint8_t> before = destination.Copy();
         DrawQuadWarp(warp);
         const std::vector<uint8_t> expected = destination.Copy();
-        for (int i = 0; i < PK::kTargetCount; ++i) {
-            const auto target = static_cast<PK::Target>(i);
-            AllowUpTo(target);
-            if (PK::BestTarget() != target) continue;
+        AtEveryTarget([&] {
             destination.Restore(before);
             ASSERT_EQ(Call(warp), PK_Success);
             const std::vector<uint8_t> actual = destination.Copy();
             const auto place = std::mismatch(expected.begin(), expected.end(), actual.begin());
             ASSERT_TRUE(place.first == expected.end())
-                << PK::TargetName(target) << ", round " << round << ", seed " << random.Seed() << ", byte "
+                << "round " << round << ", seed " << random.Seed() << ", byte "
                 << place.first - expected.begin() << ": expected " << int{*place.first} << ", is "
                 << int{*place.second} << "; quality " << warp.quality << ", blend " << warp.blend
                 << ", format " << warp.format << ", field " << warp.field << ", feather " << warp.feather;
-        }
+        });
+        if (HasFatalFailure()) return;
     }
 }
 
 /// Every alpha over every alpha, as one row of pixels.
 TEST(WarpSpan, EveryBodyMixesAsTheRestatement) {
-    const FlagScope flags;
     constexpr int32_t kWidth = 65536;
     std::vector<uint8_t> source(4 * kWidth), before(4 * kWidth);
     Random random(54);
@@ -189,15 +175,13 @@ TEST(WarpSpan, EveryBodyMixesAsTheRestatement) {
             std::vector<uint8_t> expected = before;
             warp.destination = expected.data();
             DrawQuadWarp(warp);
-            for (int i = 0; i < PK::kTargetCount; ++i) {
-                const auto target = static_cast<PK::Target>(i);
-                AllowUpTo(target);
-                if (PK::BestTarget() != target) continue;
+            AtEveryTarget([&] {
                 std::vector<uint8_t> actual = before;
                 warp.destination = actual.data();
                 ASSERT_EQ(Call(warp), PK_Success);
-                ASSERT_TRUE(actual == expected) << PK::TargetName(target) << ", round " << round;
-            }
+                ASSERT_TRUE(actual == expected) << "round " << round;
+            });
+            if (HasFatalFailure()) return;
         }
     }
 }

@@ -2,9 +2,8 @@
 
 #include "primitives/ALaw.h"
 
-#include "primitives/Targets.h"
 #include "support/RowBuffer.h"
-#include "support/TargetScope.h"
+#include "support/Targets.h"
 
 #include <cstring>
 #include <gtest/gtest.h>
@@ -22,9 +21,8 @@ int16_t Expected(uint8_t code) {
     return static_cast<int16_t>((bits & 0x80) != 0 ? 8 * middle : -8 * middle);
 }
 
-std::vector<int16_t> Decode(Target target, const std::vector<uint8_t>& codes) {
+std::vector<int16_t> Decode(const std::vector<uint8_t>& codes) {
     std::vector<int16_t> samples(codes.size());
-    const TargetScope scope(target);
     EXPECT_EQ(ALawToLinear16(codes.data(), samples.data(), static_cast<int32_t>(codes.size())), 0);
     return samples;
 }
@@ -33,12 +31,11 @@ TEST(ALaw, DecodesKnownCodes) {
     // least, end of segment 0, begin of 1, begin of 2, greatest; positive and negative
     const std::vector<uint8_t> codes = {0xd5, 0x55, 0xda, 0xc5, 0xf5, 0xaa, 0x2a, 0x80, 0x00};
     const std::vector<int16_t> samples = {8, -8, 248, 264, 528, 32256, -32256, 5504, -5504};
-    for (const Target target : TargetsOfThisProcessor())
-        EXPECT_EQ(Decode(target, codes), samples) << TargetName(target);
+    AtEveryTarget([&] { EXPECT_EQ(Decode(codes), samples); });
 }
 
 TEST(ALaw, DecodesEveryCodeAtEveryPlace) {
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([] {
         for (int32_t shift = 0; shift < 256; ++shift) {
             std::vector<uint8_t> codes(256);
             std::vector<int16_t> expected(256);
@@ -46,14 +43,13 @@ TEST(ALaw, DecodesEveryCodeAtEveryPlace) {
                 codes[i] = static_cast<uint8_t>(static_cast<int32_t>(i) + shift);
                 expected[i] = Expected(codes[i]);
             }
-            ASSERT_EQ(Decode(target, codes), expected) << TargetName(target) << ", shift " << shift;
+            ASSERT_EQ(Decode(codes), expected) << "shift " << shift;
         }
-    }
+    });
 }
 
 TEST(ALaw, TouchesExactlyItsElements) {
-    for (const Target target : TargetsOfThisProcessor()) {
-        const TargetScope scope(target);
+    AtEveryTarget([] {
         for (size_t count = 0; count <= 140; ++count) {
             for (const Placement place :
                  {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
@@ -65,13 +61,12 @@ TEST(ALaw, TouchesExactlyItsElements) {
                 for (size_t i = 0; i < count; ++i) {
                     int16_t sample;
                     std::memcpy(&sample, result.Data() + 2 * i, sizeof sample);
-                    ASSERT_EQ(sample, Expected(static_cast<uint8_t>(i * 37)))
-                        << TargetName(target) << " " << i;
+                    ASSERT_EQ(sample, Expected(static_cast<uint8_t>(i * 37))) << i;
                 }
                 ASSERT_TRUE(result.MarginsIntact());
             }
         }
-    }
+    });
 }
 
 TEST(ALaw, RefusesNullPointersAndNegativeCounts) {

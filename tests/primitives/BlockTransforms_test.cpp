@@ -2,9 +2,9 @@
 
 #include "primitives/BlockTransforms.h"
 
-#include "primitives/Targets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 

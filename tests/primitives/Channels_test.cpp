@@ -2,10 +2,9 @@
 
 #include "primitives/Channels.h"
 
-#include "primitives/Targets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
-#include "support/TargetScope.h"
+#include "support/Targets.h"
 
 #include <algorithm>
 #include <cmath>
@@ -38,12 +37,10 @@ int32_t Set(float value, uint8_t* start, ptrdiff_t step, int32_t width, int32_t 
 template <class Sample>
 void CheckSet(Sample value) {
     Random random(21);
-    for (const Target target : TargetsOfThisProcessor()) {
-        const TargetScope scope(target);
+    AtEveryTarget([&] {
         for (const Placement place : kPlaces) {
             for (size_t width = 1; width <= 70; ++width) {
-                SCOPED_TRACE(testing::Message()
-                             << TargetName(target) << ", width " << width << ", " << place);
+                SCOPED_TRACE(testing::Message() << "width " << width << ", " << place);
                 const RowBuffer row((4 * (width - 1) + 1) * sizeof value, place);
                 random.Fill(row.Data(), row.Size());
                 std::vector<uint8_t> expected(row.Data(), row.Data() + row.Size());
@@ -54,7 +51,7 @@ void CheckSet(Sample value) {
                 ASSERT_TRUE(row.MarginsIntact());
             }
         }
-    }
+    });
 }
 
 TEST(SetChannel, WritesTheSamplesOfOneChannelOnly) {

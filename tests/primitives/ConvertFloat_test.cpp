@@ -2,11 +2,10 @@
 
 #include "primitives/ConvertFloat.h"
 
-#include "primitives/Targets.h"
 #include "support/FloatEnvironment.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
-#include "support/TargetScope.h"
+#include "support/Targets.h"
 
 #include <cmath>
 #include <cstring>
@@ -38,27 +37,21 @@ Integer Expected(float x, int32_t roundMode, int32_t scale) {
     return static_cast<Integer>(rounded);
 }
 
-int32_t Convert(Target target, const float* source, int32_t* destination, int32_t count, int32_t roundMode,
-                int32_t scale) {
-    const TargetScope scope(target);
+int32_t Convert(const float* source, int32_t* destination, int32_t count, int32_t roundMode, int32_t scale) {
     return ConvertFloatToInt32(source, destination, count, roundMode, scale);
 }
-int32_t Convert(Target target, const float* source, int16_t* destination, int32_t count, int32_t roundMode,
-                int32_t scale) {
-    const TargetScope scope(target);
+int32_t Convert(const float* source, int16_t* destination, int32_t count, int32_t roundMode, int32_t scale) {
     return ConvertFloatToInt16(source, destination, count, roundMode, scale);
 }
 
 template <class Integer>
-void CheckAgainstReference(Target target, const std::vector<float>& source, int32_t roundMode,
-                           int32_t scale) {
+void CheckAgainstReference(const std::vector<float>& source, int32_t roundMode, int32_t scale) {
     std::vector<Integer> result(source.size());
-    ASSERT_EQ(
-        Convert(target, source.data(), result.data(), static_cast<int32_t>(source.size()), roundMode, scale),
-        0);
+    ASSERT_EQ(Convert(source.data(), result.data(), static_cast<int32_t>(source.size()), roundMode, scale),
+              0);
     for (size_t i = 0; i < source.size(); ++i)
         ASSERT_EQ(result[i], Expected<Integer>(source[i], roundMode, scale))
-            << TargetName(target) << ", " << source[i] << ", mode " << roundMode << ", scale " << scale;
+            << source[i] << ", mode " << roundMode << ", scale " << scale;
 }
 
 std::vector<float> AwkwardFloats() {
@@ -78,73 +71,72 @@ TEST(ConvertFloat, GivesWhatIsWorkedOutByHand) {
     const std::vector<int32_t> truncated = {2, 3, -2, 2, -2, 7, 40000, 0};
     const std::vector<int16_t> halves = {1,  2, -1,    1,
                                          -1, 4, 20000, 0}; // nearest at scale 1: 1.25, 1.75, ... 3.5
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         std::vector<int32_t> result(source.size());
-        Convert(target, source.data(), result.data(), 8, 1, 0);
-        EXPECT_EQ(result, nearest) << TargetName(target);
-        Convert(target, source.data(), result.data(), 8, 0, 0);
-        EXPECT_EQ(result, truncated) << TargetName(target);
+        Convert(source.data(), result.data(), 8, 1, 0);
+        EXPECT_EQ(result, nearest);
+        Convert(source.data(), result.data(), 8, 0, 0);
+        EXPECT_EQ(result, truncated);
         std::vector<int16_t> words(source.size());
-        Convert(target, source.data(), words.data(), 8, 1, 1);
-        EXPECT_EQ(words, halves) << TargetName(target);
-        Convert(target, source.data(), words.data(), 8, 1, -3);
-        EXPECT_EQ(words, (std::vector<int16_t>{20, 28, -20, 22, -22, 56, 32767, 0})) << TargetName(target);
-    }
+        Convert(source.data(), words.data(), 8, 1, 1);
+        EXPECT_EQ(words, halves);
+        Convert(source.data(), words.data(), 8, 1, -3);
+        EXPECT_EQ(words, (std::vector<int16_t>{20, 28, -20, 22, -22, 56, 32767, 0}));
+    });
 }
 
 TEST(ConvertFloat, RoundsAndSaturatesAtEveryScale) {
     const std::vector<float> source = AwkwardFloats();
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         for (const int32_t roundMode : {0, 1, 2, -1}) {
             for (int32_t scale = -40; scale <= 40; ++scale) {
-                CheckAgainstReference<int32_t>(target, source, roundMode, scale);
-                CheckAgainstReference<int16_t>(target, source, roundMode, scale);
+                CheckAgainstReference<int32_t>(source, roundMode, scale);
+                CheckAgainstReference<int16_t>(source, roundMode, scale);
             }
             for (const int32_t scale :
                  {-149, -180, -240, -241, -300, 126, 127, 128, 129, 150, 240, 241, 2000, -2000}) {
-                CheckAgainstReference<int32_t>(target, source, roundMode, scale);
-                CheckAgainstReference<int16_t>(target, source, roundMode, scale);
+                CheckAgainstReference<int32_t>(source, roundMode, scale);
+                CheckAgainstReference<int16_t>(source, roundMode, scale);
             }
         }
-    }
+    });
 }
 
 TEST(ConvertFloat, RoundsRandomBitsAtAnyScale) {
     Random random(31);
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         for (int round = 0; round < 40; ++round) {
             std::vector<float> source(997);
             random.Fill(reinterpret_cast<uint8_t*>(source.data()), source.size() * sizeof(float));
             const auto scale = static_cast<int32_t>(random.Below(300)) - 150;
-            CheckAgainstReference<int32_t>(target, source, round % 2, scale);
-            CheckAgainstReference<int16_t>(target, source, round % 2, scale);
+            CheckAgainstReference<int32_t>(source, round % 2, scale);
+            CheckAgainstReference<int16_t>(source, round % 2, scale);
         }
-    }
+    });
 }
 
 TEST(ConvertFloat, IsTheSameUnderEveryFloatingPointMode) {
     const std::vector<float> source = AwkwardFloats();
     for (const uint32_t bits : {kRoundDown, kRoundUp, kRoundToZero, kFlushToZero | kDenormalsAreZero}) {
-        for (const Target target : TargetsOfThisProcessor()) {
+        AtEveryTarget([&] {
             for (const int32_t scale : {0, -140, 5}) {
                 std::vector<int32_t> result(source.size());
                 {
                     const FloatEnvironment environment(bits);
-                    Convert(target, source.data(), result.data(), static_cast<int32_t>(source.size()), 1,
-                            scale);
+                    Convert(source.data(), result.data(), static_cast<int32_t>(source.size()), 1, scale);
                     EXPECT_TRUE(environment.IsAsGiven());
                 }
                 for (size_t i = 0; i < source.size(); ++i)
                     ASSERT_EQ(result[i], Expected<int32_t>(source[i], 1, scale)) << source[i] << " " << bits;
             }
-        }
+        });
     }
 }
 
 template <class Integer>
 void CheckEveryLength() {
     Random random(32);
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         for (size_t count = 0; count <= 70; ++count) {
             for (const Placement place :
                  {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
@@ -154,20 +146,19 @@ void CheckEveryLength() {
                     const float x = static_cast<float>(static_cast<int32_t>(random.Next())) * 0x1p-14f;
                     std::memcpy(source.Data() + i * sizeof x, &x, sizeof x);
                 }
-                Convert(target, reinterpret_cast<const float*>(source.Data()),
+                Convert(reinterpret_cast<const float*>(source.Data()),
                         reinterpret_cast<Integer*>(result.Data()), static_cast<int32_t>(count), 1, 2);
                 for (size_t i = 0; i < count; ++i) {
                     float x;
                     Integer integer;
                     std::memcpy(&x, source.Data() + i * sizeof x, sizeof x);
                     std::memcpy(&integer, result.Data() + i * sizeof integer, sizeof integer);
-                    ASSERT_EQ(integer, Expected<Integer>(x, 1, 2))
-                        << TargetName(target) << " count " << count;
+                    ASSERT_EQ(integer, Expected<Integer>(x, 1, 2)) << "count " << count;
                 }
                 ASSERT_TRUE(result.MarginsIntact());
             }
         }
-    }
+    });
 }
 
 TEST(ConvertFloat, TouchesExactlyItsElements) {
@@ -176,25 +167,25 @@ TEST(ConvertFloat, TouchesExactlyItsElements) {
 }
 
 TEST(ConvertFloat, To32BitsWorksInPlace) {
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         std::vector<float> floats(37);
         for (size_t i = 0; i < floats.size(); ++i) floats[i] = static_cast<float>(i) * 1.5f;
         std::vector<int32_t> expected(floats.size());
         for (size_t i = 0; i < floats.size(); ++i) expected[i] = Expected<int32_t>(floats[i], 1, 0);
-        Convert(target, floats.data(), reinterpret_cast<int32_t*>(floats.data()), 37, 1, 0);
-        EXPECT_EQ(std::memcmp(floats.data(), expected.data(), 37 * sizeof(float)), 0) << TargetName(target);
-    }
+        Convert(floats.data(), reinterpret_cast<int32_t*>(floats.data()), 37, 1, 0);
+        EXPECT_EQ(std::memcmp(floats.data(), expected.data(), 37 * sizeof(float)), 0);
+    });
 }
 
 TEST(ConvertFloat, RefusesNullPointersAndNegativeCounts) {
     const float source = 1;
     int32_t integer = 5;
     int16_t word = 5;
-    EXPECT_EQ(Convert(Target::plain, nullptr, &integer, 1, 1, 0), -8);
-    EXPECT_EQ(Convert(Target::plain, &source, static_cast<int16_t*>(nullptr), 1, 1, 0), -8);
-    EXPECT_EQ(Convert(Target::plain, &source, &integer, -1, 1, 0), -6);
-    EXPECT_EQ(Convert(Target::plain, &source, &word, -1, 1, 0), -6);
-    EXPECT_EQ(Convert(Target::plain, &source, &word, 0, 1, 0), 0);
+    EXPECT_EQ(Convert(nullptr, &integer, 1, 1, 0), -8);
+    EXPECT_EQ(Convert(&source, static_cast<int16_t*>(nullptr), 1, 1, 0), -8);
+    EXPECT_EQ(Convert(&source, &integer, -1, 1, 0), -6);
+    EXPECT_EQ(Convert(&source, &word, -1, 1, 0), -6);
+    EXPECT_EQ(Convert(&source, &word, 0, 1, 0), 0);
     EXPECT_EQ(integer, 5);
     EXPECT_EQ(word, 5);
 }

@@ -3,10 +3,9 @@
 
 #include "primitives/FillPixels.h"
 
-#include "primitives/Targets.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
-#include "support/TargetScope.h"
+#include "support/Targets.h"
 
 #include <algorithm>
 #include <cstring>
@@ -26,9 +25,7 @@ struct Rectangle {
     bool upwards;
 };
 
-int32_t Fill(Target target, const std::vector<uint8_t>& pixel, uint8_t* destination, ptrdiff_t step,
-             const Rectangle& size) {
-    const TargetScope scope(target);
+int32_t Fill(const std::vector<uint8_t>& pixel, uint8_t* destination, ptrdiff_t step, const Rectangle& size) {
     uint16_t words[4];
     float floats[4];
     switch (pixel.size()) {
@@ -44,11 +41,10 @@ int32_t Fill(Target target, const std::vector<uint8_t>& pixel, uint8_t* destinat
 }
 
 // Fills rows in memory that ends (or begins) at an inaccessible page, with a margin on the other side.
-void CheckFill(Target target, const std::vector<uint8_t>& pixel, const Rectangle& size, Guard guard,
-               size_t margin) {
-    SCOPED_TRACE(testing::Message() << TargetName(target) << ", pixels of " << pixel.size() << " bytes, "
-                                    << size.width << " x " << size.height << ", padding " << size.padding
-                                    << ", upwards " << size.upwards << ", margin " << margin);
+void CheckFill(const std::vector<uint8_t>& pixel, const Rectangle& size, Guard guard, size_t margin) {
+    SCOPED_TRACE(testing::Message() << "pixels of " << pixel.size() << " bytes, " << size.width << " x "
+                                    << size.height << ", padding " << size.padding << ", upwards "
+                                    << size.upwards << ", margin " << margin);
     const size_t rowBytes = pixel.size() * static_cast<size_t>(size.width);
     const size_t step = rowBytes + static_cast<size_t>(size.padding);
     const auto rows = static_cast<size_t>(size.height);
@@ -62,7 +58,7 @@ void CheckFill(Target target, const std::vector<uint8_t>& pixel, const Rectangle
 
     const auto signedStep = static_cast<ptrdiff_t>(step);
     uint8_t* first = size.upwards ? lowest + signedStep * (size.height - 1) : lowest;
-    ASSERT_EQ(Fill(target, pixel, first, size.upwards ? -signedStep : signedStep, size), 0);
+    ASSERT_EQ(Fill(pixel, first, size.upwards ? -signedStep : signedStep, size), 0);
     const auto [wrong, right] =
         std::mismatch(memory.Bytes(), memory.Bytes() + memory.Size(), expected.begin());
     ASSERT_EQ(wrong, memory.Bytes() + memory.Size()) << "at byte " << wrong - memory.Bytes();
@@ -70,19 +66,19 @@ void CheckFill(Target target, const std::vector<uint8_t>& pixel, const Rectangle
 
 TEST(FillPixels, FillsRowsOfEveryWidthAndAlignment) {
     Random random(11);
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         for (const size_t pixelBytes : {4, 8, 16}) {
             const std::vector<uint8_t> pixel = random.Bytes(pixelBytes);
             for (int32_t width = 1; width <= 80; ++width) {
                 const size_t margin = random.Below(70);
-                CheckFill(target, pixel, {width, 2, 0, false}, Guard::kAfter, margin);
-                CheckFill(target, pixel, {width, 3, static_cast<ptrdiff_t>(random.Below(40)), true},
-                          Guard::kBefore, margin);
-                CheckFill(target, pixel, {width, 3, static_cast<ptrdiff_t>(random.Below(40)), false},
-                          Guard::kAfter, margin);
+                CheckFill(pixel, {width, 2, 0, false}, Guard::kAfter, margin);
+                CheckFill(pixel, {width, 3, static_cast<ptrdiff_t>(random.Below(40)), true}, Guard::kBefore,
+                          margin);
+                CheckFill(pixel, {width, 3, static_cast<ptrdiff_t>(random.Below(40)), false}, Guard::kAfter,
+                          margin);
             }
         }
-    }
+    });
 }
 
 TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
@@ -90,18 +86,18 @@ TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
     constexpr int32_t kBytes = 1 << 20; // from here on runs are long
     std::vector<uint8_t> periodic = random.Bytes(16);
     std::copy_n(periodic.begin(), 8, periodic.begin() + 8);
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         for (const std::vector<uint8_t>& pixel :
              {random.Bytes(4), random.Bytes(8), random.Bytes(16), periodic}) {
             const auto size = static_cast<int32_t>(pixel.size());
             for (const size_t margin : {0, 1, 4, 63}) {
-                CheckFill(target, pixel, {kBytes / size, 1, 0, false}, Guard::kAfter, margin);
-                CheckFill(target, pixel, {kBytes / size - 1, 1, 0, false}, Guard::kAfter, margin);
-                CheckFill(target, pixel, {100003 / size, 11, 0, false}, Guard::kBefore, margin);
-                CheckFill(target, pixel, {kBytes / size + 5, 2, 20, true}, Guard::kAfter, margin);
+                CheckFill(pixel, {kBytes / size, 1, 0, false}, Guard::kAfter, margin);
+                CheckFill(pixel, {kBytes / size - 1, 1, 0, false}, Guard::kAfter, margin);
+                CheckFill(pixel, {100003 / size, 11, 0, false}, Guard::kBefore, margin);
+                CheckFill(pixel, {kBytes / size + 5, 2, 20, true}, Guard::kAfter, margin);
             }
         }
-    }
+    });
 }
 
 TEST(FillPixels, FillsTheRowsOfLargeImagesBetweenTheirGaps) {
@@ -110,29 +106,28 @@ TEST(FillPixels, FillsTheRowsOfLargeImagesBetweenTheirGaps) {
     constexpr int32_t kRowBytes = 4096;
     std::vector<uint8_t> periodic = random.Bytes(16);
     std::copy_n(periodic.begin(), 8, periodic.begin() + 8);
-    for (const Target target : TargetsOfThisProcessor()) {
+    AtEveryTarget([&] {
         for (const std::vector<uint8_t>& pixel :
              {random.Bytes(4), random.Bytes(8), random.Bytes(16), periodic}) {
             const auto size = static_cast<int32_t>(pixel.size());
             const size_t margin = random.Below(70);
             // Gaps with which rows begin at the same place in a cache line, in a vector, and nowhere in particular.
             for (const ptrdiff_t padding : {64, 48, 20, 7}) {
-                CheckFill(target, pixel, {kRowBytes / size, kRows, padding, false}, Guard::kAfter, margin);
-                CheckFill(target, pixel, {kRowBytes / size + 3, kRows, padding, true}, Guard::kBefore,
-                          margin);
+                CheckFill(pixel, {kRowBytes / size, kRows, padding, false}, Guard::kAfter, margin);
+                CheckFill(pixel, {kRowBytes / size + 3, kRows, padding, true}, Guard::kBefore, margin);
             }
-            CheckFill(target, pixel, {kRowBytes / size - 1, kRows, 20, false}, Guard::kAfter, margin);
-            CheckFill(target, pixel, {5 * kRowBytes / size, kRows / 4, 20, false}, Guard::kAfter, margin);
+            CheckFill(pixel, {kRowBytes / size - 1, kRows, 20, false}, Guard::kAfter, margin);
+            CheckFill(pixel, {5 * kRowBytes / size, kRows / 4, 20, false}, Guard::kAfter, margin);
         }
-    }
+    });
 }
 
 TEST(FillPixels, OfNothingWritesNothing) {
     uint8_t bytes[4] = {1, 2, 3, 4};
     const std::vector<uint8_t> pixel = {9, 9, 9, 9};
-    EXPECT_EQ(Fill(Target::plain, pixel, bytes, 0, {0, 5, 0, false}), 0);
-    EXPECT_EQ(Fill(Target::plain, pixel, bytes, 4, {5, 0, 0, false}), 0);
-    EXPECT_EQ(Fill(Target::plain, pixel, bytes, 20, {5, 0, 0, false}), 0);
+    EXPECT_EQ(Fill(pixel, bytes, 0, {0, 5, 0, false}), 0);
+    EXPECT_EQ(Fill(pixel, bytes, 4, {5, 0, 0, false}), 0);
+    EXPECT_EQ(Fill(pixel, bytes, 20, {5, 0, 0, false}), 0);
     EXPECT_EQ(bytes[0], 1);
 }
 

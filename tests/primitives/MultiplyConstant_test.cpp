@@ -2,10 +2,9 @@
 
 #include "primitives/MultiplyConstant.h"
 
-#include "primitives/Targets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
-#include "support/TargetScope.h"
+#include "support/Targets.h"
 
 #include <algorithm>
 #include <cmath>
@@ -34,22 +33,20 @@ TEST(MultiplyConstant, GivesWhatIsWorkedOutByHand) {
     const uint8_t source[8] = {0, 1, 3, 255, 128, 2, 5, 254}, value[4] = {255, 128, 128, 2};
     const std::vector<uint8_t> scaled = {0, 0, 2, 2, 128, 1, 2, 2}; // 128 / 256 and 1.5 and 2.5 are ties
     const std::vector<uint8_t> unscaled = {0, 128, 255, 255, 255, 255, 255, 255};
-    for (const Target target : TargetsOfThisProcessor()) {
-        const TargetScope scope(target);
+    AtEveryTarget([&] {
         std::vector<uint8_t> result(8);
         const auto multiply = [&](int32_t scale) {
             return MultiplyConstant(source, 8, value, result.data(), 8, 2, 1, scale);
         };
         ASSERT_EQ(multiply(8), 0);
-        EXPECT_EQ(result, scaled) << TargetName(target);
+        EXPECT_EQ(result, scaled);
         ASSERT_EQ(multiply(0), 0);
-        EXPECT_EQ(result, unscaled) << TargetName(target);
-    }
+        EXPECT_EQ(result, unscaled);
+    });
 }
 
 TEST(MultiplyConstant, IsExactForEveryCodeConstantAndScale) {
-    for (const Target target : TargetsOfThisProcessor()) {
-        const TargetScope scope(target);
+    AtEveryTarget([&] {
         for (const int32_t scale : kScales) {
             for (int32_t constant = 0; constant < 256; ++constant) {
                 uint8_t value[4];
@@ -60,18 +57,16 @@ TEST(MultiplyConstant, IsExactForEveryCodeConstantAndScale) {
                     expected[static_cast<size_t>(i)] = Expected(i / 4, value[i % 4], scale);
                 }
                 MultiplyConstant(pixels.data(), 1024, value, pixels.data(), 1024, 256, 1, scale);
-                ASSERT_EQ(pixels, expected)
-                    << TargetName(target) << ", constant " << constant << ", scale " << scale;
+                ASSERT_EQ(pixels, expected) << "constant " << constant << ", scale " << scale;
             }
         }
-    }
+    });
 }
 
 TEST(MultiplyConstant, TouchesExactlyItsPixels) {
     Random random(41);
     const uint8_t value[4] = {200, 100, 50, 25};
-    for (const Target target : TargetsOfThisProcessor()) {
-        const TargetScope scope(target);
+    AtEveryTarget([&] {
         for (size_t width = 0; width <= 70; ++width) {
             for (const Placement place :
                  {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
@@ -85,7 +80,7 @@ TEST(MultiplyConstant, TouchesExactlyItsPixels) {
                 ASSERT_TRUE(result.MarginsIntact());
             }
         }
-    }
+    });
 }
 
 TEST(MultiplyConstant, WalksRowsOfEitherStep) {

@@ -2,9 +2,9 @@
 
 #include "primitives/VectorMath.h"
 
-#include "primitives/Targets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 

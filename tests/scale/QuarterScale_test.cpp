@@ -1,12 +1,12 @@
 // Quarter-resolution scaling: which samples are taken, how many are written, and what stays.
 
-#include "scale/Plane.h"
 #include "scale/QuarterScaleKernels.h"
 
 #include "frame/Capabilities.h"
-#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
+#include "support/GuardedImage.h"
 #include "support/RowBuffer.h"
+#include "support/Targets.h"
 
 #include <PixelKiln/QuarterScale.h>
 
@@ -19,7 +19,7 @@ using namespace PKTest;
 
 namespace {
 
-using Planes = std::array<std::unique_ptr<Plane>, 3>;
+using Planes = std::array<std::unique_ptr<GuardedImage>, 3>;
 
 /// What a call is given of planes.
 struct Arguments {
@@ -29,7 +29,7 @@ struct Arguments {
 
     explicit Arguments(const Planes& image) {
         for (size_t i = 0; i < 3; ++i) {
-            source[i] = planes[i] = image[i]->First();
+            source[i] = planes[i] = image[i]->Pixels();
             rowBytes[i] = image[i]->RowBytes();
         }
     }
@@ -43,8 +43,9 @@ Planes MakePlanes(Extent luma, Extent chroma, Random& random) {
     Planes planes;
     for (size_t i = 0; i < 3; ++i) {
         const Extent& extent = i == 0 ? luma : chroma;
-        planes[i] =
-            std::make_unique<Plane>(extent.width, extent.rows, random.Below(3) * 5, random.Below(2) != 0);
+        const ImageShape shape = {extent.width, static_cast<int32_t>(extent.rows), random.Below(3) * 5,
+                                  random.Below(2) != 0};
+        planes[i] = std::make_unique<GuardedImage>(shape, random);
     }
     return planes;
 }
@@ -66,7 +67,6 @@ void CheckReduction(size_t width, size_t height, int32_t field, bool sse2, Rando
     const size_t chromaRows = height / 4 == 0 ? 0 : height / 4 * 2 - 1;
     const Planes source = MakePlanes({2 * luma, lumaRows}, {2 * chroma, chromaRows}, random);
     const Planes destination = MakePlanes({luma + 3, height / 2}, {chroma + 3, height / 4}, random);
-    for (const auto& plane : source) plane->FillRandom(random);
 
     const Arguments from(source), to(destination);
     ASSERT_EQ(PK_QuarterScalePlanar420_8u(from.source, from.rowBytes, to.planes, to.rowBytes,
@@ -75,14 +75,12 @@ void CheckReduction(size_t width, size_t height, int32_t field, bool sse2, Rando
     for (size_t i = 0; i < 3; ++i) {
         const size_t samples = i == 0 ? luma : chroma, rows = i == 0 ? height / 2 : height / 4;
         const size_t firstRow = i == 0 && field == 2 ? 1 : 0;
-        ASSERT_TRUE(destination[i]->PaddingIntact()) << "plane " << i;
+        std::vector<std::vector<uint8_t>> expected(rows);
         for (size_t row = 0; row < rows; ++row)
-            for (size_t column = 0; column < samples + 3; ++column) {
-                const int expected =
-                    column < samples ? source[i]->At(2 * row + firstRow, 2 * column) : Plane::kFill;
-                ASSERT_EQ(destination[i]->At(row, column), expected)
-                    << "plane " << i << ", row " << row << ", column " << column;
-            }
+            for (size_t column = 0; column < samples; ++column)
+                expected[row].push_back(source[i]->Row(static_cast<int32_t>(2 * row + firstRow))[2 * column]);
+        SCOPED_TRACE(testing::Message() << "plane " << i);
+        ASSERT_NO_FATAL_FAILURE(destination[i]->ExpectRows(expected));
     }
 }
 
@@ -92,27 +90,27 @@ void CheckPacking(size_t width, size_t height, bool yuyv, int32_t field, Random&
     const size_t pairs = (width + 1) / 2, rows = height / 2;
     const size_t lumaRows = rows == 0 ? 0 : 2 * rows - (field == 2 ? 0 : 1);
     const Planes source = MakePlanes({width, lumaRows}, {pairs, rows}, random);
-    for (const auto& plane : source) plane->FillRandom(random);
-    const Plane packed(4 * pairs, rows, random.Below(2) * 7, random.Below(2) != 0);
+    const GuardedImage packed(
+        {4 * pairs, static_cast<int32_t>(rows), random.Below(2) * 7, random.Below(2) != 0}, random);
 
     const Arguments from(source);
-    ASSERT_EQ(PK_QuarterScalePlanar_8uAndConvertTo422_8u(from.source, from.rowBytes, packed.First(),
+    ASSERT_EQ(PK_QuarterScalePlanar_8uAndConvertTo422_8u(from.source, from.rowBytes, packed.Pixels(),
                                                          packed.RowBytes(), static_cast<uint32_t>(width),
                                                          static_cast<uint32_t>(height), yuyv, field),
               PK_Success);
-    ASSERT_TRUE(packed.PaddingIntact());
-    for (size_t row = 0; row < rows; ++row)
+    std::vector<std::vector<uint8_t>> expected(rows);
+    for (size_t row = 0; row < rows; ++row) {
+        const auto place = static_cast<int32_t>(row);
+        const uint8_t* luma = source[0]->Row(2 * place + (field == 2 ? 1 : 0));
         for (size_t k = 0; k < pairs; ++k) {
-            const size_t lumaRow = 2 * row + (field == 2 ? 1 : 0);
-            const uint8_t y0 = source[0]->At(lumaRow, 2 * k);
-            const uint8_t y1 = 2 * k + 1 < width ? source[0]->At(lumaRow, 2 * k + 1) : uint8_t{0};
-            const uint8_t c1 = source[1]->At(row, k), c2 = source[2]->At(row, k);
-            const std::array<uint8_t, 4> expected =
+            const uint8_t y0 = luma[2 * k], y1 = 2 * k + 1 < width ? luma[2 * k + 1] : uint8_t{0};
+            const uint8_t c1 = source[1]->Row(place)[k], c2 = source[2]->Row(place)[k];
+            const std::array<uint8_t, 4> pair =
                 yuyv ? std::array<uint8_t, 4>{y0, c1, y1, c2} : std::array<uint8_t, 4>{c1, y0, c2, y1};
-            std::array<uint8_t, 4> actual;
-            std::copy_n(packed.Row(row) + 4 * k, 4, actual.begin());
-            ASSERT_EQ(actual, expected) << "row " << row << ", pair " << k;
+            expected[row].insert(expected[row].end(), pair.begin(), pair.end());
         }
+    }
+    packed.ExpectRows(expected);
 }
 
 class QuarterScale : public testing::Test {
@@ -124,15 +122,8 @@ protected:
 };
 
 /// Every body that this processor can run, by itself.
-class QuarterScaleBodies : public testing::TestWithParam<int> {
+class QuarterScaleBodies : public TargetTest {
 protected:
-    QuarterScaleBodies() { PK::SetCapabilities(PK::ReadProcessor()); }
-    void SetUp() override {
-        if (!PK::IsEnabled(Target())) GTEST_SKIP() << "not on this processor";
-    }
-    static PK::Target Target() { return static_cast<PK::Target>(GetParam()); }
-
-    FlagScope fFlags;
     Random fRandom{331};
 };
 
@@ -144,7 +135,7 @@ constexpr Placement kPlacements[] = {{Placement::kBeforeGuard},
 } // namespace
 
 TEST_P(QuarterScaleBodies, TakesEveryEvenByte) {
-    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(Target());
+    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(GetParam());
     for (const Placement& place : kPlacements)
         for (size_t count = 0; count <= 300; ++count) {
             SCOPED_TRACE(testing::Message() << count << " bytes " << place << ", seed " << fRandom.Seed());
@@ -157,7 +148,7 @@ TEST_P(QuarterScaleBodies, TakesEveryEvenByte) {
 }
 
 TEST_P(QuarterScaleBodies, InterleavesLumaWithChroma) {
-    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(Target());
+    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(GetParam());
     for (const Placement& place : kPlacements)
         for (size_t pairs = 0; pairs <= 150; ++pairs) {
             SCOPED_TRACE(testing::Message() << pairs << " pairs " << place << ", seed " << fRandom.Seed());
@@ -178,8 +169,7 @@ TEST_P(QuarterScaleBodies, InterleavesLumaWithChroma) {
         }
 }
 
-INSTANTIATE_TEST_SUITE_P(All, QuarterScaleBodies, testing::Range(0, PK::kTargetCount),
-                         [](const auto& body) { return "Target" + std::to_string(body.param); });
+INSTANTIATE_TEST_SUITE_P(Targets, QuarterScaleBodies, EveryTarget(), TargetOf);
 
 TEST_F(QuarterScale, TheSecondFieldTakesLumaRows1And3AndChromaRow0) {
     const uint8_t luma[4][4] = {{1, 2, 3, 4}, {5, 6, 7, 8}, {9, 10, 11, 12}, {13, 14, 15, 16}};

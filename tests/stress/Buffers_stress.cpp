@@ -1,7 +1,10 @@
 // Buffers and blocks of few sizes, so that threads take over what others gave back: nobody may find another's
 // marks in memory of its own.
 
+#include "stress/Calls.h"
 #include "stress/Operation.h"
+
+#include "support/Random.h"
 
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/PixelFormat.h>
@@ -37,8 +40,7 @@ bool TakeAndFree(Allocate allocate, Free free, int32_t width) {
     uint64_t size;
     if (allocate(kFormat, width, kHeight, &base, &pixels, &rowBytes, &size) != PK_Success) return false;
     const uint64_t bytes = static_cast<uint64_t>(rowBytes) * kHeight;
-    const bool isRight = KeepsItsMark(static_cast<uint8_t*>(pixels), bytes) &&
-                         PK_FlipInPlace(pixels, rowBytes, width, kHeight, kFormat) == PK_Success;
+    const bool isRight = KeepsItsMark(static_cast<uint8_t*>(pixels), bytes);
     return free(kFormat, base, size) == PK_Success && isRight;
 }
 
@@ -65,7 +67,21 @@ std::function<bool()> PrepareMemoryBlocks() {
     };
 }
 
+Call Flip(int32_t width, int32_t height, PKTest::Random& random) {
+    constexpr PK_PixelFormat kFormat = PK_PixelFormat_BGRA_4444_8u;
+    return {random.Bytes(static_cast<size_t>(PK_PixelFormatSize(kFormat, width, height))),
+            [=](uint8_t* image) {
+                return PK_FlipInPlace(image, PK_PixelFormatRowBytes(kFormat, width), width, height, kFormat);
+            }};
+}
+
+std::function<bool()> PrepareFlip() {
+    PKTest::Random random(14);
+    return Repeat({Flip(97, 21, random), Flip(70001, 2, random)}); // the second with scratch of the recycler
+}
+
 const Operation sPixelBuffers("pixel-buffers", PreparePixelBuffers);
 const Operation sMemoryBlocks("memory-blocks", PrepareMemoryBlocks);
+const Operation sFlip("flip-in-place", PrepareFlip);
 
 } // namespace

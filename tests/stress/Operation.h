@@ -4,7 +4,7 @@
 //
 // A family is a file X_stress.cpp that registers its operations:
 //
-//     std::function<bool()> PrepareRotate() { ... }
+//     std::function<bool()> PrepareRotate() { return Repeat({...}); } // Calls.h
 //     const Operation sRotate("rotate", PrepareRotate);
 //
 // The library is started before the first is prepared.

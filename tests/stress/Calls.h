@@ -1,0 +1,22 @@
+#pragma once
+
+// Calls that each write one block of memory: every thread must get what one thread got beforehand.
+
+#include <PixelKiln/Types.h>
+
+#include <cstdint>
+#include <functional>
+#include <vector>
+
+namespace PKStress {
+
+struct Call {
+    std::vector<uint8_t> before; ///< what the block holds; the source, where the call works in place
+    std::function<PK_Result(uint8_t* block)> write;
+};
+
+/// Makes all calls once, and gives what makes them again, each in a block of its own, and compares. A call that
+/// fails the first time or changes nothing is wrong in every run.
+std::function<bool()> Repeat(const std::vector<Call>& calls);
+
+} // namespace PKStress

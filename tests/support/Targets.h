@@ -1,0 +1,75 @@
+#pragma once
+
+// The instruction sets that this processor has and the library offers, and the ways to test the bodies of each.
+
+#include "support/FlagScope.h"
+
+#include "frame/Capabilities.h"
+#include "primitives/Dispatch.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+namespace PKTest {
+
+inline std::vector<PK::Target> FindTargets() {
+    const FlagScope flags;
+    FlagScope::ClearAll();
+    PK::SetCapabilities(PK::ReadProcessor());
+    std::vector<PK::Target> targets;
+    for (int i = 0; i < PK::kTargetCount; ++i)
+        if (PK::IsEnabled(static_cast<PK::Target>(i))) targets.push_back(static_cast<PK::Target>(i));
+    return targets;
+}
+
+inline const std::vector<PK::Target>& TargetsOfThisProcessor() {
+    static const std::vector<PK::Target> targets = FindTargets();
+    return targets;
+}
+
+/// Lets the library choose the bodies of one instruction set until the end of the scope.
+class TargetScope {
+public:
+    /// The processor must have the instruction set.
+    explicit TargetScope(PK::Target target) {
+        using namespace PK;
+        uint8_t* const flags[kTargetCount - 1] = {&sCPUHasSSE2, &sCPUHasSSSE3, &sCPUHasSSE4, &sCPUHasAVX2,
+                                                  &sCPUHasAVX512};
+        for (int i = 0; i < kTargetCount - 1; ++i) *flags[i] = i < static_cast<int>(target);
+        EXPECT_EQ(BestTarget(), target);
+    }
+
+private:
+    FlagScope fSaved;
+};
+
+/// Runs a check while the library chooses the bodies of one instruction set, for each in turn.
+template <class Check>
+void AtEveryTarget(Check check) {
+    for (const PK::Target target : TargetsOfThisProcessor()) {
+        const TargetScope scope(target);
+        SCOPED_TRACE(PK::TargetName(target));
+        check();
+        if (testing::Test::HasFatalFailure()) return;
+    }
+}
+
+/// Tests that are run at each target: INSTANTIATE_TEST_SUITE_P(Targets, X, EveryTarget(), TargetOf).
+class TargetTest : public testing::TestWithParam<PK::Target> {
+private:
+    const TargetScope fScope{GetParam()};
+};
+
+inline auto EveryTarget() {
+    return testing::ValuesIn(TargetsOfThisProcessor());
+}
+
+inline std::string TargetOf(const testing::TestParamInfo<PK::Target>& test) {
+    std::string name = PK::TargetName(test.param);
+    std::erase_if(name, [](char c) { return c == '.' || c == '-'; });
+    return name;
+}
+
+} // namespace PKTest
