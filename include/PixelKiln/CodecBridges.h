@@ -53,8 +53,8 @@ PK_API PK_Result PK_Convert_DNxHD16u_To_RGB_444_10u(const void* source, void* de
                                                     int32_t height) noexcept;
 
 /// RGB_444_10u to four-word pixels, the inverse of PK_Convert_DNxHD16u_To_RGB_444_10u. Bits 0-5 of the first
-/// three words become 0. The fourth word of each pixel keeps its value; that value may be read and written back, but
-/// for the last pixel.
+/// three words become 0. The fourth word of each pixel is neither read nor written; that of the last pixel need not
+/// be there.
 /// \param source       width x height pixels of RGB_444_10u, without padding.
 /// \param destination  width x height pixels of four 16-bit words, without padding.
 /// \param width        pixels in a row, 0 to 134217727.
