@@ -6,7 +6,6 @@
 #include "convert/ConversionChain.h"
 #include "convert/Image.h"
 #include "convert/RasterFormats.h"
-#include "frame/FloatMode.h"
 #include "frame/RowScratch.h"
 #include "primitives/Dispatch.h"
 
@@ -107,7 +106,6 @@ PK_Result PK_OneBitMaskComposite(const void* first, int32_t firstRowBytes, PK_Pi
                                  const uint8_t* mask, int32_t maskRowBytes, uint8_t maskBitOffset, void* dest,
                                  int32_t destRowBytes, PK_PixelFormat destFormat, int32_t width,
                                  int32_t height, int32_t quality) noexcept {
-    const FloatMode mode;
     return Composite({static_cast<const uint8_t*>(first), firstRowBytes, firstFormat, width, height},
                      {static_cast<const uint8_t*>(second), secondRowBytes, secondFormat, width, height},
                      {mask, maskRowBytes, maskBitOffset & 7},

@@ -4,7 +4,6 @@
 
 #include "composite/InkLayers.h"
 #include "composite/SevenSegments.h"
-#include "frame/FloatMode.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -95,7 +94,6 @@ using namespace PK;
 
 PK_Result PK_PrintNum(void* buffer, int32_t rowBytes, PK_PixelFormat format, int32_t width, int32_t height,
                       int32_t number, float size, PK_Point position, bool decimal) noexcept {
-    const FloatMode mode; // the fractions leave no trace in MXCSR
     return PrintNum({static_cast<uint8_t*>(buffer), rowBytes, format, width, height}, number, size, position,
                     decimal);
 }

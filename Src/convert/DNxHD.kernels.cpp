@@ -16,24 +16,18 @@ struct DNxHDToRGB10 : PixelGroup<8, 4> {
     }
 };
 
-/// The pixels of one vector; the fourth words are put back as they were.
-inline void StoreDNxHD(uint8_t* destination, I32 words) {
-    const I32 firstAndSecond =
-        (ShiftLeft<4>(words) & Ints(0xffc0)) | (ShiftLeft<10>(words) & Ints(-0x400000));
-    I32 low, high;
-    InterleaveInBlocks(firstAndSecond, ShiftRight<16>(words) & Ints(0xffc0), low, high);
-    const I32 isSample = PixelInts(-1, 0xffff, -1, 0xffff);
-    StoreBlocksInTurns(destination, Select(isSample, low, Bits(LoadFloatBlocks(destination, 32))),
-                       Select(isSample, high, Bits(LoadFloatBlocks(destination + 16, 32))));
-}
-
-/// The pixels at the end are stored sample by sample: the row may end before the fourth word of the last.
+/// The fourth words are neither read nor written: they may belong to another thread, and that of the last pixel may
+/// lie outside the buffer.
 void RGB10ToDNxHDRow(const void* sourceRow, void* destinationRow, int32_t width) {
     const auto* source = static_cast<const uint8_t*>(sourceRow);
     auto* destination = static_cast<uint8_t*>(destinationRow);
-    for (; width > kLanes; width -= kLanes, source += 4 * kLanes, destination += 8 * kLanes)
-        StoreDNxHD(destination, LoadInts(source));
-    for (int32_t i = 0; i < width; ++i, source += 4, destination += 8) {
+    for (; width >= kLanes; width -= kLanes, source += 4 * kLanes, destination += 8 * kLanes) {
+        const I32 words = LoadInts(source);
+        StoreThreeOfFourHalves(
+            destination, (ShiftLeft<4>(words) & Ints(0xffc0)) | (ShiftLeft<10>(words) & Ints(-0x400000)),
+            ShiftRight<16>(words) & Ints(0xffc0));
+    }
+    for (; width > 0; --width, source += 4, destination += 8) {
         uint32_t word;
         std::memcpy(&word, source, sizeof word);
         const uint32_t firstAndSecond = (word << 4 & 0xffc0) | (word << 10 & 0xffc00000);

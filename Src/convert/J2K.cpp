@@ -1,7 +1,6 @@
 // The bridges to and from a JPEG 2000 codec, but for that of V210.
 
 #include "convert/Bridges.h"
-#include "frame/FloatMode.h"
 #include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
@@ -30,7 +29,6 @@ PK_Result PK_Convert_j2k_UYVY_422_32f_Offset_In_Place(void* buffer, int32_t rowB
                                                       int32_t height) noexcept {
     using namespace PK;
     if (const auto result = ResultWithoutWork(width, height, {buffer})) return *result;
-    const FloatMode mode;
     ConvertRows(Best<J2KKernels>().offsetUYVY32f, {buffer, rowBytes}, {buffer, rowBytes}, width, height);
     return PK_Success;
 }
@@ -39,7 +37,6 @@ PK_Result PK_Convert_j2k_ZYXx_32f_To_BGRX_32f_In_Place(void* buffer, int32_t row
                                                        int32_t height) noexcept {
     using namespace PK;
     if (const auto result = ResultWithoutWork(width, height, {buffer})) return *result;
-    const FloatMode mode;
     ConvertRows(Best<J2KKernels>().zyxToBGR32f, {buffer, rowBytes}, {buffer, rowBytes}, width, height);
     return PK_Success;
 }

@@ -1,7 +1,6 @@
 // The bridges from 10- and 16-bit words to 15-bit samples.
 
 #include "convert/Bridges.h"
-#include "frame/FloatMode.h"
 #include "primitives/CapabilityFlags.h"
 #include "primitives/Dispatch.h"
 
@@ -25,7 +24,6 @@ void PK_ConvertRGB_444_16u_To_XRGB_4444_15u(const void* source, void* destinatio
                                             int32_t height) noexcept {
     using namespace PK;
     if (ResultWithoutWork(width, height, {source, destination})) return;
-    const FloatMode mode;
     const SourceRows topDown(source, ptrdiff_t{6} * width);
     ConvertRows(KernelsFor<Words15uKernels>(TargetOfXRGB()).rgb10WordsToXRGB,
                 {topDown[height - 1], -topDown.rowBytes}, {destination, ptrdiff_t{8} * width}, width, height);

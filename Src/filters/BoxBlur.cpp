@@ -3,7 +3,6 @@
 #include <PixelKiln/BoxBlur.h>
 
 #include "filters/BoxBlurKernels.h"
-#include "frame/FloatMode.h"
 #include "frame/RowScratch.h"
 #include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
@@ -164,7 +163,6 @@ void PK_BoxBlur(int32_t passCount, double* radii, int32_t flags, void* scratch, 
     using namespace PK;
     if (passCount < 1 || !radii || !scratch || !image) return;
     if (width < kSmallestSide || height < kSmallestSide) return;
-    const FloatMode mode; // comparing with NaN leaves a trace too
     const double limit = std::min(width, height) - 3;
     const std::span<double> all(radii, static_cast<size_t>(passCount));
     for (double& radius : all)

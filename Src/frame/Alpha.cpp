@@ -1,6 +1,5 @@
 // Alpha of whole images: set, inverted, or replaced in a copy.
 
-#include "frame/FloatMode.h"
 #include "frame/PixelFormat.h"
 #include "primitives/Channels.h"
 #include "primitives/Dispatch.h"
@@ -50,9 +49,8 @@ PK_Result RunRows(const Rows& rows, ChannelRow row, const ChannelPattern& patter
     return PK_Success;
 }
 
-/// nearest(full x alpha), limited to 0 to full; NaN gives 0. Not inlined, so that the arithmetic stays within
-/// the scope of the floating-point mode.
-[[gnu::noinline]] int32_t AlphaCode(float alpha, int32_t full) {
+/// nearest(full x alpha), limited to 0 to full; NaN gives 0.
+int32_t AlphaCode(float alpha, int32_t full) {
     const float limit = static_cast<float>(full);
     const float code = limit * alpha;
     if (!(code > 0)) return 0;
@@ -153,7 +151,6 @@ PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void* desti
     if (!HasFourChannels(format) || !inversion) return PK_ErrBadSrcFormat;
     if (width < 0 || height < 0) return PK_ErrFailed;
     if (width == 0 || height == 0) return PK_Success;
-    const FloatMode mode;
     return RunRows({source, sourceRowBytes, destination, destinationRowBytes, format, width, height},
                    inversion->row, inversion->pattern);
 }
@@ -161,7 +158,6 @@ PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void* desti
 PK_Result PK_CopyAndSetAlpha(const void* source, int32_t sourceRowBytes, void* destination,
                              int32_t destinationRowBytes, PK_PixelFormat format, int32_t width,
                              int32_t height, float alpha) noexcept {
-    const FloatMode mode;
     const auto pattern = ConstantAlpha(format, alpha);
     if (!HasFourChannels(format) || !pattern) return PK_ErrNotSupported;
     if (width < 1 || height < 1) return PK_Success;

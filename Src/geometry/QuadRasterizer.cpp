@@ -1,5 +1,7 @@
 #include "geometry/QuadRasterizer.h"
 
+#include "geometry/RepeatedSum.h"
+
 #include <algorithm>
 #include <cmath>
 #include <cstddef>
@@ -8,6 +10,10 @@
 namespace PK {
 
 namespace {
+
+/// So many rows are walked one by one, as many as pictures have: edges that meet exactly are then in the order in
+/// which they met, which a leap does not tell.
+constexpr int64_t kShortWay = 1 << 15;
 
 /// The first of the pixels low to high whose centre is not before the position; high + 1 if there is none, or
 /// if the position is no number.
@@ -56,15 +62,25 @@ void QuadRasterizer::Draw(const WarpPolygon& polygon) {
     const int64_t last = LastCentre(fPolygon[order.back()].y, fDestination.top, fDestination.bottom);
 
     size_t taken = 0;
-    for (int64_t row = first; row <= last; ++row) {
+    for (int64_t row = first; row <= last;) {
         // In double precision, so that a row is told from the next however far down it lies.
         const double centre = static_cast<double>(row) + 0.5;
         while (taken < order.size() && fPolygon[order[taken]].y <= centre)
             VisitVertex(order[taken++], centre);
         SortEdges();
-        if (IsRowDrawn(row)) FillRow(row);
-        AdvanceEdges();
+        const bool hasPixels = HasPixels();
+        if (hasPixels && IsRowDrawn(row)) FillRow(row);
+        const int64_t rows = hasPixels ? 1 : RowsToSkip(EndOfEdges(taken, last + 1) - row);
+        AdvanceEdges(rows);
+        row += rows;
     }
+}
+
+/// The first row at which a vertex is visited that has not been taken yet, at most `end`.
+int64_t QuadRasterizer::EndOfEdges(size_t taken, int64_t end) const {
+    if (taken == fSortedVertices.size()) return end;
+    const double row = std::ceil(static_cast<double>(fPolygon[fSortedVertices[taken]].y) - 0.5);
+    return row < static_cast<double>(end) ? static_cast<int64_t>(row) : end;
 }
 
 void QuadRasterizer::SortVertices() {
@@ -113,10 +129,43 @@ void QuadRasterizer::SortEdges() {
             [](const EdgeState& a, const EdgeState& b) { return a.x.value < b.x.value; });
 }
 
-void QuadRasterizer::AdvanceEdges() {
+void QuadRasterizer::AdvanceEdges(int64_t rows) {
     for (int32_t i = 0; i < fActiveCount; ++i)
         for (Slope* slope : {&fActiveEdges[i].x, &fActiveEdges[i].u, &fActiveEdges[i].v, &fActiveEdges[i].a})
-            slope->value += slope->change;
+            slope->value = RepeatedSum(slope->value, slope->change, rows);
+}
+
+/// Whether the scan line in hand has a pixel inside the rectangle, be the row drawn or not.
+bool QuadRasterizer::HasPixels() const {
+    for (int32_t i = 0; i + 1 < fActiveCount; i += 2) {
+        const float left = fActiveEdges[i].x.value, right = fActiveEdges[i + 1].x.value;
+        if (FirstCentre(left, fDestination.left, fDestination.right) <=
+            LastCentre(right, fDestination.left, fDestination.right))
+            return true;
+    }
+    return false;
+}
+
+/// Whether each edge stands between the same centres of the rectangle's columns some rows further on, and so all
+/// the way there: an edge goes in one direction.
+bool QuadRasterizer::PassNoCentre(int64_t rows) const {
+    const int32_t left = fDestination.left, right = fDestination.right;
+    return std::all_of(fActiveEdges.begin(), fActiveEdges.begin() + fActiveCount, [&](const EdgeState& edge) {
+        const float now = edge.x.value, then = RepeatedSum(now, edge.x.change, rows);
+        return FirstCentre(now, left, right) == FirstCentre(then, left, right) &&
+               LastCentre(now, left, right) == LastCentre(then, left, right);
+    });
+}
+
+/// How many of `most` rows to go on from one without pixels to another that may have some. No edge may begin or
+/// end among them. The way is doubled as long as it is right, and then halved.
+int64_t QuadRasterizer::RowsToSkip(int64_t most) const {
+    int64_t rows = 1, step = 1;
+    if (most <= kShortWay) return rows;
+    for (; rows + step <= most && PassNoCentre(rows + step - 1); step *= 2) rows += step;
+    for (step /= 2; step > 0; step /= 2)
+        if (rows + step <= most && PassNoCentre(rows + step - 1)) rows += step;
+    return rows;
 }
 
 bool QuadRasterizer::IsRowDrawn(int64_t row) const {

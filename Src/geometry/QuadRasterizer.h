@@ -6,6 +6,7 @@
 #include "geometry/WarpSpan.h"
 
 #include <array>
+#include <cstddef>
 
 namespace PK {
 
@@ -31,7 +32,8 @@ public:
         : fDestination(destination), fSource(source), fPaint(paint), fFillSpan(fillSpan) {}
 
     /// Draws a polygon, convex or not, crossing itself or not. One with a coordinate that is not finite is not
-    /// drawn. A pixel belongs to it if its centre does.
+    /// drawn. A pixel belongs to it if its centre does. The time goes by the rows that have pixels of it,
+    /// but for some ten thousand.
     void Draw(const WarpPolygon& polygon);
 
 private:
@@ -45,13 +47,17 @@ private:
         Slope x, u, v, a;
     };
 
+    int64_t EndOfEdges(size_t taken, int64_t end) const;
     void SortVertices();
     void VisitVertex(int32_t index, double centre);
     void VisitEdge(int32_t edge, const WarpVertex& other, double centre);
     EdgeState StartEdge(int32_t edge, float centre) const;
     void EndEdge(int32_t edge);
     void SortEdges();
-    void AdvanceEdges();
+    void AdvanceEdges(int64_t rows);
+    bool HasPixels() const;
+    bool PassNoCentre(int64_t rows) const;
+    int64_t RowsToSkip(int64_t most) const;
     bool IsRowDrawn(int64_t row) const;
     void FillRow(int64_t row) const;
     void FillBetween(const EdgeState& left, const EdgeState& right, int64_t row) const;

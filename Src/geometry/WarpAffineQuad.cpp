@@ -25,6 +25,11 @@ bool IsEmpty(const PK_Rect& rect) {
     return rect.right <= rect.left || rect.bottom <= rect.top;
 }
 
+/// Whether a field is the whole frame or one of its two.
+bool HasRows(int32_t field) {
+    return field >= 0 && field <= 2;
+}
+
 /// The corners from the fourth to the first.
 WarpPolygon Corners(const double sourceQuad[8], const double destinationQuad[8]) {
     WarpPolygon corners{};
@@ -152,7 +157,7 @@ PK_Result PK_WarpAffineQuad(const void*, const void*, const void* source, int32_
     if (sourceRect == nullptr || sourceQuad == nullptr || destinationRect == nullptr ||
         destinationQuad == nullptr)
         return PK_ErrFailed;
-    if (IsEmpty(*sourceRect) || IsEmpty(*destinationRect)) return PK_Success;
+    if (IsEmpty(*sourceRect) || IsEmpty(*destinationRect) || !HasRows(field)) return PK_Success;
 
     const bool bilinear = quality > kBestNearestQuality;
     const WarpSource from = MakeSource(source, sourceRowBytes, *sourceRect, ignoreFields ? 0 : field);

@@ -192,7 +192,7 @@ void FuzzNumber(ByteStream& stream, uint32_t state) {
 
 void FuzzOverlay(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
-    const uint32_t state = DrawFloatState(stream);
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     stream.Bool() ? FuzzMask(stream, state) : FuzzNumber(stream, state);
 }
 

@@ -214,7 +214,7 @@ void FuzzPlanes(ByteStream& stream, uint32_t state, Size size) {
 
 void FuzzCodecBridges(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
-    const uint32_t state = DrawFloatState(stream);
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const Size size = DrawSize(stream);
     if (!IsAffordable(size)) return;
     switch (stream.Below(4)) {

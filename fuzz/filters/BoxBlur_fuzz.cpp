@@ -66,7 +66,7 @@ void CheckBytesKept(const std::vector<uint8_t>& before, const std::vector<uint8_
 
 void FuzzBoxBlur(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
-    const uint32_t state = DrawFloatState(stream);
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     Request request;
     request.width = stream.OneIn(16) ? stream.Between(300, 3000) : stream.Between(0, 90);
     request.height = stream.Between(0, 70);

@@ -93,7 +93,7 @@ std::vector<uint8_t> FillRows(ImageMemory& image, ByteStream& stream) {
 
 void FuzzAlpha(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
-    const uint32_t state = DrawFloatState(stream);
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const Request request = DrawRequest(stream);
     const RowsLayout sourceLayout = DrawLayout(stream, request), layout = DrawLayout(stream, request);
     SetCall(WordsOfCall(request, sourceLayout, layout));

@@ -136,7 +136,7 @@ std::vector<uint8_t> Warp(const Request& request, uint32_t state, const Part& so
 
 void FuzzWarp(ByteStream& stream) {
     const Switches switches = DrawSwitches(stream);
-    const uint32_t state = DrawFloatState(stream) | 0x3f; // the sticky bits are the caller's to clear
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const Part source(stream);
     Part destination(stream);
     const Request request(stream, source.rect, destination.rect);

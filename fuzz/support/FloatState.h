@@ -18,6 +18,10 @@ inline uint32_t DrawFloatState(ByteStream& stream) {
     return kMasks | (stream.OneIn(3) ? stream.U32() & (0xe000 | 0x007f) : 0);
 }
 
+/// The exception flags, which are the caller's to clear. Set beforehand, they do not change where an operation leaves
+/// them as its arithmetic sets them.
+inline constexpr uint32_t kExceptionFlags = 0x3f;
+
 /// Makes one call in a state, which the call must leave as it was.
 template <class Function>
 auto CallIn(uint32_t state, Function&& function) {

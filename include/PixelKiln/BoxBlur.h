@@ -32,7 +32,8 @@ enum PK_BoxBlurFlags : int32_t {
 /// never among the whole ones, so that the ends of a line do not mirror each other. A pixel with an empty window
 /// (c = 0 and f = 0) stays as it is. A radius of 0 changes nothing.
 ///
-/// The quotients are exact on every processor.
+/// The quotients are exact on every processor and in every floating-point mode; the exception flags of MXCSR are
+/// left as the arithmetic on radii sets them.
 ///
 /// Does nothing, and looks at no memory, if \p passCount is below 1, a pointer is null, or \p width or \p height
 /// is below 4. Runs on the calling thread; may be called from any number of threads at the same time with different

@@ -16,8 +16,8 @@
 /// PK_Scale16uBufferTo15uSIMD, work in their one buffer.
 ///
 /// Threads: each runs on the calling thread, allocates nothing, and may be called from any number of threads
-/// at the same time on different destinations. PK_Initialize must have been called. MXCSR is on return as it
-/// was; pending x87 exceptions are cleared where floats are computed.
+/// at the same time on different destinations. PK_Initialize must have been called. The floating-point mode
+/// is the caller's, denormals included; the exception flags of MXCSR are left as the arithmetic sets them.
 ///
 /// Words and samples of more than a byte are little-endian.
 
@@ -53,8 +53,8 @@ PK_API PK_Result PK_Convert_DNxHD16u_To_RGB_444_10u(const void* source, void* de
                                                     int32_t height) noexcept;
 
 /// RGB_444_10u to four-word pixels, the inverse of PK_Convert_DNxHD16u_To_RGB_444_10u. Bits 0-5 of the first
-/// three words become 0. The fourth word of each pixel keeps its value; that value may be read and written back, but
-/// for the last pixel.
+/// three words become 0. The fourth word of each pixel is neither read nor written; that of the last pixel need not
+/// be there.
 /// \param source       width x height pixels of RGB_444_10u, without padding.
 /// \param destination  width x height pixels of four 16-bit words, without padding.
 /// \param width        pixels in a row, 0 to 134217727.
@@ -146,8 +146,8 @@ PK_API PK_Result PK_Convert_j2k_UYVY_422_32f_Offset_In_Place(void* buffer, int32
 ///     G = f(-0.969266  X + 1.8760108 Y + 0.041556  Z, 0.41666666)
 ///     R = f( 3.2404542 X - 1.5371385 Y - 0.4985314 Z, 0.41666666)
 ///
-/// in single precision, from left to right. Nothing is limited: negative samples and those above 1 pass.
-/// Results that are no normal numbers become 0.
+/// in single precision, from left to right. Nothing is limited: negative samples and those above 1 pass, and
+/// denormal numbers count.
 /// \param buffer    four floats a pixel: Z, Y, X to B, G, R, and one that stays.
 /// \param rowBytes  bytes from one row to the next.
 /// \param width     pixels in a row, 0 to 134217727.

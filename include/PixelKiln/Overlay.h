@@ -26,8 +26,9 @@ extern "C" {
 /// format itself, with the same first byte and row bytes, and must not overlap them or the mask otherwise.
 ///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on different
-/// destinations. PK_Initialize must have been called. MXCSR is during the call as during PK_Convert, and
-/// restored on return.
+/// destinations. PK_Initialize must have been called. The floating-point mode is the caller's: denormal
+/// results of conversions stay, which PK_Convert makes 0. The exception flags of MXCSR are left as the arithmetic
+/// sets them.
 ///
 /// \param first           first row of the image for set bits.
 /// \param firstRowBytes   bytes from one row of it to the next.
@@ -105,7 +106,7 @@ PK_API PK_Result PK_OneBitMaskComposite(const void* first, int32_t firstRowBytes
 /// Memory: no alignment is asked for. Nothing is written outside the image, whatever the arguments.
 ///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on different
-/// images. MXCSR is restored on return, and pending x87 exceptions are cleared.
+/// images. The exception flags of MXCSR are left as the arithmetic sets them.
 ///
 /// \param buffer    first row of the image, or first byte of the block of planes.
 /// \param rowBytes  bytes from one row to the next, of either sign; ignored for 4:2:0.

@@ -52,6 +52,9 @@ extern "C" {
 /// Nothing outside the rectangles is read or written. Source and destination must not overlap. Nothing is
 /// allocated.
 ///
+/// Time: goes by the pixels of the quadrilateral and the rows that have some, and by no more than some ten thousand
+/// other rows, however far it and the rectangle reach.
+///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on
 /// different destinations. PK_Initialize must have been called for the vector bodies to be chosen; results do
 /// not depend on them.

@@ -6,7 +6,8 @@
 /// Images are a first row and row bytes of either sign; rows are walked in the buffers' own order, whatever
 /// the origin of the format, and no byte outside their pixels is touched. No alignment is asked for. All
 /// functions run on the calling thread and may be called from any number of threads at the same time on
-/// different destinations. The caller's rounding mode and MXCSR are as before on return.
+/// different destinations. The floating-point mode is the caller's, denormals included, unless a function says
+/// otherwise; the exception flags of MXCSR are left as the arithmetic sets them.
 
 #include <PixelKiln/PixelFormat.h>
 

@@ -5,6 +5,7 @@
 #include "frame/Capabilities.h"
 #include "frame/PixelFormat.h"
 #include "support/FlagScope.h"
+#include "support/FloatEnvironment.h"
 #include "support/RowBuffer.h"
 #include "support/Samples.h"
 #include "support/Targets.h"
@@ -15,7 +16,6 @@
 #include <gtest/gtest.h>
 
 #include <vector>
-#include <xmmintrin.h>
 
 using namespace PKTest;
 
@@ -203,19 +203,21 @@ TEST_F(OneBitMaskComposite, ConvertsRowsTooLongForTheStack) {
         ASSERT_EQ(out[i], (BitOf(mask.data(), i / 16) ? firstRow : secondRow)[i]) << i;
 }
 
-TEST_F(OneBitMaskComposite, LeavesMXCSRAsItWas) {
-    const float first[4] = {0.1f, 1e-39f, 0.3f, 0.7f};
-    uint8_t second[4] = {1, 2, 3, 4}, mask = 0x80, out[4] = {};
-    const uint32_t before = _mm_getcsr();
-    const uint32_t state = (before & ~0x3fu) | 0x4000; // no sticky bits, rounding up
-    _mm_setcsr(state);
-    const PK_Result result = PK_OneBitMaskComposite(first, 16, PK_PixelFormat_BGRA_4444_32f, second, 4,
-                                                    PK_PixelFormat_BGRA_4444_8u, &mask, 1, 0, out, 4,
-                                                    PK_PixelFormat_BGRA_4444_8u, 1, 1, 4);
-    const uint32_t after = _mm_getcsr();
-    _mm_setcsr(before);
-    EXPECT_EQ(result, PK_Success);
-    EXPECT_EQ(after, state);
+// 0.5 x 1e-38 = 5e-39 is denormal.
+TEST_F(OneBitMaskComposite, ConvertsInTheFloatingPointModeOfTheCaller) {
+    const float first[4] = {1e-38f, 0.25f, 0.3f, 0.5f}, second[4] = {};
+    const uint8_t mask = 0x80;
+    for (const uint32_t mode : {0u, kFlushToZero}) {
+        float out[4] = {};
+        const FloatEnvironment environment(mode | kExceptionFlags);
+        ASSERT_EQ(PK_OneBitMaskComposite(first, 16, PK_PixelFormat_BGRA_4444_32f, second, 16,
+                                         PK_PixelFormat_BGRP_4444_32f, &mask, 1, 0, out, 16,
+                                         PK_PixelFormat_BGRP_4444_32f, 1, 1, 4),
+                  PK_Success);
+        EXPECT_TRUE(environment.IsAsGiven());
+        EXPECT_EQ(out[0], mode == 0 ? 0.5e-38f : 0.0f);
+        EXPECT_EQ(out[1], 0.125f);
+    }
 }
 
 TEST_F(OneBitMaskComposite, RefusesFormats) {

@@ -242,11 +242,20 @@ TEST(CopyAndSetAlpha, RoundsAsTheCallerDoes) {
         uint8_t code;
     } const cases[] = {{kRoundDown, 127}, {kRoundUp, 128}, {kRoundToZero, 127}};
     for (const auto& [mode, code] : cases) {
-        const FloatEnvironment environment(mode);
+        const FloatEnvironment environment(mode | kExceptionFlags);
         PK_CopyAndSetAlpha(source, 4, pixel, 4, PK_PixelFormat_BGRA_4444_8u, 1, 1, 0.5f);
         EXPECT_TRUE(environment.IsAsGiven());
         EXPECT_EQ(pixel[3], code);
     }
+}
+
+// The product with 255 is denormal too, and above 0.
+TEST(CopyAndSetAlpha, DenormalAlphaIsNotNothing) {
+    const uint8_t source[4] = {};
+    uint8_t pixel[4];
+    const FloatEnvironment environment(kRoundUp);
+    PK_CopyAndSetAlpha(source, 4, pixel, 4, PK_PixelFormat_BGRA_4444_8u, 1, 1, 1e-45f);
+    EXPECT_EQ(pixel[3], 1);
 }
 
 TEST(CopyAndSetAlpha, DoesNothingBelowOnePixelAndRefusesNull) {
@@ -262,10 +271,10 @@ TEST(CopyAndSetAlpha, DoesNothingBelowOnePixelAndRefusesNull) {
     EXPECT_EQ(pixel[3], 4);
 }
 
-TEST(Alpha, LeavesTheFloatingPointStateAsItWas) {
+TEST(Alpha, LeavesTheFloatingPointModeAsItWas) {
     float pixel[4] = {1, 2, 3, 0.3f};
     for (const uint32_t bits : {0u, kRoundUp, kFlushToZero | kDenormalsAreZero}) {
-        const FloatEnvironment environment(bits);
+        const FloatEnvironment environment(bits | kExceptionFlags);
         PK_InvertAlpha(pixel, 16, pixel, 16, PK_PixelFormat_BGRA_4444_32f, 1, 1);
         EXPECT_TRUE(environment.IsAsGiven());
         PK_CopyAndSetAlpha(pixel, 16, pixel, 16, PK_PixelFormat_BGRA_4444_8u, 4, 1, 0.3f);

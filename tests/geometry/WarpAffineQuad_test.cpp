@@ -433,6 +433,36 @@ TEST(WarpAffineQuad, RectanglesMayReachToTheLimitsOfTheirNumbers) {
     }
 }
 
+// Two thousand million rows without a pixel to draw: a walk along them would take a minute each time.
+TEST(WarpAffineQuad, RowsWithoutPixelsTakeNoTime) {
+    const Picture ink(1, 1, {1, 2, 3, 255});
+    constexpr double kTop = INT32_MIN, kBottom = INT32_MAX;
+    constexpr PK_Rect kRect = {0, 0, 8, INT32_MAX};
+    const Quad quads[] = {
+        Box(-3000, kTop, -2000, kBottom),                     // beside the rectangle
+        Box(1e9, kTop, 2e9, kBottom),                         // on the other side
+        Box(2.6, kTop, 3.4, kBottom),                         // between two centres
+        {3, kTop, 3, kTop, 3, kBottom, 3, kBottom},           // of no width
+        {-1e9, kTop, -1e9, kTop, -1, kBottom, -2e9, kBottom}, // coming nearer
+        {-9, kTop, -1e9, kBottom, -100, 0, -99, kTop},        // crossing itself
+        {4, -1e9, 1e9, kBottom, 4, -9e8, -1e9, kBottom},      // an arm on either side
+    };
+    for (const Quad& quad : quads)
+        for (const float feather : {0.0f, 0.125f})
+            for (const int32_t field : {0, 1, 2}) {
+                Picture to(8, 1, kPaper);
+                EXPECT_EQ(Warp(ink, ink.Rect(), Box(0, 0, 1, 1), to, kRect, quad,
+                               {.field = field, .feather = feather}),
+                          PK_Success);
+                EXPECT_TRUE(Untouched(to, kPaper));
+            }
+    // A field that there is not has no row to draw.
+    Picture to(8, 1, kPaper);
+    EXPECT_EQ(Warp(ink, ink.Rect(), Box(0, 0, 1, 1), to, kRect, Box(0, kTop, 8, kBottom), {.field = -1}),
+              PK_Success);
+    EXPECT_TRUE(Untouched(to, kPaper));
+}
+
 TEST(WarpAffineQuad, RoundsByTheModeOfTheCallerAndLeavesIt) {
     const Picture chart = Chart(4, 4);
     const int mode = std::fegetround();

@@ -145,6 +145,36 @@ TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
     }
 }
 
+/// Strips of less than a pixel, which are between two columns for thousands of rows and then in one.
+TEST(WarpSpan, DrawsFarDownAsTheRestatement) {
+    constexpr PK_Rect kRect = {0, -40000, 3, 160000};
+    Random random(55);
+    const uint8_t source[4] = {1, 2, 3, 4};
+    const Area destination(kRect, 3, Guard::kAfter, random);
+    const std::vector<uint8_t> before = destination.Copy();
+    for (int32_t round = 0; round < 12; ++round) {
+        QuadWarp warp;
+        warp.source = source;
+        warp.sourceRowBytes = 4;
+        warp.sourceRect = {0, 0, 1, 1};
+        warp.destination = destination.Origin();
+        warp.destinationRowBytes = 12;
+        warp.destinationRect = kRect;
+        const double top = Between(random, -400, 80) / 173.0, bottom = Between(random, 440, 800) / 173.0;
+        const double width = Between(random, 10, 100) / 173.0;
+        const double quad[8] = {top, -5e4, top + width, -5e4, bottom + width, 2e5, bottom, 1.5e5};
+        std::copy_n(quad, 8, warp.destinationQuad);
+        warp.field = Between(random, 0, 2);
+        destination.Restore(before);
+        DrawQuadWarp(warp);
+        const std::vector<uint8_t> expected = destination.Copy();
+        ASSERT_TRUE(expected != before);
+        destination.Restore(before);
+        ASSERT_EQ(Call(warp), PK_Success);
+        ASSERT_TRUE(destination.Copy() == expected) << "round " << round << ", seed " << random.Seed();
+    }
+}
+
 /// Every alpha over every alpha, as one row of pixels.
 TEST(WarpSpan, EveryBodyMixesAsTheRestatement) {
     constexpr int32_t kWidth = 65536;

@@ -10,6 +10,7 @@ namespace PKTest {
 inline constexpr uint32_t kDefaultMXCSR = 0x1f80;
 inline constexpr uint32_t kRoundDown = 0x2000, kRoundUp = 0x4000, kRoundToZero = 0x6000;
 inline constexpr uint32_t kFlushToZero = 0x8000, kDenormalsAreZero = 0x0040;
+inline constexpr uint32_t kExceptionFlags = 0x003f; // set beforehand, they stay as given
 
 class FloatEnvironment {
 public:

@@ -287,6 +287,27 @@ inline void StoreSixes(void* destination, I32 low, I32 high) {
     _mm_storel_epi64(reinterpret_cast<__m128i*>(bytes + 16), _mm256_castsi256_si128(high.v));
     _mm_storel_epi64(reinterpret_cast<__m128i*>(bytes + 40), _mm256_extracti128_si256(high.v, 1));
 }
+/// Three 16-bit halves: lane kLane of `pair` and the lower half of that of `third`.
+template <int kLane>
+inline void StoreThreeHalves(uint8_t* destination, I32 pair, I32 third) {
+    const int32_t firstAndSecond = _mm256_extract_epi32(pair.v, kLane);
+    const auto half = static_cast<uint16_t>(_mm256_extract_epi16(third.v, 2 * kLane));
+    std::memcpy(destination, &firstAndSecond, sizeof firstAndSecond);
+    std::memcpy(destination + 4, &half, sizeof half);
+}
+/// Groups of four 16-bit halves, one for each lane: two halves of `pair` and the lower half of `third`. The fourth of
+/// each group is neither read nor written.
+inline void StoreThreeOfFourHalves(void* destination, I32 pair, I32 third) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    StoreThreeHalves<0>(bytes, pair, third);
+    StoreThreeHalves<1>(bytes + 8, pair, third);
+    StoreThreeHalves<2>(bytes + 16, pair, third);
+    StoreThreeHalves<3>(bytes + 24, pair, third);
+    StoreThreeHalves<4>(bytes + 32, pair, third);
+    StoreThreeHalves<5>(bytes + 40, pair, third);
+    StoreThreeHalves<6>(bytes + 48, pair, third);
+    StoreThreeHalves<7>(bytes + 56, pair, third);
+}
 
 /// The 16 bits that start at each of eight byte offsets in a block.
 template <int k0, int k1, int k2, int k3, int k4, int k5, int k6, int k7>

@@ -519,6 +519,16 @@ inline void StoreSixes(void* destination, I32 low, I32 high) {
     _mm256_storeu_si256(reinterpret_cast<__m256i*>(bytes + 64),
                         _mm512_castsi512_si256(_mm512_permutex2var_epi32(low.v, rest, high.v)));
 }
+/// Groups of four 16-bit halves, one for each lane: two halves of `pair` and the lower half of `third`. The fourth of
+/// each group is neither read nor written.
+inline void StoreThreeOfFourHalves(void* destination, I32 pair, I32 third) {
+    constexpr __mmask32 kWritten = 0x77777777;
+    const __m512i lower = _mm512_setr_epi32(0, 16, 1, 17, 2, 18, 3, 19, 4, 20, 5, 21, 6, 22, 7, 23);
+    const __m512i upper = _mm512_setr_epi32(8, 24, 9, 25, 10, 26, 11, 27, 12, 28, 13, 29, 14, 30, 15, 31);
+    auto* bytes = static_cast<uint8_t*>(destination);
+    _mm512_mask_storeu_epi16(bytes, kWritten, _mm512_permutex2var_epi32(pair.v, lower, third.v));
+    _mm512_mask_storeu_epi16(bytes + 64, kWritten, _mm512_permutex2var_epi32(pair.v, upper, third.v));
+}
 
 /// The 16 bits that start at each of eight byte offsets in a block.
 template <int k0, int k1, int k2, int k3, int k4, int k5, int k6, int k7>

@@ -535,6 +535,15 @@ inline void StoreSixes(void* destination, I32 low, I32 high) {
     Store(destination, low);
     std::memcpy(static_cast<uint8_t*>(destination) + 16, &high, 8);
 }
+/// Groups of four 16-bit halves, one for each lane: two halves of `pair` and the lower half of `third`. The fourth of
+/// each group is neither read nor written.
+inline void StoreThreeOfFourHalves(void* destination, I32 pair, I32 third) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    for (int i = 0; i < kLanes; ++i) {
+        std::memcpy(bytes + 8 * i, &pair.lane[i], 4);
+        std::memcpy(bytes + 8 * i + 4, &third.lane[i], 2);
+    }
+}
 
 /// The 16 bits that start at each of eight byte offsets in a block.
 template <int... kOffsets>

@@ -501,6 +501,23 @@ inline void StoreSixes(void* destination, I32 low, I32 high) {
     Store(destination, low);
     _mm_storel_epi64(static_cast<__m128i*>(destination) + 1, high.v);
 }
+/// Three 16-bit halves: lane kLane of `pair` and the lower half of that of `third`.
+template <int kLane>
+inline void StoreThreeHalves(uint8_t* destination, __m128i pair, __m128i third) {
+    const int32_t firstAndSecond = _mm_cvtsi128_si32(_mm_shuffle_epi32(pair, kLane));
+    const auto half = static_cast<uint16_t>(_mm_extract_epi16(third, 2 * kLane));
+    std::memcpy(destination, &firstAndSecond, sizeof firstAndSecond);
+    std::memcpy(destination + 4, &half, sizeof half);
+}
+/// Groups of four 16-bit halves, one for each lane: two halves of `pair` and the lower half of `third`. The fourth of
+/// each group is neither read nor written.
+inline void StoreThreeOfFourHalves(void* destination, I32 pair, I32 third) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    StoreThreeHalves<0>(bytes, pair.v, third.v);
+    StoreThreeHalves<1>(bytes + 8, pair.v, third.v);
+    StoreThreeHalves<2>(bytes + 16, pair.v, third.v);
+    StoreThreeHalves<3>(bytes + 24, pair.v, third.v);
+}
 
 /// The 16 bits that start at each of eight byte offsets in a block.
 template <int k0, int k1, int k2, int k3, int k4, int k5, int k6, int k7>
