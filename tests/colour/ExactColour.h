@@ -55,7 +55,7 @@ inline Triple HLGSceneLight(const Triple& display) {
 /// Row by row.
 using Matrix = std::array<double, 9>;
 
-inline Triple Multiply(const Matrix& m, const Triple& v) {
+inline Triple Apply(const Matrix& m, const Triple& v) {
     return {m[0] * v[0] + m[1] * v[1] + m[2] * v[2], m[3] * v[0] + m[4] * v[1] + m[5] * v[2],
             m[6] * v[0] + m[7] * v[1] + m[8] * v[2]};
 }
@@ -100,7 +100,7 @@ inline Matrix ToXYZ(const Gamut& gamut) {
     Matrix m{};
     for (size_t i = 0; i < 3; ++i)
         for (size_t row = 0; row < 3; ++row) m[3 * row + i] = XYZ(gamut, i)[row];
-    const Triple scale = Multiply(Inverse(m), XYZ(gamut, 3));
+    const Triple scale = Apply(Inverse(m), XYZ(gamut, 3));
     for (size_t i = 0; i < 9; ++i) m[i] *= scale[i % 3];
     return m;
 }
