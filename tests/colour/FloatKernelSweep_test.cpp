@@ -26,6 +26,8 @@ constexpr float kFrom2020[9] = {1.6605000f,  -0.5876570f, -0.0728399f, -0.124547
                                 -0.0083480f, -0.0181537f, -0.1005970f, 1.1187500f};
 /// Sums that leave the floats, cancel to nothing, and leave a channel at zero.
 constexpr float kExtreme[9] = {3e38f, -3e38f, 3e38f, 1, -1, 0, 0, 0, -0.0f};
+/// Leaves a channel of exactly 1 as it is, for the clip.
+constexpr float kIdentity[9] = {1, 0, 0, 0, 1, 0, 0, 0, 1};
 constexpr float kLuma[3] = {0.2126f, 0.7152f, 0.0722f};
 
 /// A kernel with its arguments, and the same restated.
@@ -106,6 +108,7 @@ const KernelCase kKernelCases[] = {
     GammaCase("GammaFrom2020", 2.4f, 0.41666666f, kFrom2020),
     GammaCase("GammaFrom2020Clipped", 2.4f, 0.41666666f, kFrom2020, true),
     GammaCase("GammaTo2020Clipped", 2.4f, 0.38461539f, kTo2020, true),
+    GammaCase("GammaClipped", 2.4f, 0.41666666f, kIdentity, true),
     GammaCase("GammaExtreme", 2.6f, 0.41666666f, kExtreme),
     GammaCase("GammaExtremeClipped", 2.6f, 0.41666666f, kExtreme, true),
     PQToHubCase("PQToHub", kFrom2020),
