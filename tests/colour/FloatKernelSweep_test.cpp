@@ -1,0 +1,224 @@
+// Every body of the colour spaces' kernels that this processor runs, against the plain one and against a restatement of
+// the steps, pixel by pixel.
+
+#include "colour/ColourKernels.h"
+#include "colour/DecodeTables.h"
+#include "colour/FloatBodies.h"
+#include "support/ColourPixels.h"
+#include "support/RowBuffer.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstring>
+#include <functional>
+#include <ostream>
+
+namespace PKTest {
+namespace {
+
+using namespace PK;
+using reference::Rounding;
+
+constexpr float kTo2020[9] = {0.6274020f, 0.3292920f, 0.0433061f, 0.0690955f, 0.9195440f,
+                              0.0113602f, 0.0163937f, 0.0880281f, 0.8955780f};
+constexpr float kFrom2020[9] = {1.6605000f,  -0.5876570f, -0.0728399f, -0.1245470f, 1.1329000f,
+                                -0.0083480f, -0.0181537f, -0.1005970f, 1.1187500f};
+/// Sums that leave the floats, cancel to nothing, and leave a channel at zero.
+constexpr float kExtreme[9] = {3e38f, -3e38f, 3e38f, 1, -1, 0, 0, 0, -0.0f};
+/// Leaves a channel of exactly 1 as it is, for the clip.
+constexpr float kIdentity[9] = {1, 0, 0, 0, 1, 0, 0, 0, 1};
+constexpr float kLuma[3] = {0.2126f, 0.7152f, 0.0722f};
+
+/// A kernel with its arguments, and the same restated.
+struct KernelCase {
+    const char* name;
+    std::function<void(FloatTarget, const float*, float*, int32_t)> run;
+    std::function<ColourPixel(const ColourPixel&, Rounding)> reference;
+    int64_t units = 0; ///< that the restatement may be off by
+};
+
+std::ostream& operator<<(std::ostream& stream, const KernelCase& kernel) {
+    return stream << kernel.name;
+}
+
+KernelCase GammaCase(const char* name, float in, float out, const float* matrix = nullptr,
+                     bool clip = false) {
+    const bool needMatrix = matrix != nullptr;
+    const GammaConversion conversion = {in, out, {kLuma[0], kLuma[1], kLuma[2]}, needMatrix, clip};
+    const reference::PowerLaws laws = {in, out, matrix, clip, kLuma};
+    return {name,
+            [=](FloatTarget target, const float* source, float* destination, int32_t count) {
+                KernelsFor<GammaKernels>(target).convert(source, destination, count,
+                                                         needMatrix ? matrix : kTo2020, conversion);
+            },
+            [=](const ColourPixel& pixel, Rounding rounding) {
+                return reference::BulkPowerLaws(pixel, laws, rounding);
+            }};
+}
+
+KernelCase PQToHubCase(const char* name, const float* matrix) {
+    return {name,
+            [=](FloatTarget target, const float* source, float* destination, int32_t count) {
+                KernelsFor<PQKernels>(target).toRec709(source, destination, count, matrix, PQDecodeTable());
+            },
+            [=](const ColourPixel& pixel, Rounding rounding) {
+                return reference::BulkPQToHub(pixel, matrix, PQDecodeTable(), rounding);
+            }};
+}
+
+KernelCase HubToPQCase(const char* name, const float* matrix, float outScale, int64_t units) {
+    return {name,
+            [=](FloatTarget target, const float* source, float* destination, int32_t count) {
+                KernelsFor<PQKernels>(target).fromRec709(source, destination, count, matrix, outScale);
+            },
+            [=](const ColourPixel& pixel, Rounding rounding) {
+                return reference::BulkHubToPQ(pixel, matrix, outScale, rounding);
+            },
+            units};
+}
+
+KernelCase HLGToHubCase(const char* name, const float* matrix) {
+    return {name,
+            [=](FloatTarget target, const float* source, float* destination, int32_t count) {
+                KernelsFor<HLGKernels>(target).toRec709(source, destination, count, matrix, HLGDecodeTable());
+            },
+            [=](const ColourPixel& pixel, Rounding rounding) {
+                return reference::BulkHLGToHub(pixel, matrix, HLGDecodeTable(), rounding);
+            }};
+}
+
+KernelCase HubToHLGCase(const char* name, const float* matrix) {
+    return {name,
+            [=](FloatTarget target, const float* source, float* destination, int32_t count) {
+                KernelsFor<HLGKernels>(target).fromRec709(source, destination, count, matrix);
+            },
+            [=](const ColourPixel& pixel, Rounding rounding) {
+                return reference::BulkHubToHLG(pixel, matrix, rounding);
+            }};
+}
+
+/// The power at the end of PQ is right to 0.501 units, so that it may be the neighbour of the right one; a factor behind
+/// it makes that up to two units.
+const KernelCase kKernelCases[] = {
+    GammaCase("Gamma22", 2.4f, 1 / 2.2f),
+    GammaCase("GammaSquare", 2, 0.5f),
+    GammaCase("GammaSteep", 30, -7),
+    GammaCase("GammaTo2020", 2.4f, 0.41666666f, kTo2020),
+    GammaCase("GammaFrom2020", 2.4f, 0.41666666f, kFrom2020),
+    GammaCase("GammaFrom2020Clipped", 2.4f, 0.41666666f, kFrom2020, true),
+    GammaCase("GammaTo2020Clipped", 2.4f, 0.38461539f, kTo2020, true),
+    GammaCase("GammaClipped", 2.4f, 0.41666666f, kIdentity, true),
+    GammaCase("GammaExtreme", 2.6f, 0.41666666f, kExtreme),
+    GammaCase("GammaExtremeClipped", 2.6f, 0.41666666f, kExtreme, true),
+    PQToHubCase("PQToHub", kFrom2020),
+    PQToHubCase("PQToHubExtreme", kExtreme),
+    HubToPQCase("HubToPQ", kTo2020, 1, 1),
+    HubToPQCase("HubToPQNormalised", kTo2020, 1.9682022f, 2),
+    HubToPQCase("HubToPQExtreme", kExtreme, 1, 1),
+    HLGToHubCase("HLGToHub", kFrom2020),
+    HLGToHubCase("HLGToHubExtreme", kExtreme),
+    HubToHLGCase("HubToHLG", kTo2020),
+    HubToHLGCase("HubToHLGExtreme", kExtreme),
+};
+
+ColourPixels Converted(const KernelCase& kernel, FloatTarget target, const ColourPixels& source) {
+    ColourPixels result(source.size());
+    kernel.run(target, Floats(source), Floats(result), static_cast<int32_t>(source.size()));
+    return result;
+}
+
+class FloatKernelSweep : public testing::TestWithParam<KernelCase> {};
+
+TEST_P(FloatKernelSweep, BodiesWithoutFusedArithmeticAgreeToTheBit) {
+    const KernelCase& kernel = GetParam();
+    Random random(1);
+    for (const Content content : kAllContents) {
+        const ColourPixels source = MakePixels(content, 20000, random);
+        const ColourPixels plain = Converted(kernel, FloatTarget::plain, source);
+        for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+            if (RoundingOf(target) == Rounding::kFused) continue;
+            const ColourPixels result = Converted(kernel, target, source);
+            if (std::memcmp(plain.data(), result.data(), 16 * plain.size()) == 0) continue;
+            FAIL() << FloatTargetName(target) << ", " << ContentName(content) << ", seed " << random.Seed()
+                   << '\n'
+                   << FirstDifference(source, plain, result);
+        }
+    }
+}
+
+TEST_P(FloatKernelSweep, BodiesDoTheStatedSteps) {
+    const KernelCase& kernel = GetParam();
+    Random random(2);
+    for (const Content content : kAllContents) {
+        const ColourPixels source = MakePixels(content, 8000, random);
+        for (const Rounding rounding : {Rounding::kEach, Rounding::kFused}) {
+            ColourPixels expected;
+            for (const ColourPixel& pixel : source) expected.push_back(kernel.reference(pixel, rounding));
+            for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+                if (RoundingOf(target) != rounding) continue;
+                const ColourPixels actual = Converted(kernel, target, source);
+                ASSERT_EQ(FirstDifference(source, expected, actual, kernel.units), "")
+                    << FloatTargetName(target) << ", " << ContentName(content) << ", seed " << random.Seed();
+            }
+        }
+    }
+}
+
+TEST_P(FloatKernelSweep, NoPixelDependsOnItsPlace) {
+    const KernelCase& kernel = GetParam();
+    Random random(3);
+    ColourPixels source;
+    for (const Content content : kAllContents)
+        for (const ColourPixel& pixel : MakePixels(content, 64, random)) source.push_back(pixel);
+    std::shuffle(source.begin(), source.end(), std::mt19937_64(random.Seed()));
+    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+        const ColourPixels result = Converted(kernel, target, source);
+        for (ptrdiff_t shift = 1; shift < 8; ++shift) {
+            ColourPixels rotated = source, expected = result;
+            std::rotate(rotated.begin(), rotated.begin() + shift, rotated.end());
+            std::rotate(expected.begin(), expected.begin() + shift, expected.end());
+            const ColourPixels actual = Converted(kernel, target, rotated);
+            ASSERT_EQ(std::memcmp(actual.data(), expected.data(), 16 * actual.size()), 0)
+                << FloatTargetName(target) << ", moved by " << shift << ", seed " << random.Seed() << '\n'
+                << FirstDifference(rotated, expected, actual);
+        }
+    }
+}
+
+TEST_P(FloatKernelSweep, StaysInItsRowsAtAnyPlaceAndInPlace) {
+    const KernelCase& kernel = GetParam();
+    Random random(4);
+    const Placement places[] = {{Placement::kBeforeGuard},
+                                {Placement::kAfterGuard},
+                                {Placement::kAtOffset, 4},
+                                {Placement::kAtOffset, 16},
+                                {Placement::kAtOffset, 36}};
+    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+        for (int32_t count = 0; count <= 40; count += 8) {
+            const ColourPixels pixels = MakePixels(Content::kWide, static_cast<size_t>(count), random);
+            const ColourPixels expected = Converted(kernel, target, pixels);
+            const size_t bytes = 16 * pixels.size();
+            for (const Placement place : places) {
+                RowBuffer source(bytes, place), destination(bytes, place);
+                std::copy_n(Floats(pixels), 4 * count, reinterpret_cast<float*>(source.Data()));
+                const auto* from = reinterpret_cast<const float*>(source.Data());
+                kernel.run(target, from, reinterpret_cast<float*>(destination.Data()), count);
+                ASSERT_TRUE(destination.MarginsIntact()) << FloatTargetName(target) << ", " << place;
+                ASSERT_EQ(std::memcmp(destination.Data(), expected.data(), bytes), 0)
+                    << FloatTargetName(target) << ", " << count << " pixels " << place;
+                ASSERT_EQ(std::memcmp(source.Data(), pixels.data(), bytes), 0) << "the source was written";
+
+                kernel.run(target, from, reinterpret_cast<float*>(source.Data()), count);
+                ASSERT_TRUE(source.MarginsIntact()) << FloatTargetName(target) << ", in place " << place;
+                ASSERT_EQ(std::memcmp(source.Data(), expected.data(), bytes), 0)
+                    << FloatTargetName(target) << ", " << count << " pixels in place " << place;
+            }
+        }
+}
+
+INSTANTIATE_TEST_SUITE_P(, FloatKernelSweep, testing::ValuesIn(kKernelCases),
+                         [](const auto& test) { return test.param.name; });
+
+} // namespace
+} // namespace PKTest
