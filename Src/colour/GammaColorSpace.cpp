@@ -2,6 +2,15 @@
 
 namespace PK {
 
+namespace {
+
+/// As SignedPower but for -0, which counts as not negative and keeps its sign in odd powers.
+float Power(float v, float exponent) {
+    return v == 0 ? std::pow(std::copysign(0.0f, v), exponent) : SignedPower(v, exponent);
+}
+
+} // namespace
+
 GammaColorSpace::GammaColorSpace(float exponent) : gamma(exponent) {}
 GammaColorSpace::GammaColorSpace(const GammaColorSpace& other) = default;
 GammaColorSpace::GammaColorSpace(GammaColorSpace&& other) : GammaColorSpace(other) {}
@@ -11,11 +20,11 @@ GammaColorSpace& GammaColorSpace::operator=(GammaColorSpace&& other) {
 }
 
 float GammaColorSpace::LinearToEOTF(float v) const {
-    return SignedPower(v, gamma);
+    return Power(v, gamma);
 }
 
 float GammaColorSpace::EOTFToLinear(float v) const {
-    return SignedPower(v, 1 / gamma);
+    return Power(v, 1 / gamma);
 }
 
 void GammaColorSpace::ConvertPixelsFromRec709(const float* source, float* destination, int32_t count,

@@ -7,7 +7,9 @@
 namespace PK {
 
 void ConvertGammaPixels(const float* source, float* destination, int32_t count, float inExponent,
-                        float outExponent, const CSMatrix& matrix, bool gamutClip, const float* luma) {
+                        float outExponent, const CSMatrix& matrix, bool gamutClip, const float* weights) {
+    constexpr float kNoWeights[3] = {};
+    const float* luma = weights != nullptr ? weights : kNoWeights;
     const bool needMatrix = !IsIdentity(matrix);
     const int32_t bulk = BulkPixels(count);
     if (bulk > 0) {

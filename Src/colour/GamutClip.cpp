@@ -20,11 +20,11 @@ RGB RaiseToZero(RGB c, const float* luma) {
 }
 
 RGB LowerToOne(RGB c, const float* luma) {
+    if (c.r == c.g && c.g == c.b) return {1, 1, 1}; // a grey has no hue to keep
     const float least = Least(Least(c.r, c.g), c.b);
     const float most = Greatest(Greatest(c.r, c.g), c.b);
     const RGB above = ForChannels(c, [least](float v) { return v - least; });
     const float mostAbove = Greatest(Greatest(above.r, above.g), above.b);
-    if (mostAbove == 0) return {1, 1, 1}; // a grey has no hue to keep
     const float weighted = (luma[0] * above.r + luma[1] * above.g + luma[2] * above.b) / mostAbove;
     const float grey = Least(Greatest(weighted, 0.15f), 0.9f);
     const float scale = (1 - grey) / (most - grey);

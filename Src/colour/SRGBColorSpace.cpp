@@ -36,11 +36,12 @@ const float* SRGBColorSpace::LuminanceCoeffs() const {
 
 // The thresholds look at the value with its sign: negative values are linear throughout.
 float SRGBColorSpace::LinearToEOTF(float v) const {
-    return v > 0.0031308f ? Encode(v) : v * 12.92f;
+    return WithSign(v, [v](float a) { return v > 0.0031308f ? Encode(a) : a * 12.92f; });
 }
 
 float SRGBColorSpace::EOTFToLinear(float v) const {
-    return v > 0.04045f ? std::pow((0.055f + v) / 1.055f, 2.4f) : v / 12.92f;
+    return WithSign(
+        v, [v](float a) { return v > 0.04045f ? std::pow((0.055f + a) / 1.055f, 2.4f) : a / 12.92f; });
 }
 
 void SRGBColorSpace::ConvertPixelsFromRec709(const float* source, float* destination, int32_t count,
