@@ -202,6 +202,18 @@ TEST(CompressPixelsToSDR, NegativePixelsTakeTheChromaticityOfWhite) {
     }
 }
 
+TEST(CompressPixelsToSDR, ColoursBelowAMillionthCountAsBlack) {
+    // X + Y + Z of blue is 1.289 times its linear value. Without a slope all luminances become 1 / 11.
+    const auto compressed = [](float linear) {
+        return Converted({{std::pow(linear, 1 / 2.4f), 0, 0, 1}}, Compress(sRec2020, {1, 0, 0.5f}))[0];
+    };
+    const Pixel below = compressed(7.4e-7f), above = compressed(8e-7f);
+    for (size_t k = 0; k < 3; ++k) EXPECT_NEAR(below[k], 1.0f / 11, 1e-5f) << "white";
+    EXPECT_NEAR(above[0], 1 / (11 * 0.0593), 0.001) << "blue of that luminance";
+    EXPECT_NEAR(above[1], 0.0f, 1e-4f);
+    EXPECT_NEAR(above[2], 0.0f, 1e-4f);
+}
+
 TEST(CompressPixelsToSDR, NothingGuardsAColourWithoutLuminance) {
     class Host : public Rec2020ColorSpace {
     public:
