@@ -10,7 +10,6 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <cstring>
 #include <functional>
 #include <ostream>
 
@@ -139,7 +138,7 @@ TEST_P(FloatKernelSweep, BodiesWithoutFusedArithmeticAgreeToTheBit) {
         for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
             if (RoundingOf(target) == Rounding::kFused) continue;
             const ColourPixels result = Converted(kernel, target, source);
-            if (std::memcmp(plain.data(), result.data(), 16 * plain.size()) == 0) continue;
+            if (Holds(result.data(), plain)) continue;
             FAIL() << FloatTargetName(target) << ", " << ContentName(content) << ", seed " << random.Seed()
                    << '\n'
                    << FirstDifference(source, plain, result);
@@ -179,7 +178,7 @@ TEST_P(FloatKernelSweep, NoPixelDependsOnItsPlace) {
             std::rotate(rotated.begin(), rotated.begin() + shift, rotated.end());
             std::rotate(expected.begin(), expected.begin() + shift, expected.end());
             const ColourPixels actual = Converted(kernel, target, rotated);
-            ASSERT_EQ(std::memcmp(actual.data(), expected.data(), 16 * actual.size()), 0)
+            ASSERT_TRUE(Holds(actual.data(), expected))
                 << FloatTargetName(target) << ", moved by " << shift << ", seed " << random.Seed() << '\n'
                 << FirstDifference(rotated, expected, actual);
         }
@@ -205,13 +204,13 @@ TEST_P(FloatKernelSweep, StaysInItsRowsAtAnyPlaceAndInPlace) {
                 const auto* from = reinterpret_cast<const float*>(source.Data());
                 kernel.run(target, from, reinterpret_cast<float*>(destination.Data()), count);
                 ASSERT_TRUE(destination.MarginsIntact()) << FloatTargetName(target) << ", " << place;
-                ASSERT_EQ(std::memcmp(destination.Data(), expected.data(), bytes), 0)
+                ASSERT_TRUE(Holds(destination.Data(), expected))
                     << FloatTargetName(target) << ", " << count << " pixels " << place;
-                ASSERT_EQ(std::memcmp(source.Data(), pixels.data(), bytes), 0) << "the source was written";
+                ASSERT_TRUE(Holds(source.Data(), pixels)) << "the source was written";
 
                 kernel.run(target, from, reinterpret_cast<float*>(source.Data()), count);
                 ASSERT_TRUE(source.MarginsIntact()) << FloatTargetName(target) << ", in place " << place;
-                ASSERT_EQ(std::memcmp(source.Data(), expected.data(), bytes), 0)
+                ASSERT_TRUE(Holds(source.Data(), expected))
                     << FloatTargetName(target) << ", " << count << " pixels in place " << place;
             }
         }

@@ -150,10 +150,10 @@ ColourPixel SingleClip(ColourPixel c, const float* luma) {
         c = ForColour(c, [=](float v) { return (v - Y) * scale + Y; });
     }
     if (c[0] > 1 || c[1] > 1 || c[2] > 1) {
+        if (c[0] == c[1] && c[1] == c[2]) return {1, 1, 1, c[3]};
         const float least = LeastOf(c), most = MostOf(c);
         const ColourPixel d = ForColour(c, [=](float v) { return v - least; });
         const float dMost = MostOf(d);
-        if (dMost == 0) return {1, 1, 1, c[3]};
         const float weighted = luma[0] * d[2] + luma[1] * d[1] + luma[2] * d[0];
         const float L = Lesser(Greater(weighted / dMost, 0.15f), 0.9f);
         const float k = (1 - L) / (most - L);

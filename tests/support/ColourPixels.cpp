@@ -4,6 +4,7 @@
 #include <bit>
 #include <cmath>
 #include <cstdlib>
+#include <cstring>
 #include <sstream>
 
 namespace PKTest {
@@ -95,6 +96,10 @@ ColourPixels MakePixels(Content content, size_t count, Random& random) {
         pixel[3] = AnyBits(random);
     }
     return pixels;
+}
+
+bool Holds(const void* memory, const ColourPixels& pixels) {
+    return pixels.empty() || std::memcmp(memory, pixels.data(), sizeof(ColourPixel) * pixels.size()) == 0;
 }
 
 int64_t UnitsApart(float a, float b) {

@@ -37,6 +37,9 @@ inline float* Floats(ColourPixels& pixels) {
     return reinterpret_cast<float*>(pixels.data());
 }
 
+/// Whether memory holds just these pixels, to the bit.
+bool Holds(const void* memory, const ColourPixels& pixels);
+
 /// How far two floats are apart, in units of the last place counted through zero: 0 if their bits are the same or both
 /// are not-a-number.
 int64_t UnitsApart(float a, float b);
