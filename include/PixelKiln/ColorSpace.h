@@ -102,7 +102,7 @@ public:
     /// \param destination  B, G, R, A.
     /// \param count        pixels; below 1 does nothing.
     /// \param exposure     factor on linear luminance ahead of the curve.
-    /// \param slope        gain of the curve around its centre; 0 gives infinities and NaN.
+    /// \param slope        gain of the curve around its centre, above 0. With 0 the curve is flat.
     /// \param knee         output level, up to 1, at which the curve leaves the straight line; 1 gives NaN.
     virtual void CompressPixelsToSDR(const float* source, float* destination, int32_t count, float exposure,
                                      float slope, float knee) const = 0;
