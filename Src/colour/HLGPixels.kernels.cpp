@@ -1,9 +1,8 @@
 // The bodies of HLG.
 
-#include "colour/ApproxPower.h"
 #include "colour/ColourKernels.h"
-#include "colour/ColourLanes.h"
 #include "colour/HDRCurves.h"
+#include "colour/HubLanes.h"
 
 namespace PK {
 namespace PK_TARGET {
@@ -11,7 +10,7 @@ namespace {
 
 void ToRec709(const float* source, float* destination, int32_t count, const float* matrix,
               const float* table) {
-    const F32 outExponent = Floats(0.41666666f), ootfExponent = Floats(HLG::kOOTFExponent);
+    const F32 ootfExponent = Floats(HLG::kOOTFExponent);
     const Weights luma(HLG::kLuma);
     const MatrixLanes lanes(matrix);
     ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
@@ -20,10 +19,7 @@ void ToRec709(const float* source, float* destination, int32_t count, const floa
         ApproxPow(gain, ootfExponent);
         gain[0] = gain[0] * Floats(HLG::kPeak);
         for (F32& c : colour) c = c * gain[0];
-        lanes.Apply(colour);
-        const Signs signs = TakeSigns(colour);
-        ApproxPow(colour, outExponent);
-        PutSigns(colour, signs);
+        EncodeHub(colour, lanes);
     });
 }
 
@@ -38,15 +34,11 @@ inline F32 Encode(F32 E) {
 }
 
 void FromRec709(const float* source, float* destination, int32_t count, const float* matrix) {
-    const F32 inExponent = Floats(2.4f), ootfExponent = Floats(HLG::kInverseOOTFExponent);
+    const F32 ootfExponent = Floats(HLG::kInverseOOTFExponent);
     const Weights luma(HLG::kLuma);
     const MatrixLanes lanes(matrix);
     ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
-        Signs signs = TakeSigns(colour);
-        ApproxPow(colour, inExponent);
-        PutSigns(colour, signs);
-        lanes.Apply(colour);
-        signs = TakeSigns(colour);
+        const Signs signs = DecodeHub(colour, lanes);
         for (F32& c : colour) c = c * Floats(HLG::kLinearScale);
         F32 power[1] = {luma.Sum(colour)};
         ApproxPow(power, ootfExponent);

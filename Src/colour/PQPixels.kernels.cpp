@@ -1,9 +1,8 @@
 // The bodies of PQ.
 
-#include "colour/ApproxPower.h"
 #include "colour/ColourKernels.h"
-#include "colour/ColourLanes.h"
 #include "colour/HDRCurves.h"
+#include "colour/HubLanes.h"
 #include "primitives/simd/Power.h"
 
 namespace PK {
@@ -12,28 +11,20 @@ namespace {
 
 void ToRec709(const float* source, float* destination, int32_t count, const float* matrix,
               const float* table) {
-    const F32 outExponent = Floats(0.41666666f);
     const MatrixLanes lanes(matrix);
     ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
         LookUpSignals(colour, table, 4095);
-        lanes.Apply(colour);
-        const Signs signs = TakeSigns(colour);
-        ApproxPow(colour, outExponent);
-        PutSigns(colour, signs);
+        EncodeHub(colour, lanes);
     });
 }
 
 // The last power magnifies errors by its exponent, and so is an accurate one.
 void FromRec709(const float* source, float* destination, int32_t count, const float* matrix, float outScale) {
-    const F32 inExponent = Floats(2.4f), m1 = Floats(PQ::kM1);
+    const F32 m1 = Floats(PQ::kM1);
     const F32 c1 = Floats(PQ::kC1), c2 = Floats(PQ::kC2), c3 = Floats(PQ::kC3);
     const MatrixLanes lanes(matrix);
     ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
-        Signs signs = TakeSigns(colour);
-        ApproxPow(colour, inExponent);
-        PutSigns(colour, signs);
-        lanes.Apply(colour);
-        signs = TakeSigns(colour);
+        const Signs signs = DecodeHub(colour, lanes);
         for (F32& c : colour) c = c * Floats(PQ::kLinearScale);
         ApproxPow(colour, m1);
         for (F32& c : colour) c = MultiplyAdd(c2, c, c1) * Reciprocal(MultiplyAdd(c3, c, Floats(1)));
