@@ -25,7 +25,31 @@ Run TransposeBytes(const uint8_t* source, uint8_t* destination) {
     return [=] { libyuv::TransposePlane(source, kWidth, destination, kHeight, kWidth, kHeight); };
 }
 
+/// The planes lie one after the other.
+Run CopyPlanes(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        constexpr int32_t kChromaWidth = kWidth / 2, kChromaHeight = kHeight / 2;
+        ptrdiff_t at = 0;
+        libyuv::CopyPlane(source, kWidth, destination, kWidth, kWidth, kHeight);
+        at += kPixels;
+        libyuv::CopyPlane(source + at, kChromaWidth, destination + at, kChromaWidth, kChromaWidth,
+                          kChromaHeight);
+        at += kPixels / 4;
+        libyuv::CopyPlane(source + at, kChromaWidth, destination + at, kChromaWidth, kChromaWidth,
+                          kChromaHeight);
+    };
+}
+
+Run Shade(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        constexpr uint32_t kConstants = 0xff3264c8; // alpha, red, green and blue
+        libyuv::ARGBShade(source, kBGRARowBytes, destination, kBGRARowBytes, kWidth, kHeight, kConstants);
+    };
+}
+
 const AddPeers add = {
+    {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
+    {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
     {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
     {"Transpose pixels of 1 byte", "libyuv TransposePlane", true, TransposeBytes},

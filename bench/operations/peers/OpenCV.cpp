@@ -60,7 +60,20 @@ Run Warp(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// By a mask of bytes, the second image everywhere first.
+Run MaskedCopy(const uint8_t* source, uint8_t* destination) {
+    const uint8_t* mask = source + 8 * static_cast<ptrdiff_t>(kPixels);
+    cv::Mat bytes(kHeight, kWidth, CV_8UC1);
+    for (int32_t i = 0; i < kPixels; ++i) bytes.data[i] = (mask[i / 8] >> (7 - i % 8) & 1) != 0 ? 255 : 0;
+    return [bytes, first = Upright(source), second = Upright(source + 4 * static_cast<ptrdiff_t>(kPixels)),
+            to = Upright(destination)] {
+        second.copyTo(to);
+        first.copyTo(to, bytes);
+    };
+}
+
 const AddPeers add = {
+    {"Composite of two BGRA 8u by a one-bit mask", "OpenCV copyTo (mask of bytes)", false, MaskedCopy},
     {"RGB 8u to BGRA 8u", "OpenCV cvtColor", true, FromRGB},
     {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose<CV_8UC4>},
     {"Transpose pixels of 1 byte", "OpenCV transpose", true, Transpose<CV_8UC1>},
