@@ -1,4 +1,5 @@
 #include "colour/Caches.h"
+#include "colour/MatrixColumn.h"
 
 #include <cmath>
 
@@ -19,36 +20,19 @@ constexpr float kIlluminants[] = {
     1e-6f,
 };
 
-struct XYZ {
-    float c[3];
-};
-
-/// White of luminance 1.
-XYZ WhiteXYZ(const float* white) {
+/// X, Y and Z of white, with luminance 1.
+Column WhiteXYZ(const float* white) {
     return {{white[0] / white[1], 1, (1 - white[1] - white[0]) / white[1]}};
 }
 
-XYZ operator*(const CSMatrix& matrix, const XYZ& v) {
-    XYZ result;
-    for (int row = 0; row < 3; ++row) {
-        const float* m = matrix.m + 3 * row;
-        result.c[row] = m[0] * v.c[0] + m[1] * v.c[1] + m[2] * v.c[2];
-    }
-    return result;
-}
-
-CSMatrix ScaleColumns(const CSMatrix& matrix, const XYZ& factors) {
+CSMatrix ScaleColumns(const CSMatrix& matrix, const Column& factors) {
     CSMatrix result;
     for (int i = 0; i < 9; ++i) result.m[i] = matrix.m[i] * factors.c[i % 3];
     return result;
 }
 
 CSMatrix BradfordMatrix() {
-    CSMatrix bradford;
-    constexpr float values[9] = {0.8951f, 0.2664f, -0.1614f, -0.7502f, 1.7135f,
-                                 0.0367f, 0.0389f, -0.0685f, 1.0296f};
-    std::memcpy(bradford.m, values, sizeof values);
-    return bradford;
+    return MatrixOf({0.8951f, 0.2664f, -0.1614f, -0.7502f, 1.7135f, 0.0367f, 0.0389f, -0.0685f, 1.0296f});
 }
 
 /// Stops at the first that differ, so that nothing is read behind a pair that tells the whites apart.
@@ -130,8 +114,8 @@ CSMatrix ColorSpace::CalculateConversionMatrix(const ColorSpace& from, const Col
 CSMatrix ColorSpace::CalculateAdaptationMatrix(const float* fromWhite, const float* toWhite) {
     if (AreClose(fromWhite, toWhite, 3)) return {};
     const CSMatrix bradford = BradfordMatrix();
-    const XYZ from = bradford * WhiteXYZ(fromWhite), to = bradford * WhiteXYZ(toWhite);
-    const XYZ ratios = {{to.c[0] / from.c[0], to.c[1] / from.c[1], to.c[2] / from.c[2]}};
+    const Column from = bradford * WhiteXYZ(fromWhite), to = bradford * WhiteXYZ(toWhite);
+    const Column ratios = {{to.c[0] / from.c[0], to.c[1] / from.c[1], to.c[2] / from.c[2]}};
     return ScaleColumns(bradford.Inverted(), ratios) * bradford;
 }
 

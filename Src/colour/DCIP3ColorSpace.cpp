@@ -1,5 +1,6 @@
 #include "colour/Caches.h"
 #include "colour/GammaPixels.h"
+#include "colour/HubExponents.h"
 #include "colour/ToneCurve.h"
 
 #include <algorithm>
@@ -56,7 +57,7 @@ void DCIP3ColorSpace::ConvertPixelsFromRec709(const float* source, float* destin
     const CSMatrix& matrix = CachedMatrix(fromRec709, fromRec709Valid, [this] {
         return CalculateConversionMatrix(WorkingSpace(kWorkingSpaceRec709), *this);
     });
-    ConvertGammaPixels(source, destination, count, 2.4f, kEncodingExponent, matrix, gamutClip,
+    ConvertGammaPixels(source, destination, count, kHubDecoding, kEncodingExponent, matrix, gamutClip,
                        LuminanceCoeffs());
 }
 
@@ -65,7 +66,7 @@ void DCIP3ColorSpace::ConvertPixelsToRec709(const float* source, float* destinat
     const ColorSpace& hub = WorkingSpace(kWorkingSpaceRec709);
     const CSMatrix& matrix =
         CachedMatrix(toRec709, toRec709Valid, [&] { return CalculateConversionMatrix(*this, hub); });
-    ConvertGammaPixels(source, destination, count, kDecodingExponent, 0.41666666f, matrix, gamutClip,
+    ConvertGammaPixels(source, destination, count, kDecodingExponent, kHubEncoding, matrix, gamutClip,
                        hub.LuminanceCoeffs());
 }
 

@@ -1,4 +1,5 @@
 #include "colour/GammaPixels.h"
+#include "colour/HubExponents.h"
 
 namespace PK {
 
@@ -29,12 +30,12 @@ float GammaColorSpace::EOTFToLinear(float v) const {
 
 void GammaColorSpace::ConvertPixelsFromRec709(const float* source, float* destination, int32_t count,
                                               bool gamutClip) const {
-    ConvertGammaPixels(source, destination, count, 2.4f, gamma, {}, gamutClip, LuminanceCoeffs());
+    ConvertGammaPixels(source, destination, count, kHubDecoding, gamma, {}, gamutClip, LuminanceCoeffs());
 }
 
 void GammaColorSpace::ConvertPixelsToRec709(const float* source, float* destination, int32_t count,
                                             bool gamutClip) const {
-    ConvertGammaPixels(source, destination, count, 1 / gamma, 0.41666666f, {}, gamutClip,
+    ConvertGammaPixels(source, destination, count, 1 / gamma, kHubEncoding, {}, gamutClip,
                        WorkingSpace(kWorkingSpaceRec709).LuminanceCoeffs());
 }
 

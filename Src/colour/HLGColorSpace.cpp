@@ -2,6 +2,7 @@
 #include "colour/DecodeTables.h"
 #include "colour/FloatKernelTable.h"
 #include "colour/HDRCurves.h"
+#include "colour/HubExponents.h"
 #include "colour/MatrixPixel.h"
 #include "colour/Rec2020Matrices.h"
 
@@ -46,7 +47,8 @@ void HLGColorSpace::ConvertPixelsFromRec709(const float* source, float* destinat
     if (bulk > 0) FloatKernelTable::Rec709ToHLGKernel::Call(source, destination, bulk, matrix.m);
     const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
     ForPixels(source + done, destination + done, count - bulk, [&](RGB c) {
-        const RGB linear = Apply(matrix, ForChannels(c, [](float v) { return SignedPower(v, 2.4f); }));
+        const RGB linear =
+            Apply(matrix, ForChannels(c, [](float v) { return SignedPower(v, kHubDecoding); }));
         const RGB displayed = ForChannels(linear, [](float v) { return std::abs(v) * HLG::kLinearScale; });
         // From light of the display to light of the scene: the system gamma undone.
         const float gain = 1 / std::max(std::pow(Luminance(displayed), HLG::kInverseOOTFExponent),
@@ -69,7 +71,7 @@ void HLGColorSpace::ConvertPixelsToRec709(const float* source, float* destinatio
             ForChannels(c, [table](float v) { return table[SignalIndex(v, kHLGDecodeEntries)]; });
         const float gain = std::pow(Luminance(scene), HLG::kOOTFExponent) * HLG::kPeak;
         const RGB displayed = ForChannels(scene, [gain](float v) { return v * gain; });
-        return ForChannels(Apply(matrix, displayed), [](float v) { return SignedPower(v, 0.41666666f); });
+        return ForChannels(Apply(matrix, displayed), [](float v) { return SignedPower(v, kHubEncoding); });
     });
 }
 

@@ -4,13 +4,14 @@
 
 #include "colour/ApproxPower.h"
 #include "colour/ColourLanes.h"
+#include "colour/HubExponents.h"
 
 namespace PK::PK_TARGET {
 
 /// Decodes pixels of the hub and applies the matrix; leaves the magnitudes and returns the signs.
 inline Signs DecodeHub(F32 (&colour)[3], const MatrixLanes& matrix) {
     const Signs signs = TakeSigns(colour);
-    ApproxPow(colour, Floats(2.4f));
+    ApproxPow(colour, Floats(kHubDecoding));
     PutSigns(colour, signs);
     matrix.Apply(colour);
     return TakeSigns(colour);
@@ -20,7 +21,7 @@ inline Signs DecodeHub(F32 (&colour)[3], const MatrixLanes& matrix) {
 inline void EncodeHub(F32 (&colour)[3], const MatrixLanes& matrix) {
     matrix.Apply(colour);
     const Signs signs = TakeSigns(colour);
-    ApproxPow(colour, Floats(0.41666666f));
+    ApproxPow(colour, Floats(kHubEncoding));
     PutSigns(colour, signs);
 }
 

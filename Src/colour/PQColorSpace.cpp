@@ -4,6 +4,7 @@
 #include "colour/FloatKernelTable.h"
 #include "colour/GamutClip.h"
 #include "colour/HDRCurves.h"
+#include "colour/HubExponents.h"
 #include "colour/MatrixPixel.h"
 
 #include <algorithm>
@@ -11,9 +12,6 @@
 namespace PK {
 
 namespace {
-
-constexpr float kDecodingExponent = 2.4f; // of the hub
-constexpr float kEncodingExponent = 0.41666666f;
 
 /// The signal of a linear value, before any normalisation.
 float EncodePQ(float linear) {
@@ -92,7 +90,7 @@ void PQColorSpace::ConvertPixelsFromRec709(const float* source, float* destinati
     const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
     ForPixels(source + done, destination + done, count - bulk, [&](RGB c) {
         const RGB linear =
-            Apply(matrix, ForChannels(c, [](float v) { return SignedPower(v, kDecodingExponent); }));
+            Apply(matrix, ForChannels(c, [](float v) { return SignedPower(v, kHubDecoding); }));
         return ForChannels(
             linear, [=](float v) { return WithSign(v, [=](float a) { return EncodePQ(a) * outScale; }); });
     });
@@ -103,7 +101,7 @@ void PQColorSpace::ConvertPixelsToRec709(const float* source, float* destination
     const ColorSpace& hub = WorkingSpace(kWorkingSpaceRec709);
     const CSMatrix& matrix =
         CachedMatrix(toRec709, toRec709Valid, [&] { return CalculateConversionMatrix(*this, hub); });
-    const auto encode = [](float v) { return SignedPower(v, kEncodingExponent); };
+    const auto encode = [](float v) { return SignedPower(v, kHubEncoding); };
 
     if (!hasScale && !gamutClip) {
         const float* table = PQDecodeTable();

@@ -1,5 +1,6 @@
 #include "colour/FloatKernelTable.h"
 #include "colour/GammaPixels.h"
+#include "colour/HubExponents.h"
 #include "colour/Rec2020Matrices.h"
 #include "colour/ToneCurve.h"
 
@@ -41,19 +42,20 @@ const float* Rec2020ColorSpace::LuminanceCoeffs() const {
 
 void Rec2020ColorSpace::ConvertPixelsFromRec709(const float* source, float* destination, int32_t count,
                                                 bool gamutClip) const {
-    ConvertGammaPixels(source, destination, count, 2.4f, 0.41666666f, Rec709ToRec2020(), gamutClip,
+    ConvertGammaPixels(source, destination, count, kHubDecoding, kHubEncoding, Rec709ToRec2020(), gamutClip,
                        LuminanceCoeffs());
 }
 
 void Rec2020ColorSpace::ConvertPixelsToRec709(const float* source, float* destination, int32_t count,
                                               bool gamutClip) const {
-    ConvertGammaPixels(source, destination, count, 2.4f, 0.41666666f, Rec2020ToRec709(), gamutClip,
+    ConvertGammaPixels(source, destination, count, kHubDecoding, kHubEncoding, Rec2020ToRec709(), gamutClip,
                        WorkingSpace(kWorkingSpaceRec709).LuminanceCoeffs());
 }
 
 void Rec2020ColorSpace::CompressPixelsToSDR(const float* source, float* destination, int32_t count,
                                             float exposure, float slope, float knee) const {
-    CompressLuminanceToLinear(source, destination, count, ToneCurve(exposure, slope, knee), {*this}, 2.4f);
+    CompressLuminanceToLinear(source, destination, count, ToneCurve(exposure, slope, knee), {*this},
+                              kHubDecoding);
 }
 
 void Rec2020ColorSpace::ConvertPixelsFromYUVtoRGB(const float* source, float* destination,

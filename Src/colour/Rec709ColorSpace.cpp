@@ -1,3 +1,4 @@
+#include "colour/HubExponents.h"
 #include "colour/ToneCurve.h"
 
 #include <cstring>
@@ -14,7 +15,7 @@ void CopyPixels(const float* source, float* destination, int32_t count) {
 
 } // namespace
 
-Rec709ColorSpace::Rec709ColorSpace() : GammaColorSpace(0.41666666f) {}
+Rec709ColorSpace::Rec709ColorSpace() : GammaColorSpace(kHubEncoding) {}
 Rec709ColorSpace::Rec709ColorSpace(const Rec709ColorSpace& other) = default;
 Rec709ColorSpace::Rec709ColorSpace(Rec709ColorSpace&& other) : Rec709ColorSpace(other) {}
 Rec709ColorSpace& Rec709ColorSpace::operator=(const Rec709ColorSpace& other) = default;
@@ -34,8 +35,8 @@ void Rec709ColorSpace::ConvertPixelsToRec709(const float* source, float* destina
 
 void Rec709ColorSpace::CompressPixelsToSDR(const float* source, float* destination, int32_t count,
                                            float exposure, float slope, float knee) const {
-    constexpr TransferSegments kDecoding = {0, 1, 0, 2.4f, 1};
-    constexpr TransferSegments kEncoding = {0, 1, 0, 0.41666666f, 1};
+    constexpr TransferSegments kDecoding = {0, 1, 0, kHubDecoding, 1};
+    constexpr TransferSegments kEncoding = {0, 1, 0, kHubEncoding, 1};
     CompressLuminanceEncoded(source, destination, count, ToneCurve(exposure, slope, knee), {*this}, kDecoding,
                              kEncoding);
 }

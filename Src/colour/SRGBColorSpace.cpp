@@ -1,4 +1,5 @@
 #include "colour/GamutClip.h"
+#include "colour/HubExponents.h"
 #include "colour/ToneCurve.h"
 
 namespace PK {
@@ -8,9 +9,8 @@ namespace {
 constexpr float kPrimaries[6] = {0.64f, 0.33f, 0.30f, 0.60f, 0.15f, 0.06f};
 constexpr float kLuma[3] = {0.2126f, 0.7152f, 0.0722f};
 
-float Encode(float linear) {
-    return linear > 0.0031308f ? std::pow(linear, 0.41666666f) * 1.055f - 0.055f : linear * 12.92f;
-}
+constexpr TransferSegments kDecoding = {0.04045f, 0.94786733f, 0.055f, 2.4f, 0.07739938f};
+constexpr TransferSegments kEncoding = {0.0031308f, 1.055f, -0.055f, 0.41666666f, 12.92f};
 
 } // namespace
 
@@ -36,20 +36,23 @@ const float* SRGBColorSpace::LuminanceCoeffs() const {
 
 // The thresholds look at the value with its sign: negative values are linear throughout.
 float SRGBColorSpace::LinearToEOTF(float v) const {
-    return WithSign(v, [v](float a) { return v > 0.0031308f ? Encode(a) : a * 12.92f; });
+    return WithSign(
+        v, [v](float a) { return v > kEncoding.threshold ? kEncoding.Encode(a) : a * kEncoding.slope; });
 }
 
 float SRGBColorSpace::EOTFToLinear(float v) const {
-    return WithSign(
-        v, [v](float a) { return v > 0.04045f ? std::pow((0.055f + a) / 1.055f, 2.4f) : a / 12.92f; });
+    return WithSign(v, [v](float a) {
+        return v > kDecoding.threshold ? std::pow((0.055f + a) / 1.055f, 2.4f) : a / 12.92f;
+    });
 }
 
 void SRGBColorSpace::ConvertPixelsFromRec709(const float* source, float* destination, int32_t count,
                                              bool gamutClip) const {
     const float* luma = LuminanceCoeffs();
     ForPixels(source, destination, count, [=](RGB c) {
-        const RGB encoded = ForChannels(
-            c, [](float v) { return WithSign(v, [](float a) { return Encode(std::pow(a, 2.4f)); }); });
+        const RGB encoded = ForChannels(c, [](float v) {
+            return WithSign(v, [](float a) { return kEncoding.Encode(std::pow(a, kHubDecoding)); });
+        });
         return gamutClip ? GamutClipPixel(encoded, luma) : encoded;
     });
 }
@@ -57,12 +60,9 @@ void SRGBColorSpace::ConvertPixelsFromRec709(const float* source, float* destina
 void SRGBColorSpace::ConvertPixelsToRec709(const float* source, float* destination, int32_t count,
                                            bool gamutClip) const {
     const float* luma = WorkingSpace(kWorkingSpaceRec709).LuminanceCoeffs();
-    const auto decode = [](float a) {
-        return a > 0.04045f ? std::pow((a + 0.055f) * 0.94786733f, 2.4f) : a * 0.07739938f;
-    };
     ForPixels(source, destination, count, [=](RGB c) {
-        const RGB encoded = ForChannels(c, [decode](float v) {
-            return WithSign(v, [decode](float a) { return std::pow(decode(a), 0.41666666f); });
+        const RGB encoded = ForChannels(c, [](float v) {
+            return WithSign(v, [](float a) { return std::pow(kDecoding.Decode(a), kHubEncoding); });
         });
         return gamutClip ? GamutClipPixel(encoded, luma) : encoded;
     });
@@ -70,8 +70,6 @@ void SRGBColorSpace::ConvertPixelsToRec709(const float* source, float* destinati
 
 void SRGBColorSpace::CompressPixelsToSDR(const float* source, float* destination, int32_t count,
                                          float exposure, float slope, float knee) const {
-    constexpr TransferSegments kDecoding = {0.04045f, 0.94786733f, 0.055f, 2.4f, 0.07739938f};
-    constexpr TransferSegments kEncoding = {0.0031308f, 1.055f, -0.055f, 0.41666666f, 12.92f};
     CompressLuminanceEncoded(source, destination, count, ToneCurve(exposure, slope, knee), {*this}, kDecoding,
                              kEncoding);
 }

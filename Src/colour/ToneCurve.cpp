@@ -1,33 +1,22 @@
 #include "colour/ToneCurve.h"
 
+#include "colour/MatrixColumn.h"
+
 namespace PK {
 
 namespace {
-
-struct Sums {
-    float c[3];
-};
-
-Sums Multiply(const CSMatrix& matrix, float a, float b, float c) {
-    Sums sums;
-    for (int row = 0; row < 3; ++row) {
-        const float* m = matrix.m + 3 * row;
-        sums.c[row] = m[0] * a + m[1] * b + m[2] * c;
-    }
-    return sums;
-}
 
 /// Keeps chromaticity x, y of a linear colour and bends its luminance; what is black or darker has the chromaticity of
 /// white.
 RGB BendLuminance(RGB linear, const ToneCurve& curve, const LuminanceSpace& space) {
     constexpr double kLeastSum = 1e-6;
-    const auto [X, Y, Z] = Multiply(space.toXYZ, linear.r, linear.g, linear.b).c;
+    const auto [X, Y, Z] = (space.toXYZ * Column{{linear.r, linear.g, linear.b}}).c;
     const float sum = Z + X + Y;
     const bool hasColour = static_cast<double>(sum) > kLeastSum;
     const float x = hasColour ? X / sum : space.white[0];
     const float y = hasColour ? Y / sum : space.white[1];
     const float bent = curve(Y);
-    const auto [r, g, b] = Multiply(space.toRGB, x * bent / y, bent, (1 - x - y) * bent / y).c;
+    const auto [r, g, b] = (space.toRGB * Column{{x * bent / y, bent, (1 - x - y) * bent / y}}).c;
     return {r, g, b};
 }
 
@@ -52,17 +41,11 @@ float ToneCurve::operator()(float luminance) const {
 void CompressLuminanceEncoded(const float* source, float* destination, int32_t count, const ToneCurve& curve,
                               const LuminanceSpace& space, const TransferSegments& decoding,
                               const TransferSegments& encoding) {
-    const auto decode = [&](float a) {
-        return a > decoding.threshold ? std::pow((a + decoding.offset) * decoding.scale, decoding.exponent)
-                                      : a * decoding.slope;
-    };
-    const auto encode = [&](float a) {
-        return a > encoding.threshold ? std::pow(a, encoding.exponent) * encoding.scale + encoding.offset
-                                      : a * encoding.slope;
-    };
     ForPixels(source, destination, count, [&](RGB c) {
-        const RGB linear = ForChannels(c, [&](float v) { return WithSign(v, decode); });
-        return ForChannels(BendLuminance(linear, curve, space), [&](float v) { return WithSign(v, encode); });
+        const RGB linear =
+            ForChannels(c, [&](float v) { return WithSign(v, [&](float a) { return decoding.Decode(a); }); });
+        return ForChannels(BendLuminance(linear, curve, space),
+                           [&](float v) { return WithSign(v, [&](float a) { return encoding.Encode(a); }); });
     });
 }
 

@@ -4,6 +4,7 @@
 // logarithm, and the chromaticity is kept. All of it runs pixel by pixel.
 
 #include "colour/PixelLoop.h"
+#include "colour/TransferSegments.h"
 
 #include <PixelKiln/ColorSpace.h>
 
@@ -30,12 +31,6 @@ struct LuminanceSpace {
 
     LuminanceSpace(const ColorSpace& space)
         : toXYZ(space.RGBtoXYZ()), toRGB(space.XYZtoRGB()), white(space.WhitePoint()) {}
-};
-
-/// A transfer function of two pieces, in either direction. Above the threshold, decoding is
-/// ((a + offset) scale)^exponent and encoding a^exponent scale + offset; up to it both are a slope.
-struct TransferSegments {
-    float threshold, scale, offset, exponent, slope;
 };
 
 /// From encoded pixels to encoded pixels.

@@ -83,7 +83,7 @@ TEST(FillPixels, FillsRowsOfEveryWidthAndAlignment) {
 
 TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
     Random random(12);
-    constexpr int32_t kBytes = 1 << 20; // from here on runs are long
+    constexpr int32_t kBytes = 1 << 20; // from here on images are large
     std::vector<uint8_t> periodic = random.Bytes(16);
     std::copy_n(periodic.begin(), 8, periodic.begin() + 8);
     AtEveryTarget([&] {
