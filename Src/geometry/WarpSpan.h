@@ -52,6 +52,8 @@ struct WarpRules {
 struct WarpKernels {
     WarpRules nearest, bilinear;
 
+    static constexpr const char* kFamily = "Warp";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const WarpKernels& For();
 };

@@ -106,11 +106,11 @@ std::array<double, 3> ClipSlowly(std::array<double, 3> c, const float* weights) 
 constexpr float kUnitMatrix[9] = {1, 0, 0, 0, 1, 0, 0, 0, 1};
 
 /// Linear pixels through the clip of one body: both powers are 1.
-Pixels ClippedBy(FloatTarget target, const Pixels& pixels, const float* luma) {
-    const GammaConversion conversion = {1, 1, {luma[0], luma[1], luma[2]}, true, true};
+Pixels ClippedBy(Target target, const Pixels& pixels, const float* luma) {
+    const GammaConversion conversion = {kUnitMatrix, 1, 1, {luma[0], luma[1], luma[2]}, true, true};
     Pixels result(pixels.size());
     KernelsFor<GammaKernels>(target).convert(pixels.data()->data(), result.data()->data(),
-                                             static_cast<int32_t>(pixels.size()), kUnitMatrix, conversion);
+                                             static_cast<ptrdiff_t>(pixels.size()), conversion);
     return result;
 }
 
@@ -146,7 +146,7 @@ TEST(GamutClip, AgreesWithDoublePrecision) {
 TEST(GamutClipLanes, AgreeWithDoublePrecision) {
     Random random(10);
     const Pixels colours = Colours(random, 8000);
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
         const Pixels clipped = ClippedBy(target, colours, kRec709);
         double worst = 0;
         for (size_t i = 0; i < colours.size(); ++i) {
@@ -157,22 +157,22 @@ TEST(GamutClipLanes, AgreeWithDoublePrecision) {
             for (size_t k = 0; k < 3; ++k)
                 worst = std::max(worst, std::abs(static_cast<double>(clipped[i][2 - k]) - exact[k]));
         }
-        EXPECT_LT(worst, 0x1p-10) << FloatTargetName(target);
-        RecordProperty(FloatTargetName(target), std::to_string(worst));
+        EXPECT_LT(worst, 0x1p-10) << TargetName(target);
+        RecordProperty(TargetName(target), std::to_string(worst));
     }
 }
 
 TEST(GamutClipLanes, GreysAboveOneBecomeExactlyOneInEveryBody) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const float grey : {1.5f, 2.0f, 100.0f, 1e30f, kInfinity})
             for (const Pixel& pixel : ClippedBy(target, Pixels(8, {grey, grey, grey, 7}), kRec709))
-                EXPECT_EQ(pixel, (Pixel{1, 1, 1, 7})) << FloatTargetName(target) << " " << grey;
+                EXPECT_EQ(pixel, (Pixel{1, 1, 1, 7})) << TargetName(target) << " " << grey;
 }
 
 TEST(GamutClipLanes, AChannelOfExactlyOneComesOutNearIt) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const Pixel& pixel : ClippedBy(target, Pixels(8, {0.25f, 0.5f, 1, 7}), kRec709)) {
-            EXPECT_NEAR(pixel[0], 0.25f, 0.25f * 0x1p-9f) << FloatTargetName(target);
+            EXPECT_NEAR(pixel[0], 0.25f, 0.25f * 0x1p-9f) << TargetName(target);
             EXPECT_NEAR(pixel[1], 0.5f, 0.5f * 0x1p-9f);
             EXPECT_NEAR(pixel[2], 1.0f, 0x1p-9f);
         }
@@ -181,13 +181,13 @@ TEST(GamutClipLanes, AChannelOfExactlyOneComesOutNearIt) {
 TEST(GamutClipLanes, NeighboursDoNotChangeAPixel) {
     Random random(11);
     const Pixels mixed = UniformPixels(random, 64, -0.5f, 2);
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
         const Pixels together = ClippedBy(target, mixed, kRec709);
         for (size_t i = 0; i < mixed.size(); ++i) {
             const Pixels alone = ClippedBy(target, Pixels(8, mixed[i]), kRec709);
             for (const Pixel& pixel : alone)
                 ASSERT_EQ(std::memcmp(pixel.data(), together[i].data(), sizeof pixel), 0)
-                    << FloatTargetName(target) << ", pixel " << i << ", seed " << random.Seed();
+                    << TargetName(target) << ", pixel " << i << ", seed " << random.Seed();
         }
     }
 }

@@ -38,7 +38,7 @@ std::ostream& operator<<(std::ostream& stream, const HubConversion& conversion) 
 }
 
 Rounding BulkRounding() {
-    return RoundingOf(BestFloatTarget());
+    return RoundingOf(BestTarget(Offer::processor));
 }
 
 const float kTo2020[9] = {0.6274020f, 0.3292920f, 0.0433061f, 0.0690955f, 0.9195440f,

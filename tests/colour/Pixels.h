@@ -2,11 +2,11 @@
 
 // Float pixels for the tests of the colour spaces, and conversions of them at every place that memory has.
 
-#include "colour/FloatTargets.h"
 #include "support/Random.h"
 #include "support/RowBuffer.h"
+#include "support/Targets.h"
 
-#include "colour/CpuFeatures.h"
+#include "primitives/CpuFeatures.h"
 
 #include <gtest/gtest.h>
 
@@ -108,12 +108,4 @@ Pixels Converted(const Pixels& pixels, Convert convert) {
 }
 
 /// The targets whose bodies this processor runs.
-inline std::vector<PK::FloatTarget> FloatTargetsOfThisProcessor() {
-    std::vector<PK::FloatTarget> targets;
-    for (int i = 0; i < PK::kFloatTargetCount; ++i)
-        if (PK::Runs(PK::CpuFeatures::Flags(), static_cast<PK::FloatTarget>(i)))
-            targets.push_back(static_cast<PK::FloatTarget>(i));
-    return targets;
-}
-
 } // namespace PKTest

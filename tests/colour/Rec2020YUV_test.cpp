@@ -128,10 +128,10 @@ TEST(Rec2020YUV, PixelsBehindGroupsAgreeWithTheSumsWrittenOut) {
 TEST(Rec2020YUV, EveryBodyAgreesWithTheSumsWrittenOut) {
     Random random(29);
     const Pixels pixels = AnyPixels(random, 8000);
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
-        SCOPED_TRACE(FloatTargetName(target));
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
+        SCOPED_TRACE(TargetName(target));
         const YUVKernels& kernels = KernelsFor<YUVKernels>(target);
-        const bool isFused = target == FloatTarget::avx2fma;
+        const bool isFused = target == Target::avx2fma;
         ExpectSame(Converted(pixels, kernels.toRGB), pixels, isFused ? GroupToRGB<true> : GroupToRGB<false>,
                    0, pixels.size());
         ExpectSame(Converted(pixels, kernels.fromRGB), pixels, isFused ? GroupToYUV<true> : GroupToYUV<false>,
@@ -142,20 +142,20 @@ TEST(Rec2020YUV, EveryBodyAgreesWithTheSumsWrittenOut) {
 TEST(Rec2020YUV, EveryBodyWithoutFusingAgreesWithThePlainOneBitByBit) {
     Random random(30);
     const Pixels pixels = UniformPixels(random, 8000, -1, 2);
-    const YUVKernels& plain = KernelsFor<YUVKernels>(FloatTarget::plain);
+    const YUVKernels& plain = KernelsFor<YUVKernels>(Target::plain);
     const Pixels toRGB = Converted(pixels, plain.toRGB), fromRGB = Converted(pixels, plain.fromRGB);
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
-        if (target == FloatTarget::avx2fma) continue;
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
+        if (target == Target::avx2fma) continue;
         const YUVKernels& kernels = KernelsFor<YUVKernels>(target);
-        EXPECT_TRUE(AreSameBits(Converted(pixels, kernels.toRGB), toRGB)) << FloatTargetName(target);
-        EXPECT_TRUE(AreSameBits(Converted(pixels, kernels.fromRGB), fromRGB)) << FloatTargetName(target);
+        EXPECT_TRUE(AreSameBits(Converted(pixels, kernels.toRGB), toRGB)) << TargetName(target);
+        EXPECT_TRUE(AreSameBits(Converted(pixels, kernels.fromRGB), fromRGB)) << TargetName(target);
     }
 }
 
 TEST(Rec2020YUV, GroupsTakeTheBestBody) {
     Random random(31);
     const Pixels pixels = UniformPixels(random, 64, -1, 2);
-    const YUVKernels& kernels = KernelsFor<YUVKernels>(BestFloatTarget());
+    const YUVKernels& kernels = KernelsFor<YUVKernels>(BestTarget(Offer::processor));
     EXPECT_TRUE(AreSameBits(Converted(pixels, ToRGB), Converted(pixels, kernels.toRGB)));
     EXPECT_TRUE(AreSameBits(Converted(pixels, ToYUV), Converted(pixels, kernels.fromRGB)));
 }

@@ -41,8 +41,8 @@ protected:
         const RowBuffer first(bytes, place), second(bytes, place), destination(bytes, place);
         const RowBuffer mask((static_cast<size_t>(bit) * (width > 0) + width + 7) / 8, place);
         for (const RowBuffer* row : {&first, &second, &mask}) fRandom.Fill(row->Data(), row->Size());
-        Kernel(pixelBytes)(first.Data(), second.Data(), mask.Data(), bit, destination.Data(),
-                           static_cast<int32_t>(width));
+        Kernel(pixelBytes)(first.Data(), second.Data(), destination.Data(), static_cast<int32_t>(width),
+                           {mask.Data(), bit});
         for (size_t i = 0; i < bytes; ++i) {
             const bool isSet = BitOf(mask.Data(), static_cast<size_t>(bit) + i / pixelBytes);
             ASSERT_EQ(destination.Data()[i], (isSet ? first : second).Data()[i]) << "byte " << i;
@@ -112,8 +112,8 @@ TEST_P(MaskBodies, WorkInPlaceOfEitherRow) {
         std::vector<uint8_t> expected(61 * pixelBytes), inFirst = first, inSecond = second;
         for (size_t i = 0; i < expected.size(); ++i)
             expected[i] = BitOf(mask, 5 + i / pixelBytes) ? first[i] : second[i];
-        Kernel(pixelBytes)(inFirst.data(), second.data(), mask, 5, inFirst.data(), 61);
-        Kernel(pixelBytes)(first.data(), inSecond.data(), mask, 5, inSecond.data(), 61);
+        Kernel(pixelBytes)(inFirst.data(), second.data(), inFirst.data(), 61, {mask, 5});
+        Kernel(pixelBytes)(first.data(), inSecond.data(), inSecond.data(), 61, {mask, 5});
         EXPECT_EQ(inFirst, expected);
         EXPECT_EQ(inSecond, expected);
     }

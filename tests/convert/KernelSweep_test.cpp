@@ -25,10 +25,11 @@ namespace {
 using namespace PK;
 
 std::string Describe(Kernel kernel) {
-    const KernelInfo& info = Info(kernel);
-    return std::string(info.name) + " from " + PK_PixelFormatName(info.source) + " to " +
-           (info.destination == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u"
-                                                           : PK_PixelFormatName(info.destination));
+    const KernelRow& info = Info(kernel);
+    return std::string(info.name) + " from " + PK_PixelFormatName(info.operands.source.format) + " to " +
+           (info.operands.destination.format == PK_PixelFormat_RGB_444_10u
+                ? "RGB_444_10u"
+                : PK_PixelFormatName(info.operands.destination.format));
 }
 
 bool IsPower(Kernel kernel) {
@@ -37,8 +38,8 @@ bool IsPower(Kernel kernel) {
 
 /// Whether a body follows the rule of the vector members where those differ from the plain one.
 bool HasVectorRule(Kernel kernel, Target target) {
-    if (Info(kernel).agreement == Agreement::Exact) return false;
-    return target >= (kernel == Kernel::Expand8uTo15uRow ? Target::sse2 : Target::ssse3);
+    const Agreement agreement = Info(kernel).agreement;
+    return agreement.kind == Agreement::Declared && target >= agreement.from;
 }
 
 int Quality(Kernel kernel) {
@@ -46,9 +47,9 @@ int Quality(Kernel kernel) {
 }
 
 void RunReference(Kernel kernel, Target target, const void* source, void* destination, int32_t width) {
-    const KernelInfo& info = Info(kernel);
-    reference::Run(info.name, info.source, info.destination, HasVectorRule(kernel, target), source,
-                   destination, width, Quality(kernel));
+    const KernelRow& info = Info(kernel);
+    reference::Run(info.name, info.operands.source.format, info.operands.destination.format,
+                   HasVectorRule(kernel, target), source, destination, width, Quality(kernel));
 }
 
 /// The row that a kernel must give: for a fused one, what its parts give one after the other.
@@ -69,14 +70,14 @@ void RunExpected(Kernel kernel, Target target, const void* source, void* destina
 class KernelSweep : public testing::TestWithParam<int> {
 protected:
     Kernel kernel = static_cast<Kernel>(GetParam());
-    const KernelInfo& info = Info(kernel);
+    const KernelRow& info = Info(kernel);
     PKTest::Random random{static_cast<uint64_t>(GetParam())};
 
     size_t SourceBytes(int32_t width) const {
-        return static_cast<size_t>(PK_PixelFormatPackedRowBytes(info.source, width));
+        return static_cast<size_t>(PK_PixelFormatPackedRowBytes(info.operands.source.format, width));
     }
     size_t DestinationBytes(int32_t width) const {
-        return static_cast<size_t>(PK_PixelFormatPackedRowBytes(info.destination, width));
+        return static_cast<size_t>(PK_PixelFormatPackedRowBytes(info.operands.destination.format, width));
     }
 
     /// One row through one body, compared with the reference.
@@ -84,7 +85,7 @@ protected:
                   PKTest::Placement destinationPlace) {
         PKTest::RowBuffer source(SourceBytes(width), sourcePlace);
         PKTest::RowBuffer destination(DestinationBytes(width), destinationPlace);
-        PKTest::FillSamples(info.source, source.Data(), source.Size(), random);
+        PKTest::FillSamples(info.operands.source.format, source.Data(), source.Size(), random);
         const std::vector<uint8_t> before(source.Data(), source.Data() + source.Size());
 
         constexpr unsigned exceptionFlags = 0x3f;
@@ -99,8 +100,8 @@ protected:
 
         ASSERT_TRUE(std::equal(before.begin(), before.end(), source.Data())) << "the source was written";
         ASSERT_TRUE(destination.MarginsIntact()) << "bytes outside the row were written";
-        ASSERT_EQ("", PKTest::FirstDifference(info.destination, destination.Size(), expected.Data(),
-                                              destination.Data(), IsPower(kernel) ? 1 : 0))
+        ASSERT_EQ("", PKTest::FirstDifference(info.operands.destination.format, destination.Size(),
+                                              expected.Data(), destination.Data(), IsPower(kernel) ? 1 : 0))
             << Describe(kernel) << ", " << TargetName(target) << ", width " << width << ", source "
             << sourcePlace << ", destination " << destinationPlace << ", seed " << random.Seed();
     }
@@ -127,7 +128,7 @@ TEST_P(KernelSweep, BodiesOfTheSameRuleAgreeToTheBit) {
     ASSERT_FALSE(targets.empty());
     std::vector<uint8_t> source(SourceBytes(width)), first(DestinationBytes(width)), other(first.size());
     for (int round = 0; round < 16; ++round) {
-        PKTest::FillSamples(info.source, source.data(), source.size(), random);
+        PKTest::FillSamples(info.operands.source.format, source.data(), source.size(), random);
         for (const bool vectorRule : {false, true}) {
             const Target* leader = nullptr;
             for (const Target& target : targets) {
@@ -137,8 +138,8 @@ TEST_P(KernelSweep, BodiesOfTheSameRuleAgreeToTheBit) {
                     leader = &target;
                     continue;
                 }
-                ASSERT_EQ("",
-                          PKTest::FirstDifference(info.destination, first.size(), first.data(), other.data()))
+                ASSERT_EQ("", PKTest::FirstDifference(info.operands.destination.format, first.size(),
+                                                      first.data(), other.data()))
                     << Describe(kernel) << ", " << TargetName(target) << " against " << TargetName(*leader)
                     << ", seed " << random.Seed();
             }
@@ -147,8 +148,7 @@ TEST_P(KernelSweep, BodiesOfTheSameRuleAgreeToTheBit) {
 }
 
 std::string TestName(const testing::TestParamInfo<int>& param) {
-    const KernelInfo& info = Info(static_cast<Kernel>(param.param));
-    std::string name = Describe(info.kernel);
+    std::string name = Describe(static_cast<Kernel>(param.param));
     for (char& c : name)
         if (!std::isalnum(static_cast<unsigned char>(c))) c = '_';
     return name + "_" + std::to_string(param.param);

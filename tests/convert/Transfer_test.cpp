@@ -6,6 +6,7 @@
 #include "frame/Capabilities.h"
 #include "frame/FloatMode.h"
 #include "support/Random.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 
@@ -50,7 +51,6 @@ class Transfer : public testing::TestWithParam<Target> {
 protected:
     void SetUp() override {
         DetectProcessor();
-        if (!IsEnabled(target)) GTEST_SKIP() << "not on this processor";
         for (const Kernel kernel : {Kernel::GammaToLinearRow, Kernel::LinearToGammaRow,
                                     Kernel::Gamma8uToLinearFloat32Row, Kernel::LinearFloat32ToGamma8uRow})
             ASSERT_NE(nullptr, Body(kernel, target));
@@ -69,15 +69,7 @@ protected:
     }
 };
 
-std::string BodyName(const testing::TestParamInfo<Target>& info) {
-    constexpr const char* names[] = {"plain", "SSE2", "SSSE3", "SSE41", "AVX2", "AVX512"};
-    return names[static_cast<size_t>(info.param)];
-}
-
-INSTANTIATE_TEST_SUITE_P(Bodies, Transfer,
-                         testing::Values(Target::plain, Target::sse2, Target::ssse3, Target::sse41,
-                                         Target::avx2, Target::avx512),
-                         BodyName);
+INSTANTIATE_TEST_SUITE_P(Bodies, Transfer, PKTest::EveryTarget(), PKTest::TargetOf);
 
 TEST_P(Transfer, KnownPowers) {
     EXPECT_EQ(1.0f, ToLinear(1));
