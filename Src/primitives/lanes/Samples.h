@@ -10,6 +10,11 @@ inline constexpr float kReciprocal255 = 0x1.010102p-8f; // 0x3b808081, 1 / 255 r
 inline constexpr float kReciprocal224 = 0x1.24924ap-8f; // 0x3b924925, 1 / 224
 inline constexpr float kReciprocal219 = 0x1.2b404ap-8f; // 0x3b95a025, 1 / 219
 
+/// Interleaved codes of RGB in any order to float: from 0 to 1.
+inline F32 ExpandBGRA(F32 codes) {
+    return codes * Floats(kReciprocal255);
+}
+
 /// Interleaved V, U, Y, A codes to float: chroma about 0, luma and alpha from 0 to 1.
 inline F32 ExpandVUYA(F32 codes) {
     // Added, not subtracted: alpha minus 0 would be -0 at code 0 when rounding down.
