@@ -13,7 +13,7 @@ class Task {
 public:
     virtual int32_t GetPartCount() const = 0;
 
-    /// Does one part, on any thread, in the floating-point mode which that thread is in.
+    /// Does one part, on any thread, in the floating-point mode of the thread that runs the task.
     /// \param partIndex  0 to the part count less one.
     virtual void RunPart(int32_t partIndex) const = 0;
 

@@ -2,20 +2,27 @@
 
 #include <algorithm>
 #include <csignal>
+#include <xmmintrin.h>
 
 namespace zebcore::threads {
 namespace {
+
+constexpr uint32_t kFloatExceptions = 0x3f; // the sticky bits of MXCSR
 
 // Each thread that begins a job wakes so many: all are soon awake, and none spends long on waking others.
 constexpr size_t kWokenAtOnce = 2;
 
 } // namespace
 
+CPUBoundPool::Job::Job(const Function& theFunction, int32_t theCount) noexcept
+    : function(theFunction), count(theCount), floatMode(_mm_getcsr()) {}
+
 CPUBoundPool::CPUBoundPool(uint32_t threadCount) {
     fThreads.reserve(threadCount);
-    // Signals are the program's: its handlers run on its own threads.
+    // Signals are the program's: its handlers run on its own threads. Only faults belong to who commits them.
     sigset_t blocked, previous;
     sigfillset(&blocked);
+    for (const int fault : {SIGBUS, SIGFPE, SIGILL, SIGSEGV}) sigdelset(&blocked, fault);
     pthread_sigmask(SIG_SETMASK, &blocked, &previous);
     StartThreads(threadCount);
     pthread_sigmask(SIG_SETMASK, &previous, nullptr);
@@ -54,6 +61,7 @@ void CPUBoundPool::Run(const Function& function, int32_t count) {
         fJobs.erase(fJobs.iterator_to(job)); // from here on nobody enters it
         job.lastHelperLeft.wait(lock, [&job] { return job.helpersInside == 0; });
     }
+    _mm_setcsr(_mm_getcsr() | job.floatExceptions);
     if (job.failure) std::rethrow_exception(job.failure);
 }
 
@@ -74,13 +82,20 @@ CPUBoundPool::Job* CPUBoundPool::FindJob() noexcept {
     return found == fJobs.end() ? nullptr : &*found;
 }
 
+// Works in the floating-point mode of the job's own thread, as if that had taken the parts, and has its own again
+// afterwards.
 void CPUBoundPool::Help(Job& job, std::unique_lock<std::mutex>& lock) noexcept {
     ++job.helpersInside;
     const size_t woken = ClaimSleepers(job);
     lock.unlock();
     Wake(woken);
+    const uint32_t ownFloatMode = _mm_getcsr();
+    _mm_setcsr(job.floatMode);
     RunParts(job);
+    const uint32_t raised = _mm_getcsr() & kFloatExceptions;
+    _mm_setcsr(ownFloatMode);
     lock.lock();
+    job.floatExceptions |= raised;
     // Still under the lock, since the job may be gone as soon as its thread gets it.
     if (--job.helpersInside == 0) job.lastHelperLeft.notify_one();
 }

@@ -39,14 +39,16 @@ public:
 private:
     // A task that has not ended. Lives on the stack of Run.
     struct Job : boost::intrusive::list_base_hook<> {
-        Job(const Function& theFunction, int32_t theCount) : function(theFunction), count(theCount) {}
+        Job(const Function& theFunction, int32_t theCount) noexcept;
 
         int64_t PartsLeft() const noexcept { return count - nextPart.load(std::memory_order_relaxed); }
 
         const Function& function;
         const int64_t count;
+        const uint32_t floatMode;         // MXCSR of the thread that runs the task
         std::atomic<int64_t> nextPart{0}; // passes count by one for each thread that finds no part left
         int32_t helpersInside = 0;        // this and what follows is guarded by the pool's mutex
+        uint32_t floatExceptions = 0;     // what helpers raised
         std::exception_ptr failure;
         std::condition_variable lastHelperLeft;
     };
