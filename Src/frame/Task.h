@@ -8,7 +8,7 @@ namespace PK::Threading {
 
 /// Work in independent parts. A concrete task holds copies of its parameters, is built on the caller's stack for
 /// one call and writes a region of its own in each part; each part takes its own scratch. All failures are
-/// decided before the task runs.
+/// decided before the task runs; where a part may fail, RunInBands (Bands.h) brings its result back.
 class Task {
 public:
     virtual int32_t GetPartCount() const = 0;
