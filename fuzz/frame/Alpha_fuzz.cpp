@@ -94,7 +94,7 @@ void FuzzAlpha(ByteStream& stream) {
     CheckIsNamed(result);
     image.CheckPadding();
     other.CheckStays();
-    if (result != PK_Success || layout.Bytes() == 0) return image.CheckStays();
+    if (result != PK_Success || layout.Bytes() == 0) return image.CheckStays("a refused call writes nothing");
     Check(!request.isNull, "a null pointer is refused");
     const bool copies = request.operation == Operation::Copy && !request.isInPlace;
     CheckSame(ColourOf(request, (copies ? other : image).Content()), ColourOf(request, image.Rows()),

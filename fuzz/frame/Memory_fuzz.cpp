@@ -65,7 +65,7 @@ void FlipRows(ByteStream& stream, uint32_t state) {
     Check(CallIn(state, flip) == PK_Success, "an ordinary image is flipped");
     CheckSame(RowsInReverse(image.Content(), rowLength), image.Rows(), "the rows are in reverse");
     Check(CallIn(state, flip) == PK_Success, "a flipped image is flipped");
-    image.CheckStays();
+    image.CheckStays("two flips change nothing");
 }
 
 /// Sizes that the flip must refuse, or do nothing for, without a look at memory.

@@ -118,9 +118,9 @@ void ImageMemory::OpenGaps() const {
     ASAN_UNPOISON_MEMORY_REGION(fAllocation, fHead + fLayout.Extent());
 }
 
-void SourceImage::CheckStays() const {
+void SourceImage::CheckStays(const char* rule) const {
     CheckPadding();
-    CheckSame(fContent, Rows(), "the source stays");
+    CheckSame(fContent, Rows(), rule);
 }
 
 } // namespace PKFuzz

@@ -82,7 +82,7 @@ public:
     const std::vector<uint8_t>& Content() const { return fContent; }
 
     /// Holds a call to have written neither to the rows nor between them.
-    void CheckStays() const;
+    void CheckStays(const char* rule = "the source stays") const;
 
 private:
     std::vector<uint8_t> fContent;
