@@ -78,7 +78,7 @@ bool IsWorthAsking(PK_PixelFormat format, int32_t width, int32_t height) {
 
 /// The length of a side: small, or any.
 int32_t DrawSide(ByteStream& stream) {
-    return stream.OneIn(4) ? stream.AnyI32() : stream.Between(0, 400);
+    return stream.BetweenOrAny(0, 400, 4);
 }
 
 std::optional<Held> TakeImage(ByteStream& stream, uint32_t state) {

@@ -1,7 +1,8 @@
 // pixelkiln kernels: the register of row kernels.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Formats.h"
+#include "SharedWords.h"
 #include "Terminal.h"
 #include "explain/TargetNames.h"
 
@@ -18,9 +19,7 @@ const char* AgreementText(PK::Agreement agreement) {
     return agreement.kind == PK::Agreement::Exact ? "exact" : "declared";
 }
 
-} // namespace
-
-void RunKernels(const ListOptions& options) {
+void Run(const ListOptions& options) {
     Table table({"kernel", "from", "to", "agreement", "chosen", "bodies"});
     for (int i = 0; i < PK::kKernelCount; ++i) {
         const auto kernel = static_cast<PK::Kernel>(i);
@@ -34,4 +33,8 @@ void RunKernels(const ListOptions& options) {
     Print(options.csv ? table.CSV() : table.Aligned());
 }
 
+const Command sKernels(Group::Listings, "kernels", "List the row kernels and the bodies chosen here",
+                       AddListing, Run);
+
+} // namespace
 } // namespace tool

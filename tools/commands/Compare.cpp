@@ -1,30 +1,36 @@
 // pixelkiln compare: how far two pictures are apart.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Difference.h"
 #include "Failure.h"
+#include "Numbers.h"
 #include "Png.h"
 #include "Terminal.h"
 
 #include <algorithm>
-#include <cstdio>
+#include <optional>
 
 namespace tool {
 namespace {
 
-std::string SizeText(const Frame& picture) {
-    return std::to_string(picture.Width()) + "x" + std::to_string(picture.Height());
-}
-
 std::string StepsText(double steps) {
-    char text[32];
-    std::snprintf(text, sizeof(text), "%.4g", steps);
-    return text;
+    return Formatted("%.4g", steps);
 }
 
-} // namespace
+struct Options {
+    std::string first;
+    std::string second;
+    std::optional<double> limit; // steps of 8 bits
+};
 
-void RunCompare(const CompareOptions& options) {
+void Declare(Words& words, Options& options) {
+    words.Take("A", options.first, "PNG file").Required();
+    words.Take("B", options.second, "PNG file").Required();
+    words.Take("--limit", options.limit, "Fail if any sample differs by more, in steps of 1/255")
+        .NotNegative();
+}
+
+void Run(const Options& options) {
     Frame first = ReadPng(options.first);
     Frame second = ReadPng(options.second);
     if (first.Width() != second.Width() || first.Height() != second.Height())
@@ -49,4 +55,7 @@ void RunCompare(const CompareOptions& options) {
                                        ", above the limit of " + StepsText(*options.limit));
 }
 
+const Command sCompare(Group::Pictures, "compare", "Tell how far two PNG files are apart", Declare, Run);
+
+} // namespace
 } // namespace tool

@@ -1,9 +1,10 @@
 // pixelkiln boxblur: box filters along rows and columns.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Failure.h"
 #include "Formats.h"
 #include "Operations.h"
+#include "SharedWords.h"
 
 #include <algorithm>
 #include <cmath>
@@ -20,10 +21,34 @@ void RequireBlurrable(const Frame& frame) {
                                        ": only 8-bit formats of four channels are blurred; take it to one "
                                        "with --from, such as --from BGRA_4444_8u");
     if (std::min(frame.Width(), frame.Height()) < kSmallestSide)
-        throw Failure(kExitFailed, "cannot blur a frame of " + std::to_string(frame.Width()) + "x" +
-                                       std::to_string(frame.Height()) +
-                                       ": no side may be shorter than 4 pixels");
+        throw Failure(kExitFailed,
+                      "cannot blur a frame of " + SizeText(frame) + ": no side may be shorter than 4 pixels");
 }
+
+struct Options : PipeOptions {
+    BoxBlur blur = {.rows = false, .columns = false};
+};
+
+void Declare(Words& words, Options& options) {
+    AddOperation(words, options);
+    words.Take("--radius", options.blur.radius, "In pixels; fractions count").Required().Between(0.0, 1e6);
+    words.Take("--passes", options.blur.passes, "Boxes one after the other; three are near a Gaussian")
+        .Between(1, 100)
+        .ShowDefault();
+    words.Flag("--rows", options.blur.rows, "Along rows only");
+    words.Flag("--columns", options.blur.columns, "Along columns only");
+    words.Flag("--renormalise", options.blur.renormalise,
+               "Keep the borders as bright as the rest; without it they fade to black");
+}
+
+void Run(const Options& options) {
+    BoxBlur blur = options.blur;
+    if (std::isnan(blur.radius)) throw Failure(kExitUsage, "the radius is no number");
+    if (!blur.rows && !blur.columns) blur.rows = blur.columns = true;
+    PipeFramesInTheirFormat(options, OnCopy([&](Frame& frame) { Blur(frame, blur); }));
+}
+
+const Command sBoxBlur(Group::Operations, "boxblur", "Blur frames by boxes", Declare, Run);
 
 } // namespace
 
@@ -41,18 +66,6 @@ void Blur(Frame& frame, const BoxBlur& blur) {
     };
     if (blur.rows) run(0);
     if (blur.columns) run(PK_BoxBlur_Columns);
-}
-
-void RunBoxBlur(const BoxBlurOptions& options) {
-    if (std::isnan(options.radius)) throw Failure(kExitUsage, "the radius is no number");
-    const bool both = options.rows == options.columns;
-    const BoxBlur blur = {options.radius, options.passes, both || options.rows, both || options.columns,
-                          options.renormalise};
-    PipeFramesInTheirFormat(options, [&](const Frame& frame) {
-        Frame blurred = Copied(frame);
-        Blur(blurred, blur);
-        return blurred;
-    });
 }
 
 } // namespace tool

@@ -3,16 +3,16 @@
 
 #include "Chains.h"
 #include "ColourPictures.h"
-#include "Commands.h"
+#include "Command.h"
 #include "Difference.h"
 #include "Failure.h"
 #include "Formats.h"
+#include "Numbers.h"
 #include "OperationsSheet.h"
 #include "Png.h"
 #include "Sheet.h"
 #include "Terminal.h"
 
-#include <cstdio>
 #include <filesystem>
 
 namespace tool {
@@ -44,19 +44,15 @@ void MakeFolder(const std::string& folder) {
 
 std::string DifferenceText(const Difference& difference) {
     if (difference.differingPixels == 0) return "identical";
-    char text[96];
-    std::snprintf(text, sizeof(text), "largest difference %.0f of 255, PSNR %s", difference.largestColour,
-                  PsnrText(difference.psnr).c_str());
-    return text;
+    return Formatted("largest difference %.0f of 255, PSNR ", difference.largestColour) +
+           PsnrText(difference.psnr);
 }
 
 // Takes the picture to a format and back; writes what came back and tells of the way.
 Tile Visit(const Frame& picture, PK_PixelFormat stop, const std::filesystem::path& folder, size_t number) {
     const Frame there = Converted(picture, stop, kDefaultQuality);
     Frame back = Converted(there, kPictureFormat, kDefaultQuality);
-    char prefix[16];
-    std::snprintf(prefix, sizeof(prefix), "%02zu-", number);
-    WritePng(back, (folder / (prefix + FormatName(stop) + ".png")).string());
+    WritePng(back, (folder / (Formatted("%02zu-", number) + FormatName(stop) + ".png")).string());
 
     const auto chainThere = DescribeChain(kPictureFormat, stop, kDefaultQuality);
     const auto chainBack = DescribeChain(stop, kPictureFormat, kDefaultQuality);
@@ -66,17 +62,22 @@ Tile Visit(const Frame& picture, PK_PixelFormat stop, const std::filesystem::pat
     Print(Bold(FormatName(stop)) + "  " + caption + "\n" + ChainText(kPictureFormat, stop, chainThere) +
           ChainText(stop, kPictureFormat, chainBack));
 
-    Tile tile;
-    tile.title = FormatName(stop);
-    tile.caption = caption;
-    tile.pictures.push_back(std::move(back));
+    Tile tile(FormatName(stop), caption, std::move(back));
     tile.pictures.push_back(DifferencePicture(picture, tile.pictures.front(), kAmplification));
     return tile;
 }
 
-} // namespace
+struct Options {
+    std::string image;
+    std::string folder;
+};
 
-void RunDemo(const DemoOptions& options) {
+void Declare(Words& words, Options& options) {
+    words.Take("IMAGE", options.image, "PNG file").Required();
+    words.Take("OUTDIR", options.folder, "Folder for the pictures, made if it is missing").Required();
+}
+
+void Run(const Options& options) {
     const Frame picture = Converted(ReadPng(options.image), kPictureFormat, kDefaultQuality);
     MakeFolder(options.folder);
     const std::filesystem::path folder(options.folder);
@@ -101,4 +102,9 @@ void RunDemo(const DemoOptions& options) {
     Print(toneRange + " shows what tone-range compression does\n");
 }
 
+const Command sDemo(Group::Pictures, "demo",
+                    "Take a picture through formats, operations and colour spaces, and draw what they do",
+                    Declare, Run);
+
+} // namespace
 } // namespace tool

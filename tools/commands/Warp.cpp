@@ -1,11 +1,12 @@
 // pixelkiln warp: a picture drawn into a quadrilateral.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Failure.h"
 #include "Formats.h"
 #include "Numbers.h"
 #include "Operations.h"
 #include "Png.h"
+#include "SharedWords.h"
 
 #include <algorithm>
 #include <optional>
@@ -40,6 +41,42 @@ Frame Background(const Frame& picture, const std::optional<Frame>& onto) {
     return black;
 }
 
+struct Options : PipeOptions {
+    Warp warp;
+    std::string quad;
+    std::string onto;
+};
+
+void Declare(Words& words, Options& options) {
+    AddOperation(words, options);
+    words
+        .Take("--quad", options.quad,
+              "x0,y0,...,x3,y3: where the corners go, in pixels, clockwise from the top left one")
+        .Required();
+    words.Take("--onto", options.onto, "PNG file to draw on; without it, black");
+    words.Take("--feather", options.warp.feather, "Width of a soft rim in pixels; needs quality 3")
+        .Between(0.0, 1e6)
+        .ShowDefault();
+    words.Take("--opacity", options.warp.opacity, "0 to 255").Between(0, 255).ShowDefault();
+}
+
+void Run(const Options& options) {
+    const std::vector<double> numbers = ParseNumbers(options.quad, 8, "a quadrilateral x0,y0,...,x3,y3");
+    Warp warp = options.warp;
+    warp.quality = options.quality;
+    std::copy(numbers.begin(), numbers.end(), warp.quad.begin());
+    std::optional<Frame> onto;
+    if (!options.onto.empty()) onto.emplace(ReadPng(options.onto));
+    PipeFramesInTheirFormat(options, [&](const Frame& frame) {
+        RequireBlended(frame.Format());
+        Frame background = Background(frame, onto);
+        DrawWarped(frame, warp, background);
+        return background;
+    });
+}
+
+const Command sWarp(Group::Operations, "warp", "Draw frames into a quadrilateral", Declare, Run);
+
 } // namespace
 
 void DrawWarped(const Frame& picture, const Warp& warp, Frame& background) {
@@ -55,20 +92,6 @@ void DrawWarped(const Frame& picture, const Warp& warp, Frame& background) {
         /*keepSourceAlpha=*/false, picture.Format(), /*field=*/0, /*ignoreFields=*/false,
         /*featherOver=*/false, warp.feather);
     Require(result, "warp", picture);
-}
-
-void RunWarp(const WarpOptions& options) {
-    const std::vector<double> numbers = ParseNumbers(options.quad, 8, "a quadrilateral x0,y0,...,x3,y3");
-    Warp warp = {{}, options.feather, options.opacity, options.quality};
-    std::copy(numbers.begin(), numbers.end(), warp.quad.begin());
-    std::optional<Frame> onto;
-    if (!options.onto.empty()) onto.emplace(ReadPng(options.onto));
-    PipeFramesInTheirFormat(options, [&](const Frame& frame) {
-        RequireBlended(frame.Format());
-        Frame background = Background(frame, onto);
-        DrawWarped(frame, warp, background);
-        return background;
-    });
 }
 
 } // namespace tool

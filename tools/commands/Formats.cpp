@@ -1,10 +1,11 @@
 // pixelkiln formats: the catalogue of pixel formats.
 
-#include "Commands.h"
 #include "Formats.h"
-#include "Terminal.h"
 
-#include <cstdio>
+#include "Command.h"
+#include "Numbers.h"
+#include "SharedWords.h"
+#include "Terminal.h"
 
 namespace tool {
 namespace {
@@ -14,10 +15,7 @@ std::string BytesAPixel(PK_PixelFormat format) {
     constexpr int32_t kWholeGroups = 6; // pixels: whole pairs and whole groups of V210
     if (IsPlanar(format)) return "1.5";
     if (!IsRaster(format)) return "-";
-    char text[16];
-    std::snprintf(text, sizeof(text), "%.3g",
-                  PK_PixelFormatPackedRowBytes(format, kWholeGroups) / double{kWholeGroups});
-    return text;
+    return Formatted("%.3g", PK_PixelFormatPackedRowBytes(format, kWholeGroups) / double{kWholeGroups});
 }
 
 std::string Kind(PK_PixelFormat format) {
@@ -29,17 +27,16 @@ std::string FrameBytes(PK_PixelFormat format) {
     return fixed ? std::to_string(PK_PixelFormatSize(format, 0, 0)) : "-";
 }
 
-} // namespace
-
-void RunFormats(const ListOptions& options) {
+void Run(const ListOptions& options) {
     Table table({"number", "name", "kind", "bytes a pixel", "bytes a frame", "first row"});
     for (const PK_PixelFormat format : Catalogue()) {
-        char number[16];
-        std::snprintf(number, sizeof(number), "0x%x", format);
-        table.Add({number, FormatName(format), Kind(format), BytesAPixel(format), FrameBytes(format),
-                   PK_IsOriginTopLeft(format) ? "top" : "bottom"});
+        table.Add({Formatted("0x%x", format), FormatName(format), Kind(format), BytesAPixel(format),
+                   FrameBytes(format), PK_IsOriginTopLeft(format) ? "top" : "bottom"});
     }
     Print(options.csv ? table.CSV() : table.Aligned());
 }
 
+const Command sFormats(Group::Listings, "formats", "List the pixel formats", AddListing, Run);
+
+} // namespace
 } // namespace tool

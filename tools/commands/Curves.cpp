@@ -1,15 +1,15 @@
 // pixelkiln curves: the transfer functions of the colour spaces and the tone curve, as a picture.
 
 #include "ColourSpaces.h"
-#include "Commands.h"
+#include "Command.h"
 #include "Failure.h"
+#include "Numbers.h"
 #include "Operations.h"
 #include "Plot.h"
 #include "Png.h"
 #include "Terminal.h"
 
 #include <cmath>
-#include <cstdio>
 #include <filesystem>
 
 namespace tool {
@@ -80,9 +80,7 @@ std::vector<Curve> OverLuminance(std::vector<Curve> curves) {
 }
 
 std::string Short(double value) {
-    char text[32];
-    std::snprintf(text, sizeof(text), "%g", value);
-    return text;
+    return Formatted("%g", value);
 }
 
 std::vector<Tick> Ticks(const std::vector<double>& values) {
@@ -146,9 +144,24 @@ void DrawAll(cairo_t* context) {
                   kMargin + static_cast<double>(i / 2) * (kPlotHeight + kMargin), kPlotWidth, kPlotHeight});
 }
 
-} // namespace
+struct Options {
+    std::string output;
+};
 
-void RunCurves(const CurvesOptions& options) {
+constexpr const char* kNotes =
+    R"(Four plots: encoded over linear value up to 100 cd/m2 and over luminance up to 10000 cd/m2, and the tone
+curve of some slopes and knees. Every point is what the library computes.
+
+Example:
+  pixelkiln curves curves.svg
+)";
+
+void Declare(Words& words, Options& options) {
+    words.Take("OUT", options.output, "SVG or PNG file to write").Required();
+    words.Notes(kNotes);
+}
+
+void Run(const Options& options) {
     const bool svg = std::filesystem::path(options.output).extension() == ".svg";
     if (!svg && !IsPngName(options.output))
         throw Failure(kExitUsage, "'" + options.output + "' must end in .svg or .png");
@@ -157,4 +170,8 @@ void RunCurves(const CurvesOptions& options) {
     Print(options.output + ": transfer functions and tone curves\n");
 }
 
+const Command sCurves(Group::Pictures, "curves", "Draw the transfer functions and the tone curve", Declare,
+                      Run);
+
+} // namespace
 } // namespace tool

@@ -1,16 +1,17 @@
 // pixelkiln pairs: every raster format by way of every other, as a picture or as numbers.
 
 #include "Chains.h"
-#include "Commands.h"
+#include "Command.h"
 #include "Difference.h"
 #include "Failure.h"
 #include "Formats.h"
+#include "Numbers.h"
 #include "OutputFile.h"
 #include "PairsPicture.h"
 #include "Png.h"
+#include "SharedWords.h"
 #include "Terminal.h"
 
-#include <cstdio>
 #include <filesystem>
 
 namespace tool {
@@ -64,17 +65,26 @@ std::string PairsCSV(const PairTable& table) {
     for (size_t from = 0; from < table.formats.size(); ++from)
         for (size_t by = 0; by < table.formats.size(); ++by) {
             const Pair& pair = table.At(from, by);
-            char difference[32];
-            std::snprintf(difference, sizeof(difference), "%.6g", pair.largestDifference);
             text.Add({FormatName(table.formats[from]), FormatName(table.formats[by]),
-                      std::to_string(pair.stepsThere), std::to_string(pair.stepsBack), difference});
+                      std::to_string(pair.stepsThere), std::to_string(pair.stepsBack),
+                      Formatted("%.6g", pair.largestDifference)});
         }
     return text.CSV();
 }
 
-} // namespace
+struct Options {
+    std::string output;
+    std::string image;
+    int32_t quality = kDefaultQuality;
+};
 
-void RunPairs(const PairsOptions& options) {
+void Declare(Words& words, Options& options) {
+    words.Take("OUT", options.output, "SVG file for the picture, CSV file for the numbers").Required();
+    words.Take("--image", options.image, "PNG file to send; without it, colour ramps");
+    AddQuality(words, options.quality);
+}
+
+void Run(const Options& options) {
     const std::string ending = std::filesystem::path(options.output).extension().string();
     if (ending != ".svg" && ending != ".csv")
         throw Failure(kExitUsage,
@@ -91,4 +101,9 @@ void RunPairs(const PairsOptions& options) {
           std::to_string(table.formats.size()) + " formats\n");
 }
 
+const Command sPairs(Group::Pictures, "pairs",
+                     "Draw what a picture loses from every raster format to every other and back", Declare,
+                     Run);
+
+} // namespace
 } // namespace tool

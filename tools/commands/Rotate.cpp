@@ -1,9 +1,30 @@
 // pixelkiln rotate: quarter turns.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Operations.h"
+#include "SharedWords.h"
 
 namespace tool {
+namespace {
+
+struct Options : PipeOptions {
+    int32_t degrees = 0;
+};
+
+void Declare(Words& words, Options& options) {
+    AddOperation(words, options);
+    words.Take("--degrees", options.degrees, "Clockwise: 90, 180, 270, or less than 0")
+        .Required()
+        .OneOf({90, 180, 270, -90, -180, -270});
+}
+
+void Run(const Options& options) {
+    PipeFramesInTheirFormat(options, [&](const Frame& frame) { return Rotated(frame, options.degrees); });
+}
+
+const Command sRotate(Group::Operations, "rotate", "Turn frames by quarters", Declare, Run);
+
+} // namespace
 
 Frame Rotated(const Frame& frame, int32_t degrees) {
     const bool isHalfTurn = degrees % 180 == 0;
@@ -16,10 +37,6 @@ Frame Rotated(const Frame& frame, int32_t degrees) {
                        frame.Height(), frame.Format(), degreesInMemory);
     Require(result, "rotate", frame);
     return turned;
-}
-
-void RunRotate(const RotateOptions& options) {
-    PipeFramesInTheirFormat(options, [&](const Frame& frame) { return Rotated(frame, options.degrees); });
 }
 
 } // namespace tool

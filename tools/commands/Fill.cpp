@@ -1,9 +1,10 @@
 // pixelkiln fill: a frame of one colour.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Failure.h"
 #include "Numbers.h"
 #include "Operations.h"
+#include "SharedWords.h"
 
 namespace tool {
 namespace {
@@ -35,6 +36,36 @@ std::array<uint8_t, 4> ParseColour(const std::string& text) {
     return {sample(2), sample(1), sample(0), sample(3)};
 }
 
+struct Options : PipeOptions {
+    std::string colour;
+};
+
+constexpr const char* kNotes =
+    R"(A PNG is written from the format of --to, so that its losses show. 4:2:2 formats are filled in whole
+pairs of pixels, and V210 with R,G,B,A in whole groups of six: what is left of a row stays 0.
+
+Examples:
+  pixelkiln fill black.v210 --size 1920x1080 --to V210_422_10u --colour black
+  pixelkiln fill orange.png --size 640x360 --colour 255,128,0,255
+)";
+
+void Declare(Words& words, Options& options) {
+    AddOutput(words, options);
+    AddQuality(words, options.quality);
+    words.Take("--size", options.size, "Width x height of the frame, such as 1920x1080").Required();
+    words.Take("--to", options.to, "Format to fill; needed for raw frames");
+    words.Take("--colour", options.colour, "black, white, clear-black, clear-white, or R,G,B,A from 0 to 255")
+        .Required();
+    words.Flag("--packed", options.packed, "Rows of a raw frame have no padding");
+    words.Notes(kNotes);
+}
+
+void Run(const Options& options) {
+    WriteMadeFrame(options, [&](Frame& frame) { Fill(frame, options.colour); });
+}
+
+const Command sFill(Group::Frames, "fill", "Make a frame of one colour", Declare, Run);
+
 } // namespace
 
 void Fill(Frame& frame, const std::string& colour) {
@@ -50,10 +81,6 @@ void Fill(Frame& frame, const std::string& colour) {
                                               frame.Format(), pixel.data(), PK_PixelFormat_BGRA_4444_8u);
     // By rule a V210 image is filled and refused at once.
     if (!(IsV210(frame.Format()) && result == PK_ErrBadDstFormat)) Require(result, "fill", frame);
-}
-
-void RunFill(const FillOptions& options) {
-    WriteMadeFrame(options, [&](Frame& frame) { Fill(frame, options.colour); });
 }
 
 } // namespace tool
