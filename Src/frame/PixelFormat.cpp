@@ -25,7 +25,7 @@ int64_t PlanarSize(int64_t width, int64_t height) {
 int32_t BytesPerPixel(PK_PixelFormat format) noexcept {
     if (format == PK_PixelFormat_Invalid) return 0; // though its bits are those of 8-bit samples
     const bool fourChannels = IsPacked4444(format);
-    switch (format & kDepthMask) {
+    switch (DepthOf(format)) {
     case kDepth8u:
         return fourChannels ? 4 : 2;
     case kDepth10u:
@@ -39,8 +39,25 @@ int32_t BytesPerPixel(PK_PixelFormat format) noexcept {
     }
 }
 
+RowUnit UnitOfRow(PK_PixelFormat format) noexcept {
+    if (StructureOf(format) == kStructure444) return {1, BytesPerPixel(format)};
+    switch (DepthOf(format)) {
+    case kDepth8u:
+        return {2, 4};
+    case kDepth10u:
+        return kV210Unit;
+    default:
+        return {2, 16};
+    }
+}
+
+uint64_t BytesOfRow(PK_PixelFormat format, int32_t width) noexcept {
+    const RowUnit unit = UnitOfRow(format);
+    return static_cast<uint64_t>((int64_t{width} + unit.pixels - 1) / unit.pixels * unit.bytes);
+}
+
 RowLayout LayoutOfRow(PK_PixelFormat format) noexcept {
-    if (IsV210(format)) return {6, 16, 128};
+    if (IsV210(format)) return {kV210Unit.pixels, kV210Unit.bytes, 128};
     return {1, BytesPerPixel(format), Is422(format) ? 16 : 64};
 }
 
@@ -56,15 +73,8 @@ int32_t PK_PixelFormatRowBytes(PK_PixelFormat format, int32_t width) noexcept {
 }
 
 int32_t PK_PixelFormatPackedRowBytes(PK_PixelFormat format, int32_t width) noexcept {
-    if ((format & kStructureMask) == kStructure444) return WrapMultiply(width, BytesPerPixel(format));
-    switch (format & kDepthMask) {
-    case kDepth8u:
-        return WrapMultiply(WrapAdd(width, 1) / 2, 4);
-    case kDepth10u:
-        return WrapMultiply(WrapAdd(width, 5) / 6, 16);
-    default:
-        return WrapMultiply(WrapAdd(width, 1) / 2, 16);
-    }
+    const RowUnit unit = UnitOfRow(format);
+    return WrapMultiply(WrapAdd(width, unit.pixels - 1) / unit.pixels, unit.bytes);
 }
 
 int64_t PK_PixelFormatSize(PK_PixelFormat format, int32_t width, int32_t height) noexcept {
