@@ -2,7 +2,7 @@
 
 #include <PixelKiln/Rotate.h>
 
-#include "frame/PixelFormat.h"
+#include "frame/Arguments.h"
 #include "primitives/CapabilityFlags.h"
 #include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
@@ -87,7 +87,7 @@ void TurnHalf(const TransposeArea& area) {
 }
 
 constexpr bool IsPacked8u(PK_PixelFormat format) {
-    return IsPacked4444(format) && (format & kDepthMask) == kDepth8u;
+    return IsPacked4444(format) && DepthOf(format) == kDepth8u;
 }
 
 } // namespace
@@ -100,9 +100,8 @@ PK_Result PK_Transpose(const void* source, int32_t sourceRowBytes, void* dest, i
     const TransposeKernel vector = VectorKernel(pixelBytes);
     const TransposeKernel kernel = vector ? vector : PixelwiseKernel(pixelBytes);
     if (!kernel) return PK_ErrBadSrcFormat;
-    if (width < 0 || height < 0) return PK_ErrFailed;
-    if (width == 0 || height == 0) return PK_Success;
-    if (!source || !dest) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Refused)) return *result;
+    if (HasNull({source, dest})) return PK_ErrFailed;
 
     // Deliberate: only the vector form of pixels from 4 bytes on takes steps that are no multiple of the pixel as
     // they are.
@@ -116,8 +115,8 @@ PK_Result PK_RotateImage(const void* source, int32_t sourceRowBytes, void* dest,
                          int32_t width, int32_t height, PK_PixelFormat format, int32_t degrees) noexcept {
     if (!IsPacked8u(format)) return PK_ErrBadSrcFormat;
     if (degrees == 0 || degrees % 90 != 0 || degrees < -270 || degrees > 270) return PK_ErrFailed;
-    if (width < 1 || height < 1) return PK_Success;
-    if (!source || !dest) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Empty)) return *result;
+    if (HasNull({source, dest})) return PK_ErrFailed;
 
     const TransposeArea area = {static_cast<const uint8_t*>(source),
                                 WholePixels(sourceRowBytes, 4),
