@@ -19,6 +19,7 @@
 
 #include "convert/ConversionChain.h"
 #include "convert/Image.h"
+#include "convert/RowsAhead.h"
 #include "frame/RowScratch.h"
 
 #include <algorithm>
@@ -108,17 +109,21 @@ public:
 
     /// For ConvertRow alone.
     RowSource(const SourceImage& image, const ConversionChain& chain, const ChainScratch& scratch)
-        : fImage(image), fChain(chain), fScratch(scratch) {}
+        : fImage(image), fChain(chain), fScratch(scratch), fAhead(image) {}
 
     /// A row in the working format, where it lies or converted: then it stays until the next is asked for.
     const uint8_t* Row(int32_t row) const {
-        if (fTemporary == nullptr) return fImage.Row(row);
+        if (fTemporary == nullptr) {
+            fAhead.Fetch(row + 1);
+            return fImage.Row(row);
+        }
         ConvertRow(row, fTemporary);
         return fTemporary;
     }
 
     /// Writes a row in the working format to memory of the operation's own, as far as pixels go.
     void ConvertRow(int32_t row, void* destination) const {
+        fAhead.Fetch(row + 1);
         fChain.ConvertRow(fImage.Row(row), destination, fImage.width, fScratch);
     }
 
@@ -126,6 +131,7 @@ private:
     const SourceImage& fImage;
     const ConversionChain& fChain;
     ChainScratch fScratch;
+    RowsAhead fAhead;
     uint8_t* fTemporary = nullptr;
 };
 
