@@ -1,6 +1,7 @@
 // Premultiplication by alpha and its inverse, and the two kernels that expand to float on the way.
 
 #include "convert/ConversionKernels.h"
+#include "primitives/Thresholds.h"
 #include "primitives/lanes/ByteScale.h"
 #include "primitives/lanes/PixelLanes.h"
 #include "primitives/lanes/RowDriver.h"
@@ -80,7 +81,7 @@ struct Pixels32 : SampleGroup<4, 4> {
     /// c x the processor's reciprocal estimate of alpha, unrefined; below 8e-6 alpha counts as 0.
     static F32 Unscaled(F32 samples) {
         const F32 alpha = BroadcastAlpha<kAlpha>(samples);
-        const F32 least = Floats(8e-6f);
+        const F32 least = Floats(kNegligible);
         const F32 factor = ReciprocalEstimate(Max(least, alpha)); // NaN stays
         const F32 result = Select(AlphaLanes<kAlpha>(), samples, samples * factor);
         return Select(Less(alpha, least), Floats(0), result);

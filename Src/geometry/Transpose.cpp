@@ -2,6 +2,7 @@
 
 #include <PixelKiln/Rotate.h>
 
+#include "frame/Arguments.h"
 #include "frame/PixelFormat.h"
 #include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
@@ -54,7 +55,7 @@ void TurnHalf(const TransposeArea& area) {
 }
 
 constexpr bool IsPacked8u(PK_PixelFormat format) {
-    return IsPacked4444(format) && (format & kDepthMask) == kDepth8u;
+    return IsPacked4444(format) && DepthOf(format) == kDepth8u;
 }
 
 } // namespace
@@ -66,9 +67,8 @@ PK_Result PK_Transpose(const void* source, int32_t sourceRowBytes, void* dest, i
                        int32_t width, int32_t height, uint8_t pixelBytes) noexcept {
     const TransposeKernel kernel = KernelOf(pixelBytes);
     if (!kernel) return PK_ErrBadSrcFormat;
-    if (width < 0 || height < 0) return PK_ErrFailed;
-    if (width == 0 || height == 0) return PK_Success;
-    if (!source || !dest) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Refused)) return *result;
+    if (HasNull({source, dest})) return PK_ErrFailed;
 
     // Deliberate: only the vector bodies for pixels from 4 bytes on take steps that are no multiple of the pixel as
     // they are.
@@ -82,8 +82,8 @@ PK_Result PK_RotateImage(const void* source, int32_t sourceRowBytes, void* dest,
                          int32_t width, int32_t height, PK_PixelFormat format, int32_t degrees) noexcept {
     if (!IsPacked8u(format)) return PK_ErrBadSrcFormat;
     if (degrees == 0 || degrees % 90 != 0 || degrees < -270 || degrees > 270) return PK_ErrFailed;
-    if (width < 1 || height < 1) return PK_Success;
-    if (!source || !dest) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Empty)) return *result;
+    if (HasNull({source, dest})) return PK_ErrFailed;
 
     const TransposeArea area = {static_cast<const uint8_t*>(source),
                                 WholePixels(sourceRowBytes, 4),
