@@ -1,12 +1,10 @@
 // Walks the register: every body of every row kernel, over all widths and many alignments, on rows that end
 // at guard pages, against the plain body and against the slow reference.
 
-#include "convert/Fusion.h"
-#include "convert/KernelBodies.h"
 #include "convert/KernelTable.h"
 #include "frame/Capabilities.h"
-#include "reference/ReferenceKernels.h"
 #include "support/FlagScope.h"
+#include "support/KernelRows.h"
 #include "support/RowBuffer.h"
 #include "support/Samples.h"
 
@@ -24,47 +22,7 @@ namespace {
 
 using namespace PK;
 
-std::string Describe(Kernel kernel) {
-    const KernelInfo& info = Info(kernel);
-    return std::string(info.name) + " from " + PK_PixelFormatName(info.source) + " to " +
-           (info.destination == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u"
-                                                           : PK_PixelFormatName(info.destination));
-}
-
-bool IsPower(Kernel kernel) {
-    return kernel == Kernel::GammaToLinearRow || kernel == Kernel::LinearToGammaRow;
-}
-
-/// Whether a body follows the rule of the vector members where those differ from the plain one.
-bool HasVectorRule(Kernel kernel, Target target) {
-    if (Info(kernel).agreement == Agreement::Exact) return false;
-    return target >= (kernel == Kernel::Expand8uTo15uRow ? Target::sse2 : Target::ssse3);
-}
-
-int Quality(Kernel kernel) {
-    return kernel == Kernel::Upsample422To444Float32Row_Interpolate ? 4 : 0;
-}
-
-void RunReference(Kernel kernel, Target target, const void* source, void* destination, int32_t width) {
-    const KernelInfo& info = Info(kernel);
-    reference::Run(info.name, info.source, info.destination, HasVectorRule(kernel, target), source,
-                   destination, width, Quality(kernel));
-}
-
-/// The row that a kernel must give: for a fused one, what its parts give one after the other.
-void RunExpected(Kernel kernel, Target target, const void* source, void* destination, int32_t width) {
-    for (const Fusion& fusion : Fusions()) {
-        if (fusion.fused != kernel) continue;
-        std::vector<uint8_t> from, to(static_cast<size_t>(width) * 16);
-        for (const Kernel part : fusion.parts) {
-            const bool first = part == fusion.parts.front(), last = part == fusion.parts.back();
-            RunReference(part, target, first ? source : from.data(), last ? destination : to.data(), width);
-            from = to;
-        }
-        return;
-    }
-    RunReference(kernel, target, source, destination, width);
-}
+using PKTest::Describe;
 
 class KernelSweep : public testing::TestWithParam<int> {
 protected:
@@ -72,12 +30,8 @@ protected:
     const KernelInfo& info = Info(kernel);
     PKTest::Random random{static_cast<uint64_t>(GetParam())};
 
-    size_t SourceBytes(int32_t width) const {
-        return static_cast<size_t>(PK_PixelFormatPackedRowBytes(info.source, width));
-    }
-    size_t DestinationBytes(int32_t width) const {
-        return static_cast<size_t>(PK_PixelFormatPackedRowBytes(info.destination, width));
-    }
+    size_t SourceBytes(int32_t width) const { return PKTest::SourceBytes(kernel, width); }
+    size_t DestinationBytes(int32_t width) const { return PKTest::DestinationBytes(kernel, width); }
 
     /// One row through one body, compared with the reference.
     void CheckRow(Target target, int32_t width, PKTest::Placement sourcePlace,
@@ -95,12 +49,13 @@ protected:
         // The expected row stands at the same distance from a 16-byte boundary, which one kernel counts from.
         const auto offset = static_cast<int>(reinterpret_cast<uintptr_t>(destination.Data()) % 16);
         PKTest::RowBuffer expected(destination.Size(), {PKTest::Placement::kAtOffset, offset});
-        RunExpected(kernel, target, source.Data(), expected.Data(), width);
+        PKTest::RunExpected(kernel, PKTest::HasVectorRule(kernel, target), source.Data(), expected.Data(),
+                            width);
 
         ASSERT_TRUE(std::equal(before.begin(), before.end(), source.Data())) << "the source was written";
         ASSERT_TRUE(destination.MarginsIntact()) << "bytes outside the row were written";
         ASSERT_EQ("", PKTest::FirstDifference(info.destination, destination.Size(), expected.Data(),
-                                              destination.Data(), IsPower(kernel) ? 1 : 0))
+                                              destination.Data(), PKTest::UnitsOff(kernel)))
             << Describe(kernel) << ", " << TargetName(target) << ", width " << width << ", source "
             << sourcePlace << ", destination " << destinationPlace << ", seed " << random.Seed();
     }
@@ -131,7 +86,7 @@ TEST_P(KernelSweep, BodiesOfTheSameRuleAgreeToTheBit) {
         for (const bool vectorRule : {false, true}) {
             const Target* leader = nullptr;
             for (const Target& target : targets) {
-                if (HasVectorRule(kernel, target) != vectorRule) continue;
+                if (PKTest::HasVectorRule(kernel, target) != vectorRule) continue;
                 Body(kernel, target)(source.data(), leader ? other.data() : first.data(), width);
                 if (!leader) {
                     leader = &target;
