@@ -47,20 +47,20 @@ std::string FormatName(PK_PixelFormat format) {
 
 void RegisterAll() {
     for (int i = 0; i < kKernelCount; ++i)
-        for (int j = 0; j < kTargetCount; ++j) {
+        for (const Target target : kFlagTargets) {
             const auto kernel = static_cast<Kernel>(i);
-            const auto target = static_cast<Target>(j);
             if (!IsEnabled(target) || !Body(kernel, target)) continue;
-            const KernelInfo& info = Info(kernel);
-            const std::string name = std::string(info.name) + "/" + FormatName(info.source) + "/" +
-                                     FormatName(info.destination) + "/" + TargetName(target);
+            const KernelRow& info = Info(kernel);
+            const std::string name = std::string(info.name) + "/" + FormatName(info.operands.source.format) +
+                                     "/" + FormatName(info.operands.destination.format) + "/" +
+                                     TargetName(target);
             benchmark::RegisterBenchmark(name.c_str(), RunBody, kernel, target)->MinTime(0.05);
         }
 }
 
 std::vector<std::string> TargetNames() {
     std::vector<std::string> names;
-    for (int i = 0; i < kTargetCount; ++i) names.push_back(TargetName(static_cast<Target>(i)));
+    for (const Target target : kFlagTargets) names.push_back(TargetName(target));
     return names;
 }
 

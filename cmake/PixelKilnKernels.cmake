@@ -1,25 +1,27 @@
-# pixelkiln_add_kernels(TARGET INSTRUCTION_SETS FILE...)
+# pixelkiln_add_kernels(LIBRARY TARGETS FILE...)
 #
-# Compiles each X.kernels.cpp once per instruction set of the list, in the namespace named after it, and adds
-# the objects to TARGET. A further instruction set is one more word in a list below and one file in
-# Src/primitives/simd/.
+# Compiles each X.kernels.cpp once per target of the list, in the namespace named after it, and adds the objects to
+# LIBRARY. The names are those of enum Target; a further one is one more word in a list below, its flags, and its vector
+# file in Src/primitives/simd/.
 
-# Chosen by the library's capability flags.
-set(PIXELKILN_INSTRUCTION_SETS plain sse2 ssse3 sse41 avx2 avx512)
-# The colour spaces choose by the processor alone, and among other sets.
-set(PIXELKILN_COLOUR_INSTRUCTION_SETS plain sse2 sse41 avx avx2fma)
+# The offers: chosen by the library's capability flags, or by the processor alone.
+set(PIXELKILN_FLAG_TARGETS plain sse2 ssse3 sse41 avx2 avx512)
+set(PIXELKILN_PROCESSOR_TARGETS plain sse2 sse41 avx avx2fma)
 
+# Every target begins with what each processor of the architecture has, whatever a packager's flags say: what a body may
+# use follows from its target alone.
+set(baseline -march=x86-64 -mtune=generic -mno-sse3)
 # The plain bodies stay scalar: they are the form to debug, and the one that no vectoriser has touched.
-set(PIXELKILN_KERNEL_FLAGS_plain -fno-tree-vectorize -fno-tree-slp-vectorize)
-set(PIXELKILN_KERNEL_FLAGS_sse2 -msse2)
-set(PIXELKILN_KERNEL_FLAGS_ssse3 -mssse3)
-set(PIXELKILN_KERNEL_FLAGS_sse41 -msse4.1)
-set(PIXELKILN_KERNEL_FLAGS_avx -mavx)
-set(PIXELKILN_KERNEL_FLAGS_avx2 -mavx2)
-set(PIXELKILN_KERNEL_FLAGS_avx2fma -mavx2 -mfma)
+set(PIXELKILN_KERNEL_FLAGS_plain ${baseline} -fno-tree-vectorize -fno-tree-slp-vectorize)
+set(PIXELKILN_KERNEL_FLAGS_sse2 ${baseline})
+set(PIXELKILN_KERNEL_FLAGS_ssse3 ${baseline} -mssse3)
+set(PIXELKILN_KERNEL_FLAGS_sse41 ${baseline} -msse4.1)
+set(PIXELKILN_KERNEL_FLAGS_avx ${baseline} -mavx)
+set(PIXELKILN_KERNEL_FLAGS_avx2 ${baseline} -mavx2)
+set(PIXELKILN_KERNEL_FLAGS_avx2fma ${baseline} -mavx2 -mfma)
 # The C library copies what tails need: groups of this size the compiler would copy by string instructions, which
 # start slowly.
-set(PIXELKILN_KERNEL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512vl -mavx512dq -mstringop-strategy=libcall)
+set(PIXELKILN_KERNEL_FLAGS_avx512 ${baseline} -mavx512f -mavx512bw -mavx512vl -mavx512dq -mstringop-strategy=libcall)
 set(PIXELKILN_KERNEL_HEADER_plain plain)
 set(PIXELKILN_KERNEL_HEADER_sse2 vector128)
 set(PIXELKILN_KERNEL_HEADER_ssse3 vector128)
@@ -29,9 +31,9 @@ set(PIXELKILN_KERNEL_HEADER_avx2 avx2)
 set(PIXELKILN_KERNEL_HEADER_avx2fma avx2)
 set(PIXELKILN_KERNEL_HEADER_avx512 avx512)
 
-function(pixelkiln_add_kernels target instruction_sets)
-  foreach(isa IN LISTS instruction_sets)
-    set(objects ${target}_kernels_${isa})
+function(pixelkiln_add_kernels library targets)
+  foreach(target IN LISTS targets)
+    set(objects ${library}_kernels_${target})
     if(TARGET ${objects})
       target_sources(${objects} PRIVATE ${ARGN})
       continue()
@@ -39,9 +41,9 @@ function(pixelkiln_add_kernels target instruction_sets)
     add_library(${objects} OBJECT ${ARGN})
     target_link_libraries(${objects} PRIVATE pixelkiln_flags)
     target_include_directories(${objects} PRIVATE ${PROJECT_SOURCE_DIR}/Src ${PROJECT_SOURCE_DIR}/include)
-    target_compile_definitions(${objects} PRIVATE PK_TARGET=${isa}
-                               PK_TARGET_HEADER="primitives/simd/${PIXELKILN_KERNEL_HEADER_${isa}}.h")
-    target_compile_options(${objects} PRIVATE ${PIXELKILN_KERNEL_FLAGS_${isa}})
-    target_sources(${target} PRIVATE $<TARGET_OBJECTS:${objects}>)
+    target_compile_definitions(${objects} PRIVATE PK_TARGET=${target}
+                               PK_TARGET_HEADER="primitives/simd/${PIXELKILN_KERNEL_HEADER_${target}}.h")
+    target_compile_options(${objects} PRIVATE ${PIXELKILN_KERNEL_FLAGS_${target}})
+    target_sources(${library} PRIVATE $<TARGET_OBJECTS:${objects}>)
   endforeach()
 endfunction()

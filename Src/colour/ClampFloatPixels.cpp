@@ -24,7 +24,7 @@ void ClampFloatPixels(const float* source, float* destination, int32_t rows, int
         const int64_t offset = row * rowBytes / 4;
         const float* from = source + offset;
         float* to = destination + offset;
-        if (bulk > 0) FloatKernelTable::ClampFloats::Call(from, to, bulk, minValue, maxValue);
+        if (bulk > 0) FloatKernelTable::ClampFloats::Call(from, to, bulk, {minValue, maxValue});
         for (int32_t i = bulk; i < floats; ++i) to[i] = ClampSample(from[i], minValue, maxValue);
     }
 }

@@ -1,25 +1,29 @@
 // The bodies of the clamp.
 
 #include "colour/ColourKernels.h"
-#include "primitives/simd/Target.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK {
 namespace PK_TARGET {
 namespace {
 
-void Clamp(const float* source, float* destination, int32_t count, float minValue, float maxValue) {
-    const F32 least = Floats(minValue), most = Floats(maxValue);
-    for (int32_t i = 0; i < count; i += kLanes)
-        Store(destination + i, Max(Min(LoadFloats(source + i), most), least));
-}
+struct Clamp : Groups<kLanes, Each<4>, Each<4>> {
+    explicit Clamp(const FloatRange& range) : fLeast(Floats(range.least)), fMost(Floats(range.most)) {}
 
-constexpr ClampKernels kKernels = {Clamp};
+    void Group(const uint8_t* source, uint8_t* destination) const {
+        Store(destination, Max(Min(LoadFloats(source), fMost), fLeast));
+    }
+
+    F32 fLeast, fMost;
+};
+
+constexpr ClampKernels kKernels = {RowWith<Clamp>};
 
 } // namespace
 } // namespace PK_TARGET
 
 template <>
-const ClampKernels& ClampKernels::For<FloatTarget::PK_TARGET>() {
+const ClampKernels& ClampKernels::For<Target::PK_TARGET>() {
     return PK_TARGET::kKernels;
 }
 

@@ -3,16 +3,12 @@
 // The vector kernels of the colour spaces. Pixels are four floats in memory order B, G, R, A (V, U, Y, A); counts of
 // pixels are multiples of eight; matrices are nine floats row by row, as in CSMatrix. Source and destination may be one.
 
-#include "colour/FloatTargets.h"
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
-/// The pixels of a row that a kernel takes; the rest goes one by one.
-inline int32_t BulkPixels(int32_t count) {
-    return count > 0 ? count & ~7 : 0;
-}
-
 struct GammaConversion {
+    const float* matrix;
     float inExponent;
     float outExponent;
     float luma[3]; ///< The weights of R, G and B.
@@ -21,49 +17,69 @@ struct GammaConversion {
 };
 
 struct GammaKernels {
-    void (*convert)(const float* source, float* destination, int32_t count, const float* matrix,
-                    const GammaConversion& conversion);
+    RowKernelWith<GammaConversion> convert;
 
-    template <FloatTarget>
+    static constexpr const char* kFamily = "Gamma";
+    static constexpr Offer kOffer = Offer::processor;
+    template <Target>
     static const GammaKernels& For();
 };
 
+/// From a signal, by a table of linear values, to the hub.
+struct SignalDecoding {
+    const float* matrix;
+    const float* table; ///< PQDecodeTable or HLGDecodeTable.
+};
+
+struct PQEncoding {
+    const float* matrix;
+    float outScale; ///< Factor on the signal.
+};
+
 struct PQKernels {
-    /// \param table  PQDecodeTable
-    void (*toRec709)(const float* source, float* destination, int32_t count, const float* matrix,
-                     const float* table);
+    RowKernelWith<SignalDecoding> toRec709;
+    RowKernelWith<PQEncoding> fromRec709;
 
-    /// \param outScale  factor on the signal.
-    void (*fromRec709)(const float* source, float* destination, int32_t count, const float* matrix,
-                       float outScale);
-
-    template <FloatTarget>
+    static constexpr const char* kFamily = "PQ";
+    static constexpr Offer kOffer = Offer::processor;
+    template <Target>
     static const PQKernels& For();
 };
 
-struct HLGKernels {
-    /// \param table  HLGDecodeTable
-    void (*toRec709)(const float* source, float* destination, int32_t count, const float* matrix,
-                     const float* table);
-    void (*fromRec709)(const float* source, float* destination, int32_t count, const float* matrix);
+struct HLGEncoding {
+    const float* matrix;
+};
 
-    template <FloatTarget>
+struct HLGKernels {
+    RowKernelWith<SignalDecoding> toRec709;
+    RowKernelWith<HLGEncoding> fromRec709;
+
+    static constexpr const char* kFamily = "HLG";
+    static constexpr Offer kOffer = Offer::processor;
+    template <Target>
     static const HLGKernels& For();
 };
 
 struct YUVKernels {
-    void (*toRGB)(const float* source, float* destination, int32_t count);
-    void (*fromRGB)(const float* source, float* destination, int32_t count);
+    RowKernel toRGB;
+    RowKernel fromRGB;
 
-    template <FloatTarget>
+    static constexpr const char* kFamily = "YUV";
+    static constexpr Offer kOffer = Offer::processor;
+    template <Target>
     static const YUVKernels& For();
 };
 
-struct ClampKernels {
-    /// \param count  floats, a multiple of 32.
-    void (*clamp)(const float* source, float* destination, int32_t count, float minValue, float maxValue);
+struct FloatRange {
+    float least, most;
+};
 
-    template <FloatTarget>
+struct ClampKernels {
+    RowKernelWith<FloatRange> clamp; ///< Counts floats, a multiple of 32.
+
+    static constexpr const char* kFamily = "Clamp";
+    static constexpr Offer kOffer = Offer::processor;
+    template <Target>
     static const ClampKernels& For();
 };
 

@@ -3,24 +3,30 @@
 // What the kernels of the colour spaces share: signs put aside for the powers, matrices, and weights. Channels are arrays
 // in memory order: blue, green, red.
 
+#include "primitives/lanes/RowDriver.h"
 #include "primitives/simd/MultiplyAdd.h"
-#include "primitives/simd/Target.h"
 
 namespace PK::PK_TARGET {
 
-/// Runs a function on the three colour channels of kLanes pixels after the other; alpha is copied.
-/// \param count    a multiple of kLanes.
-/// \param convert  changes the channels in place.
+/// A function on the three colour channels of kLanes pixels, which changes them in place; alpha is copied.
 template <class Convert>
-inline void ForPixelGroups(const float* source, float* destination, int32_t count, const Convert convert) {
-    for (; count > 0; count -= kLanes) {
+struct ColourGroup : PixelGroup<16, 16> {
+    explicit ColourGroup(const Convert& convert) : fConvert(convert) {}
+
+    void Group(const uint8_t* source, uint8_t* destination) const {
         const Channels pixels = LoadFloatChannels(source);
         F32 colour[3] = {pixels.c0, pixels.c1, pixels.c2};
-        convert(colour);
+        fConvert(colour);
         StoreFloatChannels(destination, {colour[0], colour[1], colour[2], pixels.c3});
-        source += 4 * kLanes;
-        destination += 4 * kLanes;
     }
+
+    Convert fConvert;
+};
+
+/// \param convert  what it has of constants it holds by value.
+template <class Convert>
+inline void ForPixelGroups(const void* source, void* destination, ptrdiff_t count, const Convert& convert) {
+    RunRow(ColourGroup<Convert>(convert), count, destination, source);
 }
 
 struct Signs {

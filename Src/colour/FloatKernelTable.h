@@ -3,6 +3,7 @@
 // The kernels of the colour spaces, each bound to the processor at its first call.
 
 #include "colour/ColourKernels.h"
+#include "primitives/Dispatch.h"
 
 #include <atomic>
 
@@ -20,7 +21,7 @@ public:
 
 private:
     static void Bind(Arguments... arguments) {
-        const auto kernel = KernelsFor<Kernels>(BestFloatTarget()).*kKernel;
+        const auto kernel = Best<Kernels>().*kKernel;
         sKernel.store(kernel, std::memory_order_relaxed);
         kernel(arguments...);
     }

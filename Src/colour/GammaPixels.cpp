@@ -13,9 +13,9 @@ void ConvertGammaPixels(const float* source, float* destination, int32_t count, 
     const bool needMatrix = !IsIdentity(matrix);
     const int32_t bulk = BulkPixels(count);
     if (bulk > 0) {
-        const GammaConversion conversion = {
-            inExponent, outExponent, {luma[0], luma[1], luma[2]}, needMatrix, gamutClip};
-        FloatKernelTable::ConvertGammaKernel::Call(source, destination, bulk, matrix.m, conversion);
+        const GammaConversion conversion = {matrix.m,   inExponent, outExponent, {luma[0], luma[1], luma[2]},
+                                            needMatrix, gamutClip};
+        FloatKernelTable::ConvertGammaKernel::Call(source, destination, bulk, conversion);
     }
     const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
     ForPixels(source + done, destination + done, count - bulk, [&](RGB c) {

@@ -10,12 +10,11 @@ namespace PK_TARGET {
 namespace {
 
 template <bool kMatrix, bool kClip>
-void ConvertAs(const float* source, float* destination, int32_t count, const float* matrix,
-               const GammaConversion& conversion) {
+void ConvertAs(const void* source, void* destination, ptrdiff_t count, const GammaConversion& conversion) {
     const F32 inExponent = Floats(conversion.inExponent), outExponent = Floats(conversion.outExponent);
-    const MatrixLanes lanes(matrix);
+    const MatrixLanes lanes(conversion.matrix);
     const Weights luma(conversion.luma);
-    ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
+    ForPixelGroups(source, destination, count, [=](F32(&colour)[3]) {
         Signs signs = TakeSigns(colour);
         ApproxPow(colour, inExponent);
         if constexpr (kMatrix) {
@@ -29,12 +28,11 @@ void ConvertAs(const float* source, float* destination, int32_t count, const flo
     });
 }
 
-void Convert(const float* source, float* destination, int32_t count, const float* matrix,
-             const GammaConversion& conversion) {
+void Convert(const void* source, void* destination, ptrdiff_t count, const GammaConversion& conversion) {
     const auto convert = !conversion.needMatrix ? ConvertAs<false, false>
                          : conversion.gamutClip ? ConvertAs<true, true>
                                                 : ConvertAs<true, false>;
-    convert(source, destination, count, matrix, conversion);
+    convert(source, destination, count, conversion);
 }
 
 constexpr GammaKernels kKernels = {Convert};
@@ -43,7 +41,7 @@ constexpr GammaKernels kKernels = {Convert};
 } // namespace PK_TARGET
 
 template <>
-const GammaKernels& GammaKernels::For<FloatTarget::PK_TARGET>() {
+const GammaKernels& GammaKernels::For<Target::PK_TARGET>() {
     return PK_TARGET::kKernels;
 }
 

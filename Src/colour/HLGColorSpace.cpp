@@ -1,10 +1,10 @@
-#include "colour/CpuFeatures.h"
 #include "colour/DecodeTables.h"
 #include "colour/FloatKernelTable.h"
 #include "colour/HDRCurves.h"
 #include "colour/HubExponents.h"
 #include "colour/MatrixPixel.h"
 #include "colour/Rec2020Matrices.h"
+#include "primitives/CpuFeatures.h"
 
 #include <algorithm>
 
@@ -44,7 +44,7 @@ void HLGColorSpace::ConvertPixelsFromRec709(const float* source, float* destinat
                                             bool) const {
     const CSMatrix& matrix = Rec709ToRec2020();
     const int32_t bulk = BulkPixels(count);
-    if (bulk > 0) FloatKernelTable::Rec709ToHLGKernel::Call(source, destination, bulk, matrix.m);
+    if (bulk > 0) FloatKernelTable::Rec709ToHLGKernel::Call(source, destination, bulk, {matrix.m});
     const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
     ForPixels(source + done, destination + done, count - bulk, [&](RGB c) {
         const RGB linear =
@@ -64,7 +64,7 @@ void HLGColorSpace::ConvertPixelsToRec709(const float* source, float* destinatio
     const CSMatrix& matrix = Rec2020ToRec709();
     const float* table = HLGDecodeTable();
     const int32_t bulk = CpuFeatures::Flags().sse3 ? BulkPixels(count) : 0;
-    if (bulk > 0) FloatKernelTable::HLGToRec709Kernel::Call(source, destination, bulk, matrix.m, table);
+    if (bulk > 0) FloatKernelTable::HLGToRec709Kernel::Call(source, destination, bulk, {matrix.m, table});
     const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
     ForPixels(source + done, destination + done, count - bulk, [&](RGB c) {
         const RGB scene =

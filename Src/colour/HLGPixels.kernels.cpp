@@ -8,12 +8,12 @@ namespace PK {
 namespace PK_TARGET {
 namespace {
 
-void ToRec709(const float* source, float* destination, int32_t count, const float* matrix,
-              const float* table) {
+void ToRec709(const void* source, void* destination, ptrdiff_t count, const SignalDecoding& decoding) {
+    const float* const table = decoding.table;
     const F32 ootfExponent = Floats(HLG::kOOTFExponent);
     const Weights luma(HLG::kLuma);
-    const MatrixLanes lanes(matrix);
-    ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
+    const MatrixLanes lanes(decoding.matrix);
+    ForPixelGroups(source, destination, count, [=](F32(&colour)[3]) {
         LookUpSignals(colour, table, 2047);
         F32 gain[1] = {luma.Sum(colour)};
         ApproxPow(gain, ootfExponent);
@@ -33,11 +33,11 @@ inline F32 Encode(F32 E) {
     return Select(isRoot, root, MultiplyAdd(logarithm, Floats(HLG::kA), Floats(HLG::kC)));
 }
 
-void FromRec709(const float* source, float* destination, int32_t count, const float* matrix) {
+void FromRec709(const void* source, void* destination, ptrdiff_t count, const HLGEncoding& encoding) {
     const F32 ootfExponent = Floats(HLG::kInverseOOTFExponent);
     const Weights luma(HLG::kLuma);
-    const MatrixLanes lanes(matrix);
-    ForPixelGroups(source, destination, count, [&](F32(&colour)[3]) {
+    const MatrixLanes lanes(encoding.matrix);
+    ForPixelGroups(source, destination, count, [=](F32(&colour)[3]) {
         const Signs signs = DecodeHub(colour, lanes);
         for (F32& c : colour) c = c * Floats(HLG::kLinearScale);
         F32 power[1] = {luma.Sum(colour)};
@@ -54,7 +54,7 @@ constexpr HLGKernels kKernels = {ToRec709, FromRec709};
 } // namespace PK_TARGET
 
 template <>
-const HLGKernels& HLGKernels::For<FloatTarget::PK_TARGET>() {
+const HLGKernels& HLGKernels::For<Target::PK_TARGET>() {
     return PK_TARGET::kKernels;
 }
 

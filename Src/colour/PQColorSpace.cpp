@@ -1,11 +1,11 @@
 #include "colour/Caches.h"
-#include "colour/CpuFeatures.h"
 #include "colour/DecodeTables.h"
 #include "colour/FloatKernelTable.h"
 #include "colour/GamutClip.h"
 #include "colour/HDRCurves.h"
 #include "colour/HubExponents.h"
 #include "colour/MatrixPixel.h"
+#include "primitives/CpuFeatures.h"
 
 #include <algorithm>
 
@@ -86,7 +86,7 @@ void PQColorSpace::ConvertPixelsFromRec709(const float* source, float* destinati
     });
     const float outScale = hasScale ? PQ::kPerSignalOf100 : 1.0f;
     const int32_t bulk = BulkPixels(count);
-    if (bulk > 0) FloatKernelTable::Rec709ToPQKernel::Call(source, destination, bulk, matrix.m, outScale);
+    if (bulk > 0) FloatKernelTable::Rec709ToPQKernel::Call(source, destination, bulk, {matrix.m, outScale});
     const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
     ForPixels(source + done, destination + done, count - bulk, [&](RGB c) {
         const RGB linear =
@@ -106,7 +106,7 @@ void PQColorSpace::ConvertPixelsToRec709(const float* source, float* destination
     if (!hasScale && !gamutClip) {
         const float* table = PQDecodeTable();
         const int32_t bulk = CpuFeatures::Flags().sse3 ? BulkPixels(count) : 0;
-        if (bulk > 0) FloatKernelTable::PQToRec709Kernel::Call(source, destination, bulk, matrix.m, table);
+        if (bulk > 0) FloatKernelTable::PQToRec709Kernel::Call(source, destination, bulk, {matrix.m, table});
         const ptrdiff_t done = 4 * static_cast<ptrdiff_t>(bulk);
         const auto decode = [table](float v) { return table[SignalIndex(v, kPQDecodeEntries)]; };
         ForPixels(source + done, destination + done, count - bulk,

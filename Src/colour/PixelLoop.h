@@ -7,6 +7,11 @@
 
 namespace PK {
 
+/// The pixels of a row that a kernel takes; the rest goes one by one.
+inline int32_t BulkPixels(int32_t count) {
+    return count > 0 ? count & ~7 : 0;
+}
+
 /// The colour of a pixel; the names are right on the RGB side.
 struct RGB {
     float r, g, b;

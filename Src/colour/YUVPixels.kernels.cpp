@@ -2,46 +2,46 @@
 // memory order.
 
 #include "colour/ColourKernels.h"
+#include "primitives/lanes/RowDriver.h"
 #include "primitives/simd/MultiplyAdd.h"
 
 namespace PK {
 namespace PK_TARGET {
 namespace {
 
-template <class Convert>
-void ForPixelVectors(const float* source, float* destination, int32_t count, const Convert convert) {
-    for (; count > 0; count -= kLanes / 4) {
-        Store(destination, convert(LoadFloats(source)));
-        source += kLanes;
-        destination += kLanes;
-    }
-}
+/// The pixels of one vector.
+using PixelVector = Groups<kLanes / 4, Each<16>, Each<16>>;
 
-void ToRGB(const float* source, float* destination, int32_t count) {
-    const F32 ofV = PixelFloats(0, -0.5713f, 1.4746f, 0), ofU = PixelFloats(1.8814f, -0.1645f, 0, 0);
-    ForPixelVectors(source, destination, count, [=](F32 pixels) {
+struct YUVToRGB : PixelVector {
+    void Group(const uint8_t* source, uint8_t* destination) const {
+        const F32 pixels = LoadFloats(source);
         const F32 V = ShufflePixel<0, 0, 0, 0>(pixels), U = ShufflePixel<1, 1, 1, 1>(pixels);
-        return MultiplyAdd(V, ofV, MultiplyAdd(U, ofU, ShufflePixel<2, 2, 2, 3>(pixels)));
-    });
-}
+        Store(destination, MultiplyAdd(V, fOfV, MultiplyAdd(U, fOfU, ShufflePixel<2, 2, 2, 3>(pixels))));
+    }
 
-// The fourth lane of the blue weights is 1 and that of the red ones 0: blue takes the place of alpha.
-void FromRGB(const float* source, float* destination, int32_t count) {
-    const F32 ofR = PixelFloats(0.5f, -0.1396f, 0.2627f, 0), ofG = PixelFloats(-0.4598f, -0.3604f, 0.678f, 0),
-              ofB = PixelFloats(-0.0402f, 0.5f, 0.0593f, 1);
-    ForPixelVectors(source, destination, count, [=](F32 pixels) {
+    F32 fOfV = PixelFloats(0, -0.5713f, 1.4746f, 0), fOfU = PixelFloats(1.8814f, -0.1645f, 0, 0);
+};
+
+/// The fourth lane of the blue weights is 1 and that of the red ones 0: blue takes the place of alpha.
+struct RGBToYUV : PixelVector {
+    void Group(const uint8_t* source, uint8_t* destination) const {
+        const F32 pixels = LoadFloats(source);
         const F32 B = ShufflePixel<0, 0, 0, 0>(pixels), G = ShufflePixel<1, 1, 1, 1>(pixels);
-        return MultiplyAdd(B, ofB, MultiplyAdd(G, ofG, ShufflePixel<2, 2, 2, 3>(pixels) * ofR));
-    });
-}
+        Store(destination,
+              MultiplyAdd(B, fOfB, MultiplyAdd(G, fOfG, ShufflePixel<2, 2, 2, 3>(pixels) * fOfR)));
+    }
 
-constexpr YUVKernels kKernels = {ToRGB, FromRGB};
+    F32 fOfR = PixelFloats(0.5f, -0.1396f, 0.2627f, 0), fOfG = PixelFloats(-0.4598f, -0.3604f, 0.678f, 0),
+        fOfB = PixelFloats(-0.0402f, 0.5f, 0.0593f, 1);
+};
+
+constexpr YUVKernels kKernels = {Row<YUVToRGB>, Row<RGBToYUV>};
 
 } // namespace
 } // namespace PK_TARGET
 
 template <>
-const YUVKernels& YUVKernels::For<FloatTarget::PK_TARGET>() {
+const YUVKernels& YUVKernels::For<Target::PK_TARGET>() {
     return PK_TARGET::kKernels;
 }
 

@@ -1,7 +1,7 @@
 // Picks pixels from two rows by the bits of a mask.
 
 #include "composite/MaskKernels.h"
-#include "primitives/simd/Target.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -21,45 +21,38 @@ struct LaneBits {
 template <int kPixelLanes>
 constexpr LaneBits<kPixelLanes> kLaneBits;
 
-template <int kPixelLanes>
-void SelectGroup(const uint8_t* first, const uint8_t* second, int32_t maskBits, uint8_t* destination) {
-    const I32 bits = Ints(maskBits);
-    for (int lane = 0; lane < kGroup * kPixelLanes; lane += kLanes) {
-        const I32 bit = LoadInts(kLaneBits<kPixelLanes>.bit + lane);
-        const I32 chosen = Equal(bits & bit, bit);
-        Store(destination + 4 * lane,
-              Select(chosen, LoadInts(first + 4 * lane), LoadInts(second + 4 * lane)));
-    }
-}
-
+/// A byte of the mask for eight pixels, the first in its highest bit.
 template <int kPixelBytes>
-void SelectSingly(const uint8_t* first, const uint8_t* second, const uint8_t* mask, int32_t bit,
-                  uint8_t* destination, int32_t width) {
-    for (int32_t i = 0; i < width; ++i, ++bit) {
-        const bool isSet = (mask[bit / 8] << bit % 8 & 0x80) != 0;
-        std::memmove(destination, isSet ? first : second, kPixelBytes); // may be the place itself
-        first += kPixelBytes;
-        second += kPixelBytes;
-        destination += kPixelBytes;
+struct SelectByBits : Groups<kGroup, Each<kPixelBytes>, Each<kPixelBytes>, Each<kPixelBytes>, Each<1, 8>> {
+    static void Group(const uint8_t* first, const uint8_t* second, const uint8_t* mask,
+                      uint8_t* destination) {
+        constexpr int kPixelLanes = kPixelBytes / 4;
+        const I32 bits = Ints(mask[0] << 8 | mask[1]);
+        for (int lane = 0; lane < kGroup * kPixelLanes; lane += kLanes) {
+            const I32 bit = LoadInts(kLaneBits<kPixelLanes>.bit + lane);
+            const I32 chosen = Equal(bits & bit, bit);
+            Store(destination + 4 * lane,
+                  Select(chosen, LoadInts(first + 4 * lane), LoadInts(second + 4 * lane)));
+        }
     }
-}
+};
 
-/// The part of the first byte, then whole bytes by twos, then what is left.
+/// The part of the first byte, moved to its highest bits, then whole bytes.
 template <int kPixelBytes>
-void SelectRow(const uint8_t* first, const uint8_t* second, const uint8_t* mask, int32_t bit,
-               uint8_t* destination, int32_t width) {
-    constexpr int kPixelLanes = kPixelBytes / 4;
-    const int32_t toBoundary = -bit & 7;
+void SelectRow(const void* firstRow, const void* secondRow, void* destination, int32_t width,
+               const MaskRow& mask) {
+    const auto* first = static_cast<const uint8_t*>(firstRow);
+    const auto* second = static_cast<const uint8_t*>(secondRow);
+    const uint8_t* bytes = mask.bytes;
+    const int32_t toBoundary = -mask.first & 7;
     const int32_t head = toBoundary < width ? toBoundary : width;
-    SelectSingly<kPixelBytes>(first, second, mask, bit, destination, head);
-    mask += (bit + head) / 8;
-    ptrdiff_t at = ptrdiff_t{head} * kPixelBytes;
-    for (width -= head; width >= kGroup; width -= kGroup) {
-        SelectGroup<kPixelLanes>(first + at, second + at, mask[0] << 8 | mask[1], destination + at);
-        mask += 2;
-        at += kGroup * kPixelBytes;
+    if (head > 0) {
+        const auto firstBits = static_cast<uint8_t>(*bytes++ << mask.first);
+        RunRow(SelectByBits<kPixelBytes>(), head, destination, first, second, &firstBits);
     }
-    SelectSingly<kPixelBytes>(first + at, second + at, mask, 0, destination + at, width);
+    const ptrdiff_t at = ptrdiff_t{head} * kPixelBytes;
+    RunRow(SelectByBits<kPixelBytes>(), width - head, static_cast<uint8_t*>(destination) + at, first + at,
+           second + at, bytes);
 }
 
 } // namespace

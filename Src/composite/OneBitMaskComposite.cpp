@@ -65,8 +65,8 @@ void SelectRows(const MaskInput& first, uint8_t* firstRow, const MaskInput& seco
                 const ChainScratch& scratch, const Mask& mask, const DestinationImage& destination) {
     const MaskKernels::Select select = KernelFor(destination.format);
     for (int32_t row = 0; row < destination.height; ++row) {
-        select(first.Row(row, firstRow, scratch), second.Row(row, secondRow, scratch),
-               mask.bits + row * mask.rowBytes, mask.firstBit, destination.Row(row), destination.width);
+        select(first.Row(row, firstRow, scratch), second.Row(row, secondRow, scratch), destination.Row(row),
+               destination.width, {mask.bits + row * mask.rowBytes, mask.firstBit});
     }
 }
 

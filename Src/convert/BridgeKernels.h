@@ -3,51 +3,58 @@
 // The row kernels of the codec bridges, one structure a kernel source. Kernel sources include this header, so
 // it holds nothing that the compiler could emit once per instruction set.
 
-#include "primitives/simd/Targets.h"
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
-/// Converts one row, or any run of `width` pixels. The rows may be the same where both layouts are.
-using BridgeRow = void (*)(const void* source, void* destination, int32_t width);
-
 struct RGB8Kernels {
-    BridgeRow toBGRA;
+    RowKernel toBGRA;
 
+    static constexpr const char* kFamily = "RGB8";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const RGB8Kernels& For();
 };
 
 struct DNxHDKernels {
-    BridgeRow toRGB10;
-    BridgeRow fromRGB10;
+    RowKernel toRGB10;
+    RowKernel fromRGB10;
 
+    static constexpr const char* kFamily = "DNxHD";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const DNxHDKernels& For();
 };
 
 struct UYVY10Kernels {
-    BridgeRow toV210; // whole groups only
-    BridgeRow fromV210;
+    RowKernel toV210; // whole groups only
+    RowKernel fromV210;
 
+    static constexpr const char* kFamily = "UYVY10";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const UYVY10Kernels& For();
 };
 
 struct J2KKernels {
-    BridgeRow bgr16ToRGB10;
-    BridgeRow rgb10ToBGR16;
-    BridgeRow offsetUYVY32f;
-    BridgeRow zyxToBGR32f;
+    RowKernel bgr16ToRGB10;
+    RowKernel rgb10ToBGR16;
+    RowKernel offsetUYVY32f;
+    RowKernel zyxToBGR32f;
 
+    static constexpr const char* kFamily = "J2K";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const J2KKernels& For();
 };
 
 struct Words15uKernels {
-    BridgeRow rgb10WordsToXRGB; // truncates below SSE4.1, rounds from there up
-    BridgeRow halve;
-    BridgeRow swapAndHalve;
+    RowKernel rgb10WordsToXRGB; // truncates below SSE4.1, rounds from there up
+    RowKernel halve;
+    RowKernel swapAndHalve;
 
+    static constexpr const char* kFamily = "Words15u";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const Words15uKernels& For();
 };
@@ -65,6 +72,8 @@ struct W210Kernels {
     PlanesRow quarterToV210;
     PlanesRow quarterToVUYX;
 
+    static constexpr const char* kFamily = "W210";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const W210Kernels& For();
 };

@@ -40,7 +40,7 @@ struct Rows {
 using SourceRows = Rows<const uint8_t>;
 using DestinationRows = Rows<uint8_t>;
 
-inline void ConvertRows(BridgeRow convert, SourceRows source, DestinationRows destination, int32_t width,
+inline void ConvertRows(RowKernel convert, SourceRows source, DestinationRows destination, int32_t width,
                         int32_t height) {
     for (int32_t row = 0; row < height; ++row) convert(source[row], destination[row], width);
 }

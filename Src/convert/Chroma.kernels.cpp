@@ -1,8 +1,8 @@
 // Chroma resampling between 4:4:4 and 4:2:2. The chroma of a pair stands at its even pixel.
 
 #include "convert/ChromaPairs.h"
+#include "convert/ConversionKernels.h"
 #include "convert/DownsampleRow.h"
-#include "convert/Kernel.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -25,11 +25,7 @@ struct PackedVUYA {
 
 /// (c[i-1] + 2 c[i] + c[i+1]) x 0.25. At the row's first pixel c[i-1] is c[i], whose sum with 2 c[i] is 3
 /// c[i] rounded once.
-struct Downsample32f : Neighbours<1, 16, 1, 0> {
-    static constexpr int32_t kPixels = kLanes / 2;
-    static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 2;
-    static constexpr int32_t kSourceBytes = 8 * kLanes, kDestinationBytes = 4 * kLanes;
-
+struct Downsample32f : Groups<kLanes / 2, Each<16, 2>, Neighbours<Each<16>, 1, 0>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const F32 previous = LoadFloatBlocks(source - 16, 32);
         const F32 even = LoadFloatBlocks(source, 32);
@@ -50,11 +46,10 @@ struct Downsample32f : Neighbours<1, 16, 1, 0> {
 
 void DownsampleRow32f(const void* source, void* destination, int32_t width) {
     const int32_t paired = width / 2 * 2;
-    WindowRow<Downsample32f>(source, destination, paired);
+    RunRow(Downsample32f(), paired, destination, source);
     if (paired < width)
-        Downsample32f::LonePixel(static_cast<const uint8_t*>(source) + SourceBytes<Downsample32f>(paired),
-                                 static_cast<uint8_t*>(destination) +
-                                     DestinationBytes<Downsample32f>(paired));
+        Downsample32f::LonePixel(static_cast<const uint8_t*>(source) + ptrdiff_t{16} * paired,
+                                 static_cast<uint8_t*>(destination) + ptrdiff_t{8} * paired);
 }
 
 /// U, Y0, V, Y1 with a pair a block, to the even or the odd pixel's V, U, Y and an opaque alpha.
@@ -63,17 +58,11 @@ inline F32 PixelsOfPairs(F32 uyvy) {
     return BlendBlocks<0b0111>(ShufflePixel<2, 0, kLuma, 3>(uyvy), Floats(1));
 }
 
-struct FloatPairs {
-    static constexpr int32_t kPixels = kLanes / 2;
-    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 1;
-    static constexpr int32_t kSourceBytes = 4 * kLanes, kDestinationBytes = 8 * kLanes;
-};
-
 inline void StorePixels(uint8_t* destination, F32 evenPairs, F32 oddPairs) {
     StoreBlocksInTurns(destination, PixelsOfPairs<1>(evenPairs), PixelsOfPairs<3>(oddPairs));
 }
 
-struct Repeat32f : FloatPairs, NoNeighbours {
+struct Repeat32f : Groups<kLanes / 2, Each<16>, Each<16, 2>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const F32 pairs = LoadFloats(source);
         StorePixels(destination, pairs, pairs);
@@ -81,7 +70,7 @@ struct Repeat32f : FloatPairs, NoNeighbours {
 };
 
 /// The odd pixel's chroma is (9 (c[k] + c[k+1]) - c[k-1] - c[k+2]) x 0.0625 over the pairs k.
-struct Interpolate32f : FloatPairs, Neighbours<2, 16, 1, 2> {
+struct Interpolate32f : Groups<kLanes / 2, Each<16>, Neighbours<Each<16, 2>, 1, 2>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const F32 pairs = LoadFloats(source);
         const F32 inner = Floats(9) * (pairs + LoadFloats(source + 16));
@@ -94,15 +83,15 @@ struct Interpolate32f : FloatPairs, Neighbours<2, 16, 1, 2> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::ChromaBodies<PK::Target::PK_TARGET>() {
+const PK::ChromaKernels& PK::ChromaKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::Downsample444To422Row, DownsampleRow<PackedVUYA>},
-        {Kernel::Downsample444To422Float32Row, DownsampleRow32f},
-        {Kernel::Upsample422To444Row_UYVY, WindowRow<UpsamplePairs<false, PixelVUYX>>},
-        {Kernel::Upsample422To444Row_YUYV, WindowRow<UpsamplePairs<true, PixelVUYX>>},
-        {Kernel::Upsample422To444Float32Row_Repeat, WindowRow<Repeat32f>},
-        {Kernel::Upsample422To444Float32Row_Interpolate, WindowRow<Interpolate32f>},
+    static constexpr ChromaKernels kernels = {
+        .Downsample444To422Row = DownsampleRow<PackedVUYA>,
+        .Downsample444To422Float32Row = DownsampleRow32f,
+        .Upsample422To444Row_UYVY = Row<UpsamplePairs<false, PixelVUYX>>,
+        .Upsample422To444Row_YUYV = Row<UpsamplePairs<true, PixelVUYX>>,
+        .Upsample422To444Float32Row_Repeat = Row<Repeat32f>,
+        .Upsample422To444Float32Row_Interpolate = Row<Interpolate32f>,
     };
-    return bodies;
+    return kernels;
 }

@@ -2,7 +2,7 @@
 
 // Pairs of 4:2:2 pixels in lanes, and their conversion to pixels with chroma of their own.
 
-#include "convert/RowWindows.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 
@@ -52,11 +52,7 @@ struct PixelVUYX {
 /// 8-bit 4:2:2 to pixels of four bytes. The vector form from SSSE3 up rounds the average up, the plain form
 /// and SSE2 truncate: this is deliberate, hosts compare against both.
 template <bool kLumaFirst, class Pixel>
-struct UpsamplePairs : Neighbours<2, 4, 0, 1> {
-    static constexpr int32_t kPixels = 2 * kLanes;
-    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 1;
-    static constexpr int32_t kSourceBytes = 4 * kLanes, kDestinationBytes = 8 * kLanes;
-
+struct UpsamplePairs : Groups<2 * kLanes, Each<4>, Neighbours<Each<4, 2>, 0, 1>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 nextChroma = LoadPairs<kLumaFirst>(source + 4).chroma;
         I32 low, high;

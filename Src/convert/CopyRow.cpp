@@ -14,13 +14,14 @@ void CopyRow(const void* source, void* destination, int32_t width) {
 
 } // namespace
 
-const std::array<KernelBody, 6> kCopyBodies = {{
-    {Kernel::CopyRow_4444_8u, CopyRow<1, 4>},
-    {Kernel::CopyRow_4444_15u, CopyRow<1, 8>},
-    {Kernel::CopyRow_4444_32f, CopyRow<1, 16>},
-    {Kernel::CopyRow_422_8u, CopyRow<2, 4>},
-    {Kernel::CopyRow_422_32f, CopyRow<2, 16>},
-    {Kernel::CopyRow_V210, CopyRow<6, 16>},
-}};
+constinit const CopyKernels CopyKernels::kBodies = {
+    .CopyRow_4444_8u = CopyRow<1, 4>,
+    .CopyRow_4444_15u = CopyRow<1, 8>,
+    .CopyRow_4444_32f = CopyRow<1, 16>,
+    .CopyRow_422_8u = CopyRow<2, 4>,
+    .CopyRow_422_32f = CopyRow<2, 16>,
+    .CopyRow_V210 = CopyRow<6, 16>,
+};
+constinit const CopyKernels CopyKernels::kNone = {};
 
 } // namespace PK

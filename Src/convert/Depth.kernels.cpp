@@ -1,8 +1,8 @@
 // Changes of sample depth between bytes, 15-bit words and floats.
 
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
 #include "convert/Samples.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -101,16 +101,11 @@ struct ScaleBytesTo15u : SampleGroup<1, 2, 1, 2> {
 
 /// The plain body gives the quotient. The vector bodies give it for the pixels that start before the first
 /// 16-byte boundary of the destination, and the rounded form after it; hosts compare against both.
-void Expand8uTo15uRow(const void* source, void* destination, int32_t width) {
-    int32_t head = width;
-    if constexpr (Target::PK_TARGET != Target::plain) {
-        const auto bytesToBoundary = static_cast<int32_t>(-reinterpret_cast<uintptr_t>(destination) & 15);
-        const int32_t pixelsToBoundary = (bytesToBoundary + 7) / 8;
-        if (head > pixelsToBoundary) head = pixelsToBoundary;
-    }
-    Row<ScaleBytesTo15u<0>>(source, destination, head);
-    Row<ScaleBytesTo15u<1>>(static_cast<const uint8_t*>(source) + 4 * head,
-                            static_cast<uint8_t*>(destination) + 8 * head, width - head);
+void ExpandBytesTo15u(const void* source, void* destination, int32_t width) {
+    if constexpr (Target::PK_TARGET == Target::plain)
+        RunRow(ScaleBytesTo15u<0>(), width, destination, source);
+    else
+        RunRowWithHead<16>(ScaleBytesTo15u<0>(), ScaleBytesTo15u<1>(), width, destination, source);
 }
 
 /// (c x 510 + 32768) >> 16, which is nearest(c x 0.0077819824) for all 65,536 words: the product is exact in
@@ -130,21 +125,21 @@ struct PackWordsToBytes : SampleGroup<2, 1, 1, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::DepthBodies<PK::Target::PK_TARGET>() {
+const PK::DepthKernels& PK::DepthKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::ExpandTo32fRow_RGB_8u, Row<ExpandBytes<RGBSamples>>},
-        {Kernel::ExpandTo32fRow_VUYA_8u, Row<ExpandBytes<VUYASamples>>},
-        {Kernel::ExpandTo32fRow_UYVY_8u, Row<ExpandBytes<UYVYSamples>>},
-        {Kernel::ExpandTo32fRow_YUYV_8u, Row<ExpandBytes<YUYVSamples>>},
-        {Kernel::ExpandTo32fRow_RGB_15u, Row<ExpandWords>},
-        {Kernel::PackFrom32fRow_RGB_8u, Row<PackBytes<RGBSamples>>},
-        {Kernel::PackFrom32fRow_VUYA_8u, Row<PackBytes<VUYASamples>>},
-        {Kernel::PackFrom32fRow_UYVY_8u, Row<PackBytes<UYVYSamples>>},
-        {Kernel::PackFrom32fRow_YUYV_8u, Row<PackBytes<YUYVSamples>>},
-        {Kernel::PackFrom32fRow_RGB_15u, Row<PackWords>},
-        {Kernel::Expand8uTo15uRow, Expand8uTo15uRow},
-        {Kernel::Pack15uTo8uRow, Row<PackWordsToBytes>},
+    static constexpr DepthKernels kernels = {
+        .ExpandTo32fRow_RGB_8u = Row<ExpandBytes<RGBSamples>>,
+        .ExpandTo32fRow_VUYA_8u = Row<ExpandBytes<VUYASamples>>,
+        .ExpandTo32fRow_UYVY_8u = Row<ExpandBytes<UYVYSamples>>,
+        .ExpandTo32fRow_YUYV_8u = Row<ExpandBytes<YUYVSamples>>,
+        .ExpandTo32fRow_RGB_15u = Row<ExpandWords>,
+        .PackFrom32fRow_RGB_8u = Row<PackBytes<RGBSamples>>,
+        .PackFrom32fRow_VUYA_8u = Row<PackBytes<VUYASamples>>,
+        .PackFrom32fRow_UYVY_8u = Row<PackBytes<UYVYSamples>>,
+        .PackFrom32fRow_YUYV_8u = Row<PackBytes<YUYVSamples>>,
+        .PackFrom32fRow_RGB_15u = Row<PackWords>,
+        .Expand8uTo15uRow = ExpandBytesTo15u,
+        .Pack15uTo8uRow = Row<PackWordsToBytes>,
     };
-    return bodies;
+    return kernels;
 }

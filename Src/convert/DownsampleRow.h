@@ -8,7 +8,7 @@
 // which brings 2 x kLanes four-byte pixels into YUV. Chroma stands on the even pixel of a pair, so the filter
 // looks back one pixel and never further ahead than the pair itself.
 
-#include "primitives/simd/Target.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 
@@ -47,17 +47,19 @@ YUVPixels OnePixel(const uint8_t* source) {
     return first;
 }
 
-/// The last pixels of a row, fewer than a group and an even number.
+/// Carries the chroma of a group's last pixel to the next group.
 template <class Stage>
-void DownsampleTail(const uint8_t* source, uint8_t* destination, int32_t width, I32 before) {
-    alignas(32) uint32_t pixels[2 * kLanes] = {};
-    std::memcpy(pixels, source, static_cast<size_t>(4 * width));
-    YUVPixels first, second;
-    Stage::Load(reinterpret_cast<const uint8_t*>(pixels), first, second);
-    alignas(32) uint32_t pairs[kLanes];
-    Store(pairs, DownsampleGroup(first, second, before));
-    std::memcpy(destination, pairs, static_cast<size_t>(2 * width));
-}
+struct Downsample : Groups<2 * kLanes, Each<4, 2>, Each<4>> {
+    explicit Downsample(I32 chromaBefore) : fBefore(chromaBefore) {}
+
+    void Group(const uint8_t* source, uint8_t* destination) {
+        YUVPixels first, second;
+        Stage::Load(source, first, second);
+        Store(destination, DownsampleGroup(first, second, fBefore));
+    }
+
+    I32 fBefore; // in the last lane
+};
 
 /// The lone last pixel of an odd width keeps its chroma and stands for both lumas of its pair.
 template <class Stage>
@@ -72,18 +74,11 @@ template <class Stage>
 void DownsampleRow(const void* sourceRow, void* destinationRow, int32_t width) {
     if (width <= 0) return;
     const auto* source = static_cast<const uint8_t*>(sourceRow);
-    auto* destination = static_cast<uint8_t*>(destinationRow);
-    I32 before = OnePixel<Stage>(source).chroma;
-    for (; width >= 2 * kLanes; width -= 2 * kLanes) {
-        YUVPixels first, second;
-        Stage::Load(source, first, second);
-        Store(destination, DownsampleGroup(first, second, before));
-        source += 8 * kLanes;
-        destination += 4 * kLanes;
-    }
     const int32_t paired = width & ~1;
-    if (paired > 0) DownsampleTail<Stage>(source, destination, paired, before);
-    if (paired < width) DownsampleLonePixel<Stage>(source + 4 * paired, destination + 2 * paired);
+    RunRow(Downsample<Stage>(OnePixel<Stage>(source).chroma), paired, destinationRow, source);
+    if (paired < width)
+        DownsampleLonePixel<Stage>(source + ptrdiff_t{4} * paired,
+                                   static_cast<uint8_t*>(destinationRow) + ptrdiff_t{2} * paired);
 }
 
 } // namespace PK::PK_TARGET

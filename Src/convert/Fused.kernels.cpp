@@ -2,8 +2,8 @@
 
 #include "convert/ByteScale.h"
 #include "convert/ColourMatrices.h"
+#include "convert/ConversionKernels.h"
 #include "convert/DownsampleRow.h"
-#include "convert/Kernel.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -44,13 +44,13 @@ struct StraightRGB {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::FusedBodies<PK::Target::PK_TARGET>() {
+const PK::FusedKernels& PK::FusedKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::RGBToUYVY601, DownsampleRow<OpaqueRGB<kRGB8ToYUV601>>},
-        {Kernel::RGBToUYVY709, DownsampleRow<OpaqueRGB<kRGB8ToYUV709>>},
-        {Kernel::StraightRGBToUYVY601, DownsampleRow<StraightRGB<kRGB8ToYUV601>>},
-        {Kernel::StraightRGBToUYVY709, DownsampleRow<StraightRGB<kRGB8ToYUV709>>},
+    static constexpr FusedKernels kernels = {
+        .RGBToUYVY601 = DownsampleRow<OpaqueRGB<kRGB8ToYUV601>>,
+        .RGBToUYVY709 = DownsampleRow<OpaqueRGB<kRGB8ToYUV709>>,
+        .StraightRGBToUYVY601 = DownsampleRow<StraightRGB<kRGB8ToYUV601>>,
+        .StraightRGBToUYVY709 = DownsampleRow<StraightRGB<kRGB8ToYUV709>>,
     };
-    return bodies;
+    return kernels;
 }

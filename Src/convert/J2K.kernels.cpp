@@ -3,8 +3,8 @@
 
 #include "convert/BridgeKernels.h"
 #include "convert/ColourMatrices.h"
-#include "convert/RowGroups.h"
 #include "convert/SampleTriples.h"
+#include "primitives/lanes/RowDriver.h"
 #include "primitives/simd/Power.h"
 
 namespace PK::PK_TARGET {
@@ -27,11 +27,7 @@ struct RGB10ToBGR16 : PixelGroup<4, kTripleBytes> {
 
 /// U and V minus 0.5. Luma keeps its bits, which adding 0 would not do for -0. A pixel is two samples, so the
 /// last of an odd row moves U alone.
-struct OffsetUYVY32f {
-    static constexpr int32_t kPixels = kLanes / 2;
-    static constexpr int32_t kUnit = 1;
-    static constexpr int32_t kSourceBytes = 4 * kLanes, kDestinationBytes = 4 * kLanes;
-
+struct OffsetUYVY32f : Groups<kLanes / 2, Each<8>, Each<8>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const F32 samples = LoadFloats(source);
         Store(destination, BlendBlocks<0b0101>(samples - Floats(0.5f), samples));

@@ -1,15 +1,10 @@
 #pragma once
 
-// The row kernels by identity, and the form in which a kernel source hands over its bodies. Kernel sources
-// include this header, so it holds nothing that the compiler could emit once per instruction set.
+// The row kernels by identity, as the router and the chains name them.
 
-#include "primitives/simd/Targets.h"
+#include "convert/ConversionKernels.h"
 
 namespace PK {
-
-/// Converts one row of `width` pixels. A kernel touches exactly the bytes of its rows: for 4:2:2 to the end
-/// of the last pair, for V210 to the end of the last group of six.
-using RowKernel = void (*)(const void* source, void* destination, int32_t width);
 
 /// One kernel: a formula between two neighbouring formats. The part behind the underscore names the member
 /// of a family that has several.
@@ -141,46 +136,5 @@ enum class Kernel : uint8_t {
     None, // no kernel; also the count of kernels
 };
 inline constexpr int kKernelCount = static_cast<int>(Kernel::None);
-
-/// A kernel's body for one instruction set.
-struct KernelBody {
-    Kernel kernel;
-    RowKernel run;
-};
-
-/// The bodies that one kernel source offers for one instruction set.
-struct KernelBodies {
-    const KernelBody* first;
-    int32_t count;
-
-    template <int32_t kCount>
-    consteval KernelBodies(const KernelBody (&bodies)[kCount]) : first(bodies), count(kCount) {}
-};
-
-// One declaration for each kernel source; the source defines the specialisation of its own target.
-template <Target>
-KernelBodies OrderBodies(); // Order.kernels.cpp
-template <Target>
-KernelBodies PremultiplyBodies(); // Premultiply.kernels.cpp
-template <Target>
-KernelBodies DepthBodies(); // Depth.kernels.cpp
-template <Target>
-KernelBodies RGBToYUVBodies(); // RGBToYUV.kernels.cpp
-template <Target>
-KernelBodies YUVToRGBBodies(); // YUVToRGB.kernels.cpp
-template <Target>
-KernelBodies YUVToYUVBodies(); // YUVToYUV.kernels.cpp
-template <Target>
-KernelBodies ChromaBodies(); // Chroma.kernels.cpp
-template <Target>
-KernelBodies YUV422ToBGRBodies(); // YUV422ToBGR.kernels.cpp
-template <Target>
-KernelBodies TransferBodies(); // Transfer.kernels.cpp
-template <Target>
-KernelBodies V210Bodies(); // V210.kernels.cpp
-template <Target>
-KernelBodies RGB10Bodies(); // RGB10.kernels.cpp
-template <Target>
-KernelBodies FusedBodies(); // Fused.kernels.cpp
 
 } // namespace PK

@@ -1,31 +1,14 @@
 #pragma once
 
-// The register of row kernels. The router's chooser, the trace of a chain, the sweep over all bodies and the
-// micro-benchmark all read this one table.
+// The rows of the register that are row kernels of conversion, by their identity, and the choice of their bodies.
 
 #include "convert/Kernel.h"
-#include "primitives/Dispatch.h"
-
-#include <PixelKiln/Types.h>
+#include "primitives/KernelRow.h"
 
 namespace PK {
 
-/// How the bodies of a kernel agree with each other.
-enum class Agreement : uint8_t {
-    Exact,    ///< Every body gives the bytes of the plain one.
-    Declared, ///< The vector bodies differ from the plain one by a stated rule.
-};
-
-/// One kernel of the register.
-struct KernelInfo {
-    Kernel kernel;
-    const char* name; ///< The family's name, as traces and documentation show it.
-    PK_PixelFormat source;
-    PK_PixelFormat destination; ///< With `source`, a pair of formats that the kernel converts between.
-    Agreement agreement = Agreement::Exact;
-};
-
-const KernelInfo& Info(Kernel kernel) noexcept;
+/// The register's row of a kernel; its operands are a pair of formats that the kernel converts between.
+const KernelRow& Info(Kernel kernel) noexcept;
 
 /// The body for one target, null if the kernel has none.
 RowKernel Body(Kernel kernel, Target target) noexcept;

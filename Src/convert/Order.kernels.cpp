@@ -1,7 +1,7 @@
 // Order of components and forced alpha: samples change their place or become opaque, none is computed with.
 
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -81,20 +81,20 @@ struct SwapPairs32f : VectorGroup<4, 2> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::OrderBodies<PK::Target::PK_TARGET>() {
+const PK::OrderKernels& PK::OrderKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::ForceOpaqueRow_BGRA_8u, Row<ForceOpaqueBGRA8>},
-        {Kernel::ForceOpaqueRow_ARGB_8u, Row<ForceOpaqueARGB8>},
-        {Kernel::ForceOpaqueRow_BGRA_15u, Row<ForceOpaqueBGRA15>},
-        {Kernel::ForceOpaqueRow_ARGB_15u, Row<ForceOpaqueARGB15>},
-        {Kernel::ForceOpaqueRow_BGRA_32f, Row<ForceOpaqueBGRA32f>},
-        {Kernel::ForceOpaqueRow_ARGB_32f, Row<ForceOpaqueARGB32f>},
-        {Kernel::SwapOrderRow_4444_8u, Row<ReversePixels8>},
-        {Kernel::SwapOrderRow_4444_15u, Row<ReversePixels15>},
-        {Kernel::SwapOrderRow_4444_32f, Row<ReversePixels32f>},
-        {Kernel::SwapOrderRow_422_8u, Row<SwapPairs8>},
-        {Kernel::SwapOrderRow_422_32f, Row<SwapPairs32f>},
+    static constexpr OrderKernels kernels = {
+        .ForceOpaqueRow_BGRA_8u = Row<ForceOpaqueBGRA8>,
+        .ForceOpaqueRow_ARGB_8u = Row<ForceOpaqueARGB8>,
+        .ForceOpaqueRow_BGRA_15u = Row<ForceOpaqueBGRA15>,
+        .ForceOpaqueRow_ARGB_15u = Row<ForceOpaqueARGB15>,
+        .ForceOpaqueRow_BGRA_32f = Row<ForceOpaqueBGRA32f>,
+        .ForceOpaqueRow_ARGB_32f = Row<ForceOpaqueARGB32f>,
+        .SwapOrderRow_4444_8u = Row<ReversePixels8>,
+        .SwapOrderRow_4444_15u = Row<ReversePixels15>,
+        .SwapOrderRow_4444_32f = Row<ReversePixels32f>,
+        .SwapOrderRow_422_8u = Row<SwapPairs8>,
+        .SwapOrderRow_422_32f = Row<SwapPairs32f>,
     };
-    return bodies;
+    return kernels;
 }

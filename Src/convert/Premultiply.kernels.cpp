@@ -1,9 +1,9 @@
 // Premultiplication by alpha and its inverse, and the two kernels that expand to float on the way.
 
 #include "convert/ByteScale.h"
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
 #include "convert/Samples.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -151,25 +151,25 @@ struct ExpandPremultipliedVUYA8 : SampleGroup<1, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::PremultiplyBodies<PK::Target::PK_TARGET>() {
+const PK::PremultiplyKernels& PK::PremultiplyKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::PremultiplyRow_BGRA_8u, Row<PremultiplyBGRA8>},
-        {Kernel::PremultiplyRow_ARGB_8u, Row<PremultiplyARGB8>},
-        {Kernel::PremultiplyRow_VUYA_8u, Row<PremultiplyVUYA8>},
-        {Kernel::PremultiplyRow_BGRA_15u, Row<Premultiply15u<false>>},
-        {Kernel::PremultiplyRow_ARGB_15u, Row<Premultiply15u<true>>},
-        {Kernel::PremultiplyRow_BGRA_32f, Row<Premultiply32f<false>>},
-        {Kernel::PremultiplyRow_ARGB_32f, Row<Premultiply32f<true>>},
-        {Kernel::UnpremultiplyRow_BGRA_8u, Row<UnpremultiplyBGRA8>},
-        {Kernel::UnpremultiplyRow_ARGB_8u, Row<UnpremultiplyARGB8>},
-        {Kernel::UnpremultiplyRow_VUYA_8u, Row<UnpremultiplyVUYA8>},
-        {Kernel::UnpremultiplyRow_BGRA_15u, Row<Unpremultiply15u<false>>},
-        {Kernel::UnpremultiplyRow_ARGB_15u, Row<Unpremultiply15u<true>>},
-        {Kernel::UnpremultiplyRow_BGRA_32f, Row<Unpremultiply32f<false>>},
-        {Kernel::UnpremultiplyRow_ARGB_32f, Row<Unpremultiply32f<true>>},
-        {Kernel::BGRA8uToBGRP32fRow, Row<ExpandPremultipliedBGRA8>},
-        {Kernel::VUYA8uToVUYP32fRow, Row<ExpandPremultipliedVUYA8>},
+    static constexpr PremultiplyKernels kernels = {
+        .PremultiplyRow_BGRA_8u = Row<PremultiplyBGRA8>,
+        .PremultiplyRow_ARGB_8u = Row<PremultiplyARGB8>,
+        .PremultiplyRow_VUYA_8u = Row<PremultiplyVUYA8>,
+        .PremultiplyRow_BGRA_15u = Row<Premultiply15u<false>>,
+        .PremultiplyRow_ARGB_15u = Row<Premultiply15u<true>>,
+        .PremultiplyRow_BGRA_32f = Row<Premultiply32f<false>>,
+        .PremultiplyRow_ARGB_32f = Row<Premultiply32f<true>>,
+        .UnpremultiplyRow_BGRA_8u = Row<UnpremultiplyBGRA8>,
+        .UnpremultiplyRow_ARGB_8u = Row<UnpremultiplyARGB8>,
+        .UnpremultiplyRow_VUYA_8u = Row<UnpremultiplyVUYA8>,
+        .UnpremultiplyRow_BGRA_15u = Row<Unpremultiply15u<false>>,
+        .UnpremultiplyRow_ARGB_15u = Row<Unpremultiply15u<true>>,
+        .UnpremultiplyRow_BGRA_32f = Row<Unpremultiply32f<false>>,
+        .UnpremultiplyRow_ARGB_32f = Row<Unpremultiply32f<true>>,
+        .BGRA8uToBGRP32fRow = Row<ExpandPremultipliedBGRA8>,
+        .VUYA8uToVUYP32fRow = Row<ExpandPremultipliedVUYA8>,
     };
-    return bodies;
+    return kernels;
 }

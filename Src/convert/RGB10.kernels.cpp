@@ -2,9 +2,9 @@
 // 0 and 1 are zero on writing and ignored on reading. Where two samples share a vector, one stands in the
 // lower and one in the upper 16-bit half of each lane.
 
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
 #include "convert/Samples.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -137,17 +137,17 @@ struct RGB10ToBGR32f : PixelGroup<4, 16> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::RGB10Bodies<PK::Target::PK_TARGET>() {
+const PK::RGB10Kernels& PK::RGB10Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::BGR8uToRGB10uRow, Row<BGR8ToRGB10<ScaleBytesTo10u>>},
-        {Kernel::BGR15uToRGB10uRow, Row<BGR15ToRGB10>},
-        {Kernel::BGR32fToRGB10uRow, Row<BGR32fToRGB10>},
-        {Kernel::RGB10uToBGR8uRow, Row<RGB10ToBGR8>},
-        {Kernel::RGB10uToBGR15uRow, Row<RGB10ToBGR15>},
-        {Kernel::RGB10uToBGR32fRow, Row<RGB10ToBGR32f>},
-        {Kernel::OpaqueBGRToRGB10, Row<BGR8ToRGB10<RoundBytesTo10u>>},
-        {Kernel::StraightBGRToRGB10, Row<StraightBGR8ToRGB10>},
+    static constexpr RGB10Kernels kernels = {
+        .BGR8uToRGB10uRow = Row<BGR8ToRGB10<ScaleBytesTo10u>>,
+        .BGR15uToRGB10uRow = Row<BGR15ToRGB10>,
+        .BGR32fToRGB10uRow = Row<BGR32fToRGB10>,
+        .RGB10uToBGR8uRow = Row<RGB10ToBGR8>,
+        .RGB10uToBGR15uRow = Row<RGB10ToBGR15>,
+        .RGB10uToBGR32fRow = Row<RGB10ToBGR32f>,
+        .OpaqueBGRToRGB10 = Row<BGR8ToRGB10<RoundBytesTo10u>>,
+        .StraightBGRToRGB10 = Row<StraightBGR8ToRGB10>,
     };
-    return bodies;
+    return kernels;
 }

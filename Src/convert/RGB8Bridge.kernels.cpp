@@ -1,7 +1,7 @@
 // Three-byte RGB to four-byte pixels.
 
 #include "convert/BridgeKernels.h"
-#include "convert/RowWindows.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -25,14 +25,10 @@ inline void StorePixels(const uint8_t* source, uint8_t* destination) {
     }
 }
 
-struct RGB8ToBGRA : NoNeighbours {
-    static constexpr int32_t kPixels = 32;
-    static constexpr int32_t kSourceUnit = 1, kDestinationUnit = 1;
-    static constexpr int32_t kSourceBytes = 3 * kPixels, kDestinationBytes = 4 * kPixels;
-    static constexpr int32_t kBytesAfter = 4; // the last block of four pixels is loaded as 16 bytes
-
+/// The last block of four pixels is loaded as 16 bytes.
+struct RGB8ToBGRA : Groups<32, Each<4>, LoadedPast<Each<3>, 4>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        for (int32_t i = 0; i < kPixels; i += kLanes) StorePixels<I32>(source + 3 * i, destination + 4 * i);
+        for (int32_t i = 0; i < kElements; i += kLanes) StorePixels<I32>(source + 3 * i, destination + 4 * i);
     }
 };
 
@@ -42,6 +38,6 @@ struct RGB8ToBGRA : NoNeighbours {
 template <>
 const PK::RGB8Kernels& PK::RGB8Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr RGB8Kernels kernels = {WindowRow<RGB8ToBGRA>};
+    static constexpr RGB8Kernels kernels = {Row<RGB8ToBGRA>};
     return kernels;
 }

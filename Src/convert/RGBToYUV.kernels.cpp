@@ -1,8 +1,8 @@
 // The matrices from RGB to YUV.
 
 #include "convert/ColourMatrices.h"
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -34,15 +34,15 @@ struct RGBFloatToYUV8 : PixelGroup<16, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::RGBToYUVBodies<PK::Target::PK_TARGET>() {
+const PK::RGBToYUVKernels& PK::RGBToYUVKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::RGBToYUV601Row, Row<RGBToYUV8<kRGB8ToYUV601>>},
-        {Kernel::RGBToYUV709Row, Row<RGBToYUV8<kRGB8ToYUV709>>},
-        {Kernel::RGBToYUV601Float32Row, Row<RGBToYUVFloat<kRGBToYUV601>>},
-        {Kernel::RGBToYUV709Float32Row, Row<RGBToYUVFloat<kRGBToYUV709>>},
-        {Kernel::RGB32fToYUV601_8uRow, Row<RGBFloatToYUV8<kRGBToYUV8_601>>},
-        {Kernel::RGB32fToYUV709_8uRow, Row<RGBFloatToYUV8<kRGBToYUV8_709>>},
+    static constexpr RGBToYUVKernels kernels = {
+        .RGBToYUV601Row = Row<RGBToYUV8<kRGB8ToYUV601>>,
+        .RGBToYUV709Row = Row<RGBToYUV8<kRGB8ToYUV709>>,
+        .RGBToYUV601Float32Row = Row<RGBToYUVFloat<kRGBToYUV601>>,
+        .RGBToYUV709Float32Row = Row<RGBToYUVFloat<kRGBToYUV709>>,
+        .RGB32fToYUV601_8uRow = Row<RGBFloatToYUV8<kRGBToYUV8_601>>,
+        .RGB32fToYUV709_8uRow = Row<RGBFloatToYUV8<kRGBToYUV8_709>>,
     };
-    return bodies;
+    return kernels;
 }

@@ -1,9 +1,9 @@
 // The transfer function between gamma-coded and linear light.
 
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
 #include "convert/Samples.h"
 #include "convert/TransferTables.h"
+#include "primitives/lanes/RowDriver.h"
 #include "primitives/simd/Power.h"
 
 namespace PK::PK_TARGET {
@@ -23,12 +23,7 @@ using GammaToLinear = PowerColour<2.4>;
 using LinearToGamma = PowerColour<0.41666666>;
 
 /// Four table look-ups a pixel, which no vector instruction speeds up: a gather is slower than single loads.
-struct Gamma8uToLinearFloat32 {
-    static constexpr int32_t kPixels = 1;
-    static constexpr int32_t kUnit = 1;
-    static constexpr int32_t kSourceBytes = 4;
-    static constexpr int32_t kDestinationBytes = 16;
-
+struct Gamma8uToLinearFloat32 : Groups<1, Each<16>, Each<4>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const float* const linear = kTransferTables.linear;
         const float pixel[4] = {linear[source[0]], linear[source[1]], linear[source[2]],
@@ -60,13 +55,13 @@ struct LinearFloat32ToGamma8u : PixelGroup<16, 4> {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::TransferBodies<PK::Target::PK_TARGET>() {
+const PK::TransferKernels& PK::TransferKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::GammaToLinearRow, Row<GammaToLinear>},
-        {Kernel::LinearToGammaRow, Row<LinearToGamma>},
-        {Kernel::Gamma8uToLinearFloat32Row, Row<Gamma8uToLinearFloat32>},
-        {Kernel::LinearFloat32ToGamma8uRow, Row<LinearFloat32ToGamma8u>},
+    static constexpr TransferKernels kernels = {
+        .GammaToLinearRow = Row<GammaToLinear>,
+        .LinearToGammaRow = Row<LinearToGamma>,
+        .Gamma8uToLinearFloat32Row = Row<Gamma8uToLinearFloat32>,
+        .LinearFloat32ToGamma8uRow = Row<LinearFloat32ToGamma8u>,
     };
-    return bodies;
+    return kernels;
 }

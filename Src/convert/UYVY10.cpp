@@ -15,7 +15,7 @@ constexpr int32_t kGroupPixels = 6, kGroupBytes = 16;
 constexpr size_t kPixelBytes = 4; // two words
 
 /// A last group that is not full, completed by black.
-void ConvertPartialGroup(BridgeRow convert, const uint8_t* source, uint8_t* destination, int32_t pixels) {
+void ConvertPartialGroup(RowKernel convert, const uint8_t* source, uint8_t* destination, int32_t pixels) {
     uint16_t samples[] = {512, 64, 512, 64, 512, 64, 512, 64, 512, 64, 512, 64};
     std::memcpy(samples, source, static_cast<size_t>(pixels) * kPixelBytes);
     convert(samples, destination, kGroupPixels);
@@ -29,7 +29,7 @@ PK_Result PK_ConvertUYVY_422_10uToV210_422_10u(const void* source, int32_t sourc
                                                int32_t height) noexcept {
     using namespace PK;
     if (const auto result = ResultWithoutWork(width, height, {source, destination})) return *result;
-    const BridgeRow convert = Best<UYVY10Kernels>().toV210;
+    const RowKernel convert = Best<UYVY10Kernels>().toV210;
     const SourceRows sourceRows(source, sourceRowBytes);
     const DestinationRows destinationRows(destination, destinationRowBytes);
 

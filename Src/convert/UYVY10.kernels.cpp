@@ -1,29 +1,21 @@
 // V210 and its samples unpacked, one 16-bit word each.
 
 #include "convert/BridgeKernels.h"
-#include "convert/RowWindows.h"
 #include "convert/SampleTriples.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
 
 constexpr int32_t kGroups = kLanes / 4; // of six pixels in a vector
 
-struct UYVY10ToV210 : NoNeighbours {
-    static constexpr int32_t kPixels = 6 * kGroups;
-    static constexpr int32_t kSourceUnit = 6, kDestinationUnit = 6;
-    static constexpr int32_t kSourceBytes = 24 * kGroups, kDestinationBytes = 16 * kGroups;
-
+struct UYVY10ToV210 : Groups<6 * kGroups, Each<16, 6>, Each<24, 6>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         Store(destination, PackTriples(LoadTriples(source)));
     }
 };
 
-struct V210ToUYVY10 : NoNeighbours {
-    static constexpr int32_t kPixels = 6 * kGroups;
-    static constexpr int32_t kSourceUnit = 6, kDestinationUnit = 1;
-    static constexpr int32_t kSourceBytes = 16 * kGroups, kDestinationBytes = 24 * kGroups;
-
+struct V210ToUYVY10 : Groups<6 * kGroups, Each<4>, Each<16, 6>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         StoreTriples<0>(destination, LoadInts(source));
     }
@@ -35,6 +27,6 @@ struct V210ToUYVY10 : NoNeighbours {
 template <>
 const PK::UYVY10Kernels& PK::UYVY10Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr UYVY10Kernels kernels = {WindowRow<UYVY10ToV210>, WindowRow<V210ToUYVY10>};
+    static constexpr UYVY10Kernels kernels = {Row<UYVY10ToV210>, Row<V210ToUYVY10>};
     return kernels;
 }

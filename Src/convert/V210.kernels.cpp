@@ -2,7 +2,7 @@
 
 #include "convert/ChromaPairs.h"
 #include "convert/ColourMatrices.h"
-#include "convert/Kernel.h"
+#include "convert/ConversionKernels.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -36,11 +36,12 @@ inline I32 HighBits(I32 samplesAt4) {
     return ShiftRight<14 - kBits>(samplesAt4) & Ints(((1 << kBits) - 1) * 0x10001);
 }
 
-struct UYVY8ToV210 : NoNeighbours {
-    static constexpr int32_t kPixels = 6 * kGroups;
-    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 6;
-    static constexpr int32_t kSourceBytes = 12 * kGroups, kDestinationBytes = 16 * kGroups;
+/// A group of six, and what has other units on the other side.
+using V210 = Each<16, 6>;
+template <class Source, class Destination>
+using GroupsOfSix = Groups<6 * kGroups, Destination, Source>;
 
+struct UYVY8ToV210 : GroupsOfSix<Each<4, 2>, V210> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 samples = HalvesAt<0, 2, 3, 5, 6, 8, 9, 11>(LoadThrees(source)); // three bytes a lane
         const I32 outer = MultiplyHalves(samples & Ints(0x00ff00ff), Ints(4 | 64 << 16));
@@ -48,16 +49,7 @@ struct UYVY8ToV210 : NoNeighbours {
     }
 };
 
-struct V210Source {
-    static constexpr int32_t kPixels = 6 * kGroups;
-    static constexpr int32_t kSourceUnit = 6;
-    static constexpr int32_t kSourceBytes = 16 * kGroups;
-};
-
-struct V210ToUYVY8 : V210Source, NoNeighbours {
-    static constexpr int32_t kDestinationUnit = 2;
-    static constexpr int32_t kDestinationBytes = 12 * kGroups;
-
+struct V210ToUYVY8 : GroupsOfSix<V210, Each<4, 2>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 words = LoadInts(source);
         StoreThrees(destination,
@@ -65,23 +57,13 @@ struct V210ToUYVY8 : V210Source, NoNeighbours {
     }
 };
 
-/// To pixels of four bytes, with the truncated average of chroma at the odd pixel, from samples of kBits
-/// bits.
-template <int kBits, class Pixel>
-struct V210ToPixels : V210Source, Neighbours<2, 0, 0, 1> {
-    static constexpr int32_t kBytesAfter = 4; // the next pair's chroma
-    static constexpr int32_t kDestinationUnit = 1;
-    static constexpr int32_t kDestinationBytes = 24 * kGroups;
+/// Looks at the chroma of the pair behind a group, which stands in one word.
+struct V210AndNextPair : V210 {
+    static constexpr int32_t kBytesAfter = 4;
+    static constexpr int32_t kNeighbour = 2;
+    static constexpr int32_t kUnitsBefore = 0, kUnitsAfter = 1;
 
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const I32 words = LoadInts(source);
-        const I32 nextChroma = HighBits<kBits>(OddSamplesAt<4>(LoadInts(source + 4)));
-        I32 low, high;
-        UpsampleInBlocks<Pixel, false>(
-            {HighBits<kBits>(EvenSamplesAt<4>(words)), HighBits<kBits>(OddSamplesAt<4>(words))}, nextChroma,
-            low, high);
-        StoreSixes(destination, low, high);
-    }
+    static void Complete(uint8_t* window, RowEnd end) { RepeatEnds<V210AndNextPair>(window, end); }
 
     /// The chroma of one pair over that of another.
     static void Repeat(uint8_t* window, int32_t from, int32_t to) {
@@ -97,6 +79,21 @@ struct V210ToPixels : V210Source, Neighbours<2, 0, 0, 1> {
         const int32_t shift = 10 * (to % 3);
         destination = (destination & ~(0x3ffu << shift)) | sample << shift;
         std::memcpy(window + to / 3 * 4, &destination, sizeof destination);
+    }
+};
+
+/// To pixels of four bytes, with the truncated average of chroma at the odd pixel, from samples of kBits
+/// bits.
+template <int kBits, class Pixel>
+struct V210ToPixels : GroupsOfSix<V210AndNextPair, Each<4>> {
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        const I32 words = LoadInts(source);
+        const I32 nextChroma = HighBits<kBits>(OddSamplesAt<4>(LoadInts(source + 4)));
+        I32 low, high;
+        UpsampleInBlocks<Pixel, false>(
+            {HighBits<kBits>(EvenSamplesAt<4>(words)), HighBits<kBits>(OddSamplesAt<4>(words))}, nextChroma,
+            low, high);
+        StoreSixes(destination, low, high);
     }
 };
 
@@ -133,10 +130,7 @@ inline F32 UYVYFromCodes(I32 words) {
                        kLumaFromCode / at3);
 }
 
-struct V210ToUYVY32f : V210Source, NoNeighbours {
-    static constexpr int32_t kDestinationUnit = 2;
-    static constexpr int32_t kDestinationBytes = 48 * kGroups;
-
+struct V210ToUYVY32f : GroupsOfSix<V210, Each<16, 2>> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 words = LoadInts(source);
         StoreBlocksInTurns(destination, UYVYFromCodes<0, 1, 2, 0>(ShufflePixel<0, 0, 0, 1>(words)),
@@ -152,12 +146,11 @@ inline I32 CodesFromUYVY(F32 uyvy) {
     return Max(Nearest(AtMost(Floats(1023), codes)), Ints(0));
 }
 
-struct UYVY32fToV210 : NoNeighbours {
+struct PaddedPairs : Each<16, 2> {
     static constexpr uint8_t kPadding = 0xbf; // floats of about -1.5, which give codes of 0
-    static constexpr int32_t kPixels = 6 * kGroups;
-    static constexpr int32_t kSourceUnit = 2, kDestinationUnit = 6;
-    static constexpr int32_t kSourceBytes = 48 * kGroups, kDestinationBytes = 16 * kGroups;
+};
 
+struct UYVY32fToV210 : GroupsOfSix<PaddedPairs, V210> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         const I32 a = CodesFromUYVY(LoadFloatBlocks(source, 48));
         const I32 b = CodesFromUYVY(LoadFloatBlocks(source + 16, 48));
@@ -178,17 +171,17 @@ struct UYVY32fToV210 : NoNeighbours {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::V210Bodies<PK::Target::PK_TARGET>() {
+const PK::V210Kernels& PK::V210Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::UYVY8uToV210Row, WindowRow<UYVY8ToV210>},
-        {Kernel::V210ToUYVY8uRow, WindowRow<V210ToUYVY8>},
-        {Kernel::V210ToVUY8uRow, WindowRow<V210ToPixels<8, PixelVUYX>>},
-        {Kernel::V210709ToVUY601_8uRow, WindowRow<V210ToPixels<8, PixelOtherVUYX<kYUV709To601>>>},
-        {Kernel::V210ToBGR8uRow_601, WindowRow<V210ToPixels<10, PixelBGRXFrom10<kYUV10ToRGB8_601>>>},
-        {Kernel::V210ToBGR8uRow_709, WindowRow<V210ToPixels<10, PixelBGRXFrom10<kYUV10ToRGB8_709>>>},
-        {Kernel::V210ToUYVY32fRow, WindowRow<V210ToUYVY32f>},
-        {Kernel::UYVY32fToV210Row, WindowRow<UYVY32fToV210>},
+    static constexpr V210Kernels kernels = {
+        .UYVY8uToV210Row = Row<UYVY8ToV210>,
+        .V210ToUYVY8uRow = Row<V210ToUYVY8>,
+        .V210ToVUY8uRow = Row<V210ToPixels<8, PixelVUYX>>,
+        .V210709ToVUY601_8uRow = Row<V210ToPixels<8, PixelOtherVUYX<kYUV709To601>>>,
+        .V210ToBGR8uRow_601 = Row<V210ToPixels<10, PixelBGRXFrom10<kYUV10ToRGB8_601>>>,
+        .V210ToBGR8uRow_709 = Row<V210ToPixels<10, PixelBGRXFrom10<kYUV10ToRGB8_709>>>,
+        .V210ToUYVY32fRow = Row<V210ToUYVY32f>,
+        .UYVY32fToV210Row = Row<UYVY32fToV210>,
     };
-    return bodies;
+    return kernels;
 }

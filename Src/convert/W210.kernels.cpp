@@ -2,80 +2,24 @@
 
 #include "convert/BridgeKernels.h"
 #include "convert/SampleTriples.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
 
-// A formula has
-//
-//   kPlanes              rows that it reads: Y, U and V of one row, or of two rows
-//   kPixels              destination pixels of one group
-//   kUnit, kUnitBytes    destination pixels that cannot be parted, and their bytes
-//   kLumas               source lumas for each destination pixel, of which every kStep-th counts
-//   kReach               chromas from the group's first that it loads; of lumas it loads twice as many at most
-//   static void Group(Pointers<kPlanes> planes, uint8_t* destination)
+/// A plane of kSamples samples for every kPixels pixels of the destination. At the end of a row the last sample that
+/// counts, which is one of every kStep, is repeated.
+template <int32_t kSamples, int32_t kPixels, int32_t kStep, int32_t kLoaded>
+struct Plane : Each<2 * kSamples, kPixels> {
+    static constexpr int32_t kBytesAfter = kLoaded;
 
-/// Where a group stands in its planes. By value, so that the pointers stay in registers: a store through the
-/// destination might change what lies in memory.
-template <int32_t kCount>
-struct Pointers {
-    const uint8_t* at[kCount];
-
-    const uint8_t* operator[](int32_t plane) const { return at[plane]; }
+    static void Complete(uint8_t* window, RowEnd end) {
+        const int64_t samples = Plane::BytesOf(end.elementsLeft) / 2;
+        const int64_t wanted = Plane::BytesOf(end.groupElements) / 2 + kLoaded / 2;
+        const int64_t last = (samples - 1) / kStep * kStep;
+        for (int64_t i = samples; i < wanted; ++i) std::memcpy(window + 2 * i, window + 2 * last, 2);
+    }
 };
-
-/// What is left of a plane, with the last sample that counts repeated to the end of the last unit.
-template <class Formula>
-void FillWindow(const uint8_t* plane, int32_t samples, int32_t wanted, uint8_t* window) {
-    std::memcpy(window, plane, static_cast<size_t>(2 * samples));
-    const uint8_t* const last = plane + 2 * ((samples - 1) / Formula::kStep * Formula::kStep);
-    for (int32_t i = samples; i < wanted; ++i) std::memcpy(window + 2 * i, last, 2);
-}
-
-template <class Formula>
-constexpr int32_t kGroupBytes = Formula::kPixels / Formula::kUnit* Formula::kUnitBytes;
-
-template <class Formula>
-void Advance(Pointers<Formula::kPlanes>& planes) {
-    for (int32_t i = 0; i < Formula::kPlanes; ++i)
-        planes.at[i] += (i % 3 == 0 ? 2 : 1) * Formula::kLumas * Formula::kPixels;
-}
-
-/// The pixels at the end of a row, whose groups load more than is left of the planes. They have fewer than
-/// kReach chromas, which leaves as many for what the last group loads.
-template <class Formula>
-void EndOfRow(Pointers<Formula::kPlanes> planes, uint8_t* destination, int32_t pixelsLeft) {
-    constexpr int32_t kChromas = 2 * Formula::kReach;
-    uint8_t windows[Formula::kPlanes][4 * kChromas] = {};
-    const int32_t units = (pixelsLeft + Formula::kUnit - 1) / Formula::kUnit;
-    const int32_t lumas = pixelsLeft * Formula::kLumas, wanted = units * Formula::kUnit * Formula::kLumas;
-    for (int32_t i = 0; i < Formula::kPlanes; ++i) {
-        const bool isLuma = i % 3 == 0;
-        FillWindow<Formula>(planes[i], isLuma ? lumas : (lumas + 1) / 2, isLuma ? wanted : wanted / 2,
-                            windows[i]);
-        planes.at[i] = windows[i];
-    }
-    uint8_t to[(2 * Formula::kReach / Formula::kPixels + 1) * kGroupBytes<Formula>];
-    uint8_t* group = to;
-    for (int32_t left = pixelsLeft; left > 0; left -= Formula::kPixels, group += kGroupBytes<Formula>) {
-        Formula::Group(planes, group);
-        Advance<Formula>(planes);
-    }
-    std::memcpy(destination, to, static_cast<size_t>(units * Formula::kUnitBytes));
-}
-
-template <class Formula>
-void FromPlanesRow(PlaneRows planes, uint8_t* destination, int32_t pixelsLeft) {
-    constexpr int32_t kPixelsOfWholeGroup = (2 * Formula::kReach + Formula::kLumas - 1) / Formula::kLumas;
-    Pointers<Formula::kPlanes> pointers;
-    for (int32_t i = 0; i < Formula::kPlanes; ++i) pointers.at[i] = planes[i];
-    for (; pixelsLeft >= kPixelsOfWholeGroup; pixelsLeft -= Formula::kPixels) {
-        Formula::Group(pointers, destination);
-        Advance<Formula>(pointers);
-        destination += kGroupBytes<Formula>;
-    }
-    if (pixelsLeft > 0) EndOfRow<Formula>(pointers, destination, pixelsLeft);
-}
 
 constexpr int32_t kGroups = kLanes / 4; // of six pixels in a vector
 
@@ -114,50 +58,59 @@ inline void StoreV210(uint8_t* destination, GroupSamples samples) {
     Store(destination, PackTriples({BlendBlocks<0b0101>(chroma, luma), BlendBlocks<0b0101>(luma, chroma)}));
 }
 
-struct ToV210 {
-    static constexpr int32_t kPlanes = 3, kPixels = 6 * kGroups, kUnit = 6, kUnitBytes = 16;
-    static constexpr int32_t kLumas = 1, kStep = 1;
-    static constexpr int32_t kReach = 3 * (kGroups - 1) + 8;
+/// The last block of a group is loaded as 16 bytes, of which lumas use 12 and chromas 6.
+using Luma = Plane<1, 1, 1, 4>;
+using Chroma = Plane<1, 2, 1, 10>;
+template <class... Planes>
+using PlanesToV210 = Groups<6 * kGroups, Each<16, 6>, Planes...>;
 
-    static void Group(Pointers<3> planes, uint8_t* destination) {
-        StoreV210(destination, LoadGroups(planes[0], planes[1], planes[2]));
+struct ToV210 : PlanesToV210<Luma, Chroma, Chroma> {
+    static void Group(const uint8_t* y, const uint8_t* u, const uint8_t* v, uint8_t* destination) {
+        StoreV210(destination, LoadGroups(y, u, v));
     }
 };
 
-struct AverageToV210 : ToV210 {
-    static constexpr int32_t kPlanes = 6;
-
-    static void Group(Pointers<6> planes, uint8_t* destination) {
-        const GroupSamples upper = LoadGroups(planes[0], planes[1], planes[2]);
-        const GroupSamples lower = LoadGroups(planes[3], planes[4], planes[5]);
+/// The average of two rows.
+struct AverageToV210 : PlanesToV210<Luma, Chroma, Chroma, Luma, Chroma, Chroma> {
+    static void Group(const uint8_t* upperY, const uint8_t* upperU, const uint8_t* upperV,
+                      const uint8_t* lowerY, const uint8_t* lowerU, const uint8_t* lowerV,
+                      uint8_t* destination) {
+        const GroupSamples upper = LoadGroups(upperY, upperU, upperV);
+        const GroupSamples lower = LoadGroups(lowerY, lowerU, lowerV);
         StoreV210(destination,
                   {AverageDown(upper.luma, lower.luma), AverageDown(upper.chroma, lower.chroma)});
     }
 };
 
-struct QuarterToV210 : ToV210 {
-    static constexpr int32_t kLumas = 2, kStep = 2;
-    static constexpr int32_t kReach = 6 * (kGroups - 1) + 8;
-
-    static void Group(Pointers<3> planes, uint8_t* destination) {
-        StoreV210(destination, LoadHalvedGroups(planes[0], planes[1], planes[2]));
+/// Of two lumas the first, of two chromas the first. Chroma is loaded as 16 bytes for 12.
+using HalvedLuma = Plane<2, 1, 2, 0>;
+using HalvedChroma = Plane<1, 1, 2, 4>;
+struct QuarterToV210 : PlanesToV210<HalvedLuma, HalvedChroma, HalvedChroma> {
+    static void Group(const uint8_t* y, const uint8_t* u, const uint8_t* v, uint8_t* destination) {
+        StoreV210(destination, LoadHalvedGroups(y, u, v));
     }
 };
 
 /// V >> 2, U >> 2, (Y + Y) >> 3 of the two lumas of a pair, and an opaque alpha.
-struct QuarterToVUYX {
-    static constexpr int32_t kPlanes = 3, kPixels = kLanes, kUnit = 1, kUnitBytes = 4;
-    static constexpr int32_t kLumas = 2, kStep = 1;
-    static constexpr int32_t kReach = kLanes;
-
-    static void Group(Pointers<3> planes, uint8_t* destination) {
-        const I32 lumas = LoadInts(planes[0]);
+struct QuarterToVUYX : Groups<kLanes, Each<4>, Each<4>, Each<2>, Each<2>> {
+    static void Group(const uint8_t* lumaPairs, const uint8_t* u, const uint8_t* v, uint8_t* destination) {
+        const I32 lumas = LoadInts(lumaPairs);
         const I32 y = ShiftLeft<13>((lumas & Ints(0xffff)) + ShiftRight<16>(lumas)) & Ints(0xff0000);
-        const I32 u = ShiftLeft<6>(LoadWords(planes[1])) & Ints(0xff00);
-        const I32 v = ShiftRight<2>(LoadWords(planes[2])) & Ints(0xff);
-        Store(destination, v | u | y | Ints(-0x1000000));
+        const I32 cb = ShiftLeft<6>(LoadWords(u)) & Ints(0xff00);
+        const I32 cr = ShiftRight<2>(LoadWords(v)) & Ints(0xff);
+        Store(destination, cr | cb | y | Ints(-0x1000000));
     }
 };
+
+template <class Formula>
+void FromPlanes(PlaneRows planes, uint8_t* destination, int32_t width) {
+    RunRow(Formula(), width, destination, planes[0], planes[1], planes[2]);
+}
+
+void AverageFromPlanes(PlaneRows planes, uint8_t* destination, int32_t width) {
+    RunRow(AverageToV210(), width, destination, planes[0], planes[1], planes[2], planes[3], planes[4],
+           planes[5]);
+}
 
 } // namespace
 } // namespace PK::PK_TARGET
@@ -165,7 +118,7 @@ struct QuarterToVUYX {
 template <>
 const PK::W210Kernels& PK::W210Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr W210Kernels kernels = {FromPlanesRow<ToV210>, FromPlanesRow<AverageToV210>,
-                                            FromPlanesRow<QuarterToV210>, FromPlanesRow<QuarterToVUYX>};
+    static constexpr W210Kernels kernels = {FromPlanes<ToV210>, AverageFromPlanes, FromPlanes<QuarterToV210>,
+                                            FromPlanes<QuarterToVUYX>};
     return kernels;
 }

@@ -2,7 +2,7 @@
 
 #include "convert/ChromaPairs.h"
 #include "convert/ColourMatrices.h"
-#include "convert/Kernel.h"
+#include "convert/ConversionKernels.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -21,13 +21,13 @@ using YUYVToBGR = UpsamplePairs<true, PixelBGRX<kMatrix>>;
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::YUV422ToBGRBodies<PK::Target::PK_TARGET>() {
+const PK::YUV422ToBGRKernels& PK::YUV422ToBGRKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::UYVY601ToBGR8uRow, WindowRow<UYVYToBGR<kYUV8ToRGB8_601>>},
-        {Kernel::UYVY709ToBGR8uRow, WindowRow<UYVYToBGR<kYUV8ToRGB8_709>>},
-        {Kernel::YUYV601ToBGR8uRow, WindowRow<YUYVToBGR<kYUV8ToRGB8_601>>},
-        {Kernel::YUYV709ToBGR8uRow, WindowRow<YUYVToBGR<kYUV8ToRGB8_709>>},
+    static constexpr YUV422ToBGRKernels kernels = {
+        .UYVY601ToBGR8uRow = Row<UYVYToBGR<kYUV8ToRGB8_601>>,
+        .UYVY709ToBGR8uRow = Row<UYVYToBGR<kYUV8ToRGB8_709>>,
+        .YUYV601ToBGR8uRow = Row<YUYVToBGR<kYUV8ToRGB8_601>>,
+        .YUYV709ToBGR8uRow = Row<YUYVToBGR<kYUV8ToRGB8_709>>,
     };
-    return bodies;
+    return kernels;
 }

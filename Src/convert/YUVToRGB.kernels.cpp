@@ -1,9 +1,9 @@
 // The matrices from YUV to RGB.
 
 #include "convert/ColourMatrices.h"
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
 #include "convert/Samples.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -58,21 +58,21 @@ constexpr RowKernel FromSSE2(RowKernel body) {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::YUVToRGBBodies<PK::Target::PK_TARGET>() {
+const PK::YUVToRGBKernels& PK::YUVToRGBKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::YUV601ToRGBRow, Row<YUVToRGB8<kYUV8ToRGB8_601>>},
-        {Kernel::YUV709ToRGBRow, Row<YUVToRGB8<kYUV8ToRGB8_709>>},
-        {Kernel::YUV601ToRGB32fRow, Row<YUV8ToRGBFloat<kYUV8ToRGB601>>},
-        {Kernel::YUV709ToRGB32fRow, Row<YUV8ToRGBFloat<kYUV8ToRGB709>>},
-        {Kernel::YUV601ToRGBFloat32Row, Row<YUVToRGBFloat<kYUVToRGB601>>},
-        {Kernel::YUV709ToRGBFloat32Row, Row<YUVToRGBFloat<kYUVToRGB709>>},
-        {Kernel::VUYX8uToRGB8uRow_601, Row<OpaqueYUVToRGB8<kYUV8ToRGB8_601>>},
-        {Kernel::VUYX8uToRGB8uRow_709, Row<OpaqueYUVToRGB8<kYUV8ToRGB8_709>>},
-        {Kernel::VUYX8uToRGB32fRow_601, Row<OpaqueYUV8ToRGBFloat<kYUV8ToRGB601>>},
-        {Kernel::VUYX8uToRGB32fRow_709, Row<OpaqueYUV8ToRGBFloat<kYUV8ToRGB709>>},
-        {Kernel::VUYX8uToBGR8uRow_601, FromSSE2(Row<OpaqueYUVToRGB8<kYUV8ToRGB8_601>>)},
-        {Kernel::VUYX8uToBGR8uRow_709, FromSSE2(Row<OpaqueYUVToRGB8<kYUV8ToRGB8_709>>)},
+    static constexpr YUVToRGBKernels kernels = {
+        .YUV601ToRGBRow = Row<YUVToRGB8<kYUV8ToRGB8_601>>,
+        .YUV709ToRGBRow = Row<YUVToRGB8<kYUV8ToRGB8_709>>,
+        .YUV601ToRGB32fRow = Row<YUV8ToRGBFloat<kYUV8ToRGB601>>,
+        .YUV709ToRGB32fRow = Row<YUV8ToRGBFloat<kYUV8ToRGB709>>,
+        .YUV601ToRGBFloat32Row = Row<YUVToRGBFloat<kYUVToRGB601>>,
+        .YUV709ToRGBFloat32Row = Row<YUVToRGBFloat<kYUVToRGB709>>,
+        .VUYX8uToRGB8uRow_601 = Row<OpaqueYUVToRGB8<kYUV8ToRGB8_601>>,
+        .VUYX8uToRGB8uRow_709 = Row<OpaqueYUVToRGB8<kYUV8ToRGB8_709>>,
+        .VUYX8uToRGB32fRow_601 = Row<OpaqueYUV8ToRGBFloat<kYUV8ToRGB601>>,
+        .VUYX8uToRGB32fRow_709 = Row<OpaqueYUV8ToRGBFloat<kYUV8ToRGB709>>,
+        .VUYX8uToBGR8uRow_601 = FromSSE2(Row<OpaqueYUVToRGB8<kYUV8ToRGB8_601>>),
+        .VUYX8uToBGR8uRow_709 = FromSSE2(Row<OpaqueYUVToRGB8<kYUV8ToRGB8_709>>),
     };
-    return bodies;
+    return kernels;
 }

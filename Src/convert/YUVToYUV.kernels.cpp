@@ -1,8 +1,8 @@
 // The matrices between BT.601 and BT.709.
 
 #include "convert/ColourMatrices.h"
-#include "convert/Kernel.h"
-#include "convert/RowGroups.h"
+#include "convert/ConversionKernels.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -22,12 +22,7 @@ struct YUVToYUVFloat : PixelGroup<16, 16> {
 };
 
 /// A pair of pixels is four bytes, so that a lane holds one pair: kLanes pairs make a group.
-struct PairGroup {
-    static constexpr int32_t kPixels = 2 * kLanes;
-    static constexpr int32_t kUnit = 2;
-    static constexpr int32_t kSourceBytes = 4 * kLanes;
-    static constexpr int32_t kDestinationBytes = 4 * kLanes;
-};
+using PairGroup = Groups<2 * kLanes, Each<4, 2>, Each<4, 2>>;
 
 struct YUVPairs {
     I32 u, v, y0, y1;
@@ -65,17 +60,17 @@ struct YUYVToYUYV : PairGroup {
 } // namespace PK::PK_TARGET
 
 template <>
-PK::KernelBodies PK::YUVToYUVBodies<PK::Target::PK_TARGET>() {
+const PK::YUVToYUVKernels& PK::YUVToYUVKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr KernelBody bodies[] = {
-        {Kernel::YUV601To709Row, Row<YUVToYUV8<kYUV601To709>>},
-        {Kernel::YUV709To601Row, Row<YUVToYUV8<kYUV709To601>>},
-        {Kernel::YUV601To709Float32Row, Row<YUVToYUVFloat<kYUV601To709>>},
-        {Kernel::YUV709To601Float32Row, Row<YUVToYUVFloat<kYUV709To601>>},
-        {Kernel::UYVY601To709Row, Row<UYVYToUYVY<kYUV601To709>>},
-        {Kernel::UYVY709To601Row, Row<UYVYToUYVY<kYUV709To601>>},
-        {Kernel::YUYV601To709Row, Row<YUYVToYUYV<kYUV601To709>>},
-        {Kernel::YUYV709To601Row, Row<YUYVToYUYV<kYUV709To601>>},
+    static constexpr YUVToYUVKernels kernels = {
+        .YUV601To709Row = Row<YUVToYUV8<kYUV601To709>>,
+        .YUV709To601Row = Row<YUVToYUV8<kYUV709To601>>,
+        .YUV601To709Float32Row = Row<YUVToYUVFloat<kYUV601To709>>,
+        .YUV709To601Float32Row = Row<YUVToYUVFloat<kYUV709To601>>,
+        .UYVY601To709Row = Row<UYVYToUYVY<kYUV601To709>>,
+        .UYVY709To601Row = Row<UYVYToUYVY<kYUV709To601>>,
+        .YUYV601To709Row = Row<YUYVToYUYV<kYUV601To709>>,
+        .YUYV709To601Row = Row<YUYVToYUYV<kYUV709To601>>,
     };
-    return bodies;
+    return kernels;
 }

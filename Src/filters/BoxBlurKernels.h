@@ -29,6 +29,8 @@ struct BoxBlurKernels {
     Run bundle; ///< for sizes up to kLargestBundleSize
     Run line;   ///< a single line, for any size
 
+    static constexpr const char* kFamily = "BoxBlur";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const BoxBlurKernels& For(); // BoxBlur.kernels.cpp
 };

@@ -22,28 +22,6 @@ int64_t PlanarSize(int64_t width, int64_t height) {
 
 } // namespace
 
-int32_t BytesPerPixel(PK_PixelFormat format) noexcept {
-    if (format == PK_PixelFormat_Invalid) return 0; // though its bits are those of 8-bit samples
-    const bool fourChannels = IsPacked4444(format);
-    switch (format & kDepthMask) {
-    case kDepth8u:
-        return fourChannels ? 4 : 2;
-    case kDepth10u:
-        return IsYUV(format) ? 0 : 4;
-    case kDepth15u:
-        return 8;
-    case kDepth32f:
-        return fourChannels ? 16 : 8;
-    default:
-        return 0;
-    }
-}
-
-RowLayout LayoutOfRow(PK_PixelFormat format) noexcept {
-    if (IsV210(format)) return {6, 16, 128};
-    return {1, BytesPerPixel(format), Is422(format) ? 16 : 64};
-}
-
 } // namespace PK
 
 using namespace PK;

@@ -89,7 +89,22 @@ constexpr bool HasNoAlphaMeaning(PK_PixelFormat format) {
 inline constexpr int32_t kMaximumWidth = INT32_MAX / 16;
 
 /// Bytes of a pixel of an interleaved format, 0 for an unknown depth and for 10-bit YUV.
-int32_t BytesPerPixel(PK_PixelFormat format) noexcept;
+constexpr int32_t BytesPerPixel(PK_PixelFormat format) {
+    if (format == 0) return 0; // no format, though its bits are those of 8-bit samples
+    const bool fourChannels = IsPacked4444(format);
+    switch (format & kDepthMask) {
+    case kDepth8u:
+        return fourChannels ? 4 : 2;
+    case kDepth10u:
+        return IsYUV(format) ? 0 : 4;
+    case kDepth15u:
+        return 8;
+    case kDepth32f:
+        return fourChannels ? 16 : 8;
+    default:
+        return 0;
+    }
+}
 
 /// How a raster row is laid out: groups of pixels, then padding to a multiple of the alignment.
 struct RowLayout {
@@ -98,6 +113,9 @@ struct RowLayout {
     int32_t alignment;
 };
 
-RowLayout LayoutOfRow(PK_PixelFormat format) noexcept;
+constexpr RowLayout LayoutOfRow(PK_PixelFormat format) {
+    if (IsV210(format)) return {6, 16, 128};
+    return {1, BytesPerPixel(format), Is422(format) ? 16 : 64};
+}
 
 } // namespace PK

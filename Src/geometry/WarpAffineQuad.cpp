@@ -118,14 +118,18 @@ WarpDestination MakeDestination(void* pixels, int32_t rowBytes, const PK_Rect& r
             .field = field};
 }
 
+template <class Kernels>
+FillWarpSpan ChooseRule(const Kernels& kernels, bool featherOver, bool blend, PK_PixelFormat format) {
+    if (featherOver) return kernels.featherOver;
+    if (!blend) return kernels.copy;
+    if (format == PK_PixelFormat_BGRA_4444_8u) return kernels.blendBGRA;
+    if (format == PK_PixelFormat_VUYA_4444_8u) return kernels.blendVUYA;
+    return kernels.blendOther;
+}
+
 FillWarpSpan ChooseKernel(bool bilinear, bool featherOver, bool blend, PK_PixelFormat format) {
-    const WarpKernels& kernels = Best<WarpKernels>();
-    const WarpRules& rules = bilinear ? kernels.bilinear : kernels.nearest;
-    if (featherOver) return rules.featherOver;
-    if (!blend) return rules.copy;
-    if (format == PK_PixelFormat_BGRA_4444_8u) return rules.blendBGRA;
-    if (format == PK_PixelFormat_VUYA_4444_8u) return rules.blendVUYA;
-    return rules.blendOther;
+    return bilinear ? ChooseRule(Best<WarpBilinearKernels>(), featherOver, blend, format)
+                    : ChooseRule(Best<WarpNearestKernels>(), featherOver, blend, format);
 }
 
 /// Without a rim there is nothing between the corners and their insets: so for a feather that is negative or

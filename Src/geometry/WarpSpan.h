@@ -40,20 +40,24 @@ struct WarpSpan {
 
 using FillWarpSpan = void (*)(const WarpSource& source, const WarpPaint& paint, const WarpSpan& span);
 
+enum class WarpSampling : uint8_t { nearest, bilinear };
+
 /// One function for each rule of writing.
-struct WarpRules {
+template <WarpSampling kSampling>
+struct WarpKernels {
     FillWarpSpan featherOver; // colours over the destination by the edge alpha
     FillWarpSpan copy;
     FillWarpSpan blendBGRA;
     FillWarpSpan blendVUYA;
     FillWarpSpan blendOther; // formats whose colours are not mixed
-};
 
-struct WarpKernels {
-    WarpRules nearest, bilinear;
-
+    static constexpr const char* kFamily =
+        kSampling == WarpSampling::nearest ? "WarpNearest" : "WarpBilinear";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const WarpKernels& For();
 };
+using WarpNearestKernels = WarpKernels<WarpSampling::nearest>;
+using WarpBilinearKernels = WarpKernels<WarpSampling::bilinear>;
 
 } // namespace PK

@@ -288,10 +288,10 @@ void FillSpan(const WarpSource& from, const WarpPaint& by, const WarpSpan& span)
     }
 }
 
-template <class Sampling>
-constexpr WarpRules kRules = {FillSpan<Sampling, FeatherOver>, FillSpan<Sampling, Copy>,
-                              FillSpan<Sampling, Blend<MixBGRA>>, FillSpan<Sampling, Blend<MixVUYA>>,
-                              FillSpan<Sampling, Blend<MixOther>>};
+template <class Kernels, class Sampling>
+constexpr Kernels kRules = {FillSpan<Sampling, FeatherOver>, FillSpan<Sampling, Copy>,
+                            FillSpan<Sampling, Blend<MixBGRA>>, FillSpan<Sampling, Blend<MixVUYA>>,
+                            FillSpan<Sampling, Blend<MixOther>>};
 
 } // namespace
 } // namespace PK::PK_TARGET
@@ -299,10 +299,15 @@ constexpr WarpRules kRules = {FillSpan<Sampling, FeatherOver>, FillSpan<Sampling
 namespace PK {
 
 template <>
-const WarpKernels& WarpKernels::For<Target::PK_TARGET>() {
-    static constexpr WarpKernels kernels = {PK_TARGET::kRules<PK_TARGET::NearestSampling>,
-                                            PK_TARGET::kRules<PK_TARGET::BilinearSampling>};
-    return kernels;
+template <>
+const WarpNearestKernels& WarpNearestKernels::For<Target::PK_TARGET>() {
+    return PK_TARGET::kRules<WarpNearestKernels, PK_TARGET::NearestSampling>;
+}
+
+template <>
+template <>
+const WarpBilinearKernels& WarpBilinearKernels::For<Target::PK_TARGET>() {
+    return PK_TARGET::kRules<WarpBilinearKernels, PK_TARGET::BilinearSampling>;
 }
 
 } // namespace PK

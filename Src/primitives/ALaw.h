@@ -2,17 +2,18 @@
 
 // Decoding of A-law (ITU-T G.711).
 
-#include "primitives/simd/Targets.h"
+#include "primitives/KernelShapes.h"
 
-#include <cstddef>
 #include <cstdint>
 
 namespace PK {
 
 /// The bodies of one instruction set.
 struct ALawKernels {
-    void (*toLinear16)(const uint8_t* source, uint8_t* destination, size_t count);
+    RowKernel toLinear16;
 
+    static constexpr const char* kFamily = "ALaw";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const ALawKernels& For();
 };

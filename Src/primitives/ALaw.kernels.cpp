@@ -5,7 +5,7 @@
 //   |sample| = 8 (2 m + 33) 2^(s - 1)  for s > 0
 
 #include "primitives/ALaw.h"
-#include "primitives/simd/RunGroups.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -20,9 +20,7 @@ inline I32 Multipliers() {
                      0x04020101, 0x40201008);
 }
 
-struct ALawToLinear {
-    static constexpr size_t kElements = 4 * kLanes;
-    static constexpr size_t kSourceElement = 1, kDestinationElement = 2;
+struct ALawToLinear : Groups<4 * kLanes, Each<2>, Each<1>> {
 
     void Group(const uint8_t* source, uint8_t* destination) const {
         const I32 codes = LoadInts(source) ^ Ints(0x55555555);
@@ -36,15 +34,11 @@ struct ALawToLinear {
     }
 };
 
-void ALawToLinear16Run(const uint8_t* source, uint8_t* destination, size_t count) {
-    RunGroups(ALawToLinear(), static_cast<ptrdiff_t>(count), destination, source);
-}
-
 } // namespace
 } // namespace PK::PK_TARGET
 
 template <>
 const PK::ALawKernels& PK::ALawKernels::For<PK::Target::PK_TARGET>() {
-    static constexpr ALawKernels kernels = {PK_TARGET::ALawToLinear16Run};
+    static constexpr ALawKernels kernels = {PK_TARGET::Row<PK_TARGET::ALawToLinear>};
     return kernels;
 }

@@ -30,6 +30,8 @@ struct BlockTransformKernels {
     using Transform = void (*)(const int16_t* source, int16_t* destination);
     Transform forward8x8, inverse8x8, forward248, inverse248;
 
+    static constexpr const char* kFamily = "BlockTransform";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const BlockTransformKernels& For();
 };

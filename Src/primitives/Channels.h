@@ -2,10 +2,7 @@
 
 // One channel of four-channel pixels: set, set in a copy, or inverted.
 
-#include "primitives/simd/Targets.h"
-
-#include <cstddef>
-#include <cstdint>
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
@@ -19,14 +16,14 @@ struct ChannelPattern {
 /// destination may be the same row.
 struct ChannelKernels {
     /// Copies, with the bits of the pattern in the place of the channel.
-    void (*replace)(const uint8_t* source, uint8_t* destination, size_t bytes, const ChannelPattern& pattern);
+    RowKernelWith<ChannelPattern> replace;
     /// Sets the channel of the destination to that of the source, subtracted from the pattern's value as
     /// integers that wrap around, or as floats. The other channels of the destination stay.
-    void (*invertInteger)(const uint8_t* source, uint8_t* destination, size_t bytes,
-                          const ChannelPattern& pattern);
-    void (*invertFloat)(const uint8_t* source, uint8_t* destination, size_t bytes,
-                        const ChannelPattern& pattern);
+    RowKernelWith<ChannelPattern> invertInteger;
+    RowKernelWith<ChannelPattern> invertFloat;
 
+    static constexpr const char* kFamily = "Channel";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const ChannelKernels& For();
 };

@@ -1,7 +1,7 @@
 // One channel among others. The others are written back as they are.
 
 #include "primitives/Channels.h"
-#include "primitives/simd/RunGroups.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -11,9 +11,8 @@ inline I32 Repeated(const uint32_t (&lanes)[4]) {
                      static_cast<int32_t>(lanes[2]), static_cast<int32_t>(lanes[3]));
 }
 
-struct Channel {
-    static constexpr size_t kElements = 4 * kLanes;
-    static constexpr size_t kSourceElement = 1, kDestinationElement = 1;
+template <class Destination>
+struct Channel : Groups<4 * kLanes, Destination, Each<1>> {
 
     explicit Channel(const ChannelPattern& pattern)
         : fMask(Repeated(pattern.mask)), fBits(Repeated(pattern.bits)) {}
@@ -21,7 +20,7 @@ struct Channel {
     I32 fMask, fBits;
 };
 
-struct Replace : Channel {
+struct Replace : Channel<Each<1>> {
     using Channel::Channel;
 
     void Group(const uint8_t* source, uint8_t* destination) const {
@@ -30,7 +29,7 @@ struct Replace : Channel {
 };
 
 /// A channel is the highest or the lowest part of its lane, so that no borrow reaches it from below.
-struct InvertInteger : Channel {
+struct InvertInteger : Channel<Updated<Each<1>>> {
     using Channel::Channel;
 
     void Group(const uint8_t* source, uint8_t* destination) const {
@@ -39,7 +38,7 @@ struct InvertInteger : Channel {
     }
 };
 
-struct InvertFloat : Channel {
+struct InvertFloat : Channel<Updated<Each<1>>> {
     using Channel::Channel;
 
     void Group(const uint8_t* source, uint8_t* destination) const {
@@ -48,18 +47,13 @@ struct InvertFloat : Channel {
     }
 };
 
-template <class Formula>
-void ChannelRow(const uint8_t* source, uint8_t* destination, size_t bytes, const ChannelPattern& pattern) {
-    RunGroups(Formula(pattern), static_cast<ptrdiff_t>(bytes), destination, source);
-}
-
 } // namespace
 } // namespace PK::PK_TARGET
 
 template <>
 const PK::ChannelKernels& PK::ChannelKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr ChannelKernels kernels = {ChannelRow<Replace>, ChannelRow<InvertInteger>,
-                                               ChannelRow<InvertFloat>};
+    static constexpr ChannelKernels kernels = {RowWith<Replace>, RowWith<InvertInteger>,
+                                               RowWith<InvertFloat>};
     return kernels;
 }

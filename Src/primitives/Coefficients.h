@@ -2,9 +2,7 @@
 
 // Counting and scaling of the coefficients of blocks, around the transforms and the quantisation of DV.
 
-#include "primitives/simd/Targets.h"
-
-#include <cstdint>
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
@@ -12,8 +10,10 @@ namespace PK {
 /// Best<CoefficientKernels>() once and calls these.
 struct CoefficientKernels {
     uint32_t (*countZeros8x8)(const int16_t* block);
-    void (*multiplyScaled16s)(const int16_t* factors, int16_t* data, int32_t count, int32_t scale);
+    RowKernelWith<int32_t> multiplyScaled16s; ///< Factors, the data that they multiply, and the scale.
 
+    static constexpr const char* kFamily = "Coefficient";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const CoefficientKernels& For();
 };

@@ -1,7 +1,7 @@
 // The bodies for coefficients. Two values of 16 bits stand in each lane.
 
 #include "primitives/Coefficients.h"
-#include "primitives/simd/RunGroups.h"
+#include "primitives/lanes/RowDriver.h"
 #include "primitives/simd/Target.h"
 
 namespace PK {
@@ -27,9 +27,9 @@ uint32_t CountZeros(const int16_t* block) {
 /// Rows of 16-bit values in pairs. A product has 31 bits and a sign, so that half a unit of any scale that
 /// matters can be added to it.
 template <class Scaling>
-struct ScaledProduct {
-    static constexpr int kElements = 2 * kLanes;
-    static constexpr int kSourceElement = 2, kDestinationElement = 2;
+struct ScaledProduct : Groups<2 * kLanes, Updated<Each<2>>, Each<2>> {
+    explicit ScaledProduct(Scaling by) : scaling(by) {}
+
     Scaling scaling;
 
     void Group(const uint8_t* factors, uint8_t* data) const {
@@ -60,15 +60,14 @@ struct Multiplied {
     I32 Apply(I32 x) const { return ShiftLeft(Max(Ints(-32768), Min(Ints(32767), x)), bits); }
 };
 
-void MultiplyScaled(const int16_t* factors, int16_t* data, int32_t count, int32_t scale) {
+void MultiplyScaled(const void* factors, void* data, ptrdiff_t count, const int32_t& scale) {
     // Every product is at most half of 2^31 and rounds to 0 there; 2^15 times anything but 0 saturates.
     constexpr int32_t kMostDivided = 31, kMostMultiplied = 15;
     if (scale > 0) {
-        const ScaledProduct<Divided> formula = {{scale < kMostDivided ? scale : kMostDivided}};
-        RunGroups(formula, count, data, factors);
+        RunRow(ScaledProduct<Divided>({scale < kMostDivided ? scale : kMostDivided}), count, data, factors);
     } else {
-        const ScaledProduct<Multiplied> formula = {{scale > -kMostMultiplied ? -scale : kMostMultiplied}};
-        RunGroups(formula, count, data, factors);
+        RunRow(ScaledProduct<Multiplied>({scale > -kMostMultiplied ? -scale : kMostMultiplied}), count, data,
+               factors);
     }
 }
 

@@ -34,14 +34,13 @@ PowerOfTwo ScaleFactor(int32_t scale) {
     return {std::ldexp(1.0f, half), std::ldexp(1.0f, exponent - half)};
 }
 
-int32_t Convert(ConvertFloatKernels::Run run, const void* source, void* destination, int32_t count,
+int32_t Convert(RowKernelWith<PowerOfTwo> run, const void* source, void* destination, int32_t count,
                 int32_t scale) {
     if (source == nullptr || destination == nullptr) return kStatusNullPointer;
     if (count < 0) return kStatusBadSize;
     const PowerOfTwo factor = ScaleFactor(scale);
     const ScalingMode mode;
-    run(static_cast<const uint8_t*>(source), static_cast<uint8_t*>(destination), static_cast<size_t>(count),
-        factor);
+    run(source, destination, count, factor);
     return kStatusOk;
 }
 

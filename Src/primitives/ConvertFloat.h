@@ -2,10 +2,7 @@
 
 // Floats to integers of 32 and 16 bits, scaled by a power of two.
 
-#include "primitives/simd/Targets.h"
-
-#include <cstddef>
-#include <cstdint>
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
@@ -16,10 +13,11 @@ struct PowerOfTwo {
 
 /// The bodies of one instruction set. They round by the current mode or truncate, and saturate; NaN gives 0.
 struct ConvertFloatKernels {
-    using Run = void (*)(const uint8_t* source, uint8_t* destination, size_t count, PowerOfTwo scale);
-    Run nearestToInt32, truncatedToInt32;
-    Run nearestToInt16, truncatedToInt16;
+    RowKernelWith<PowerOfTwo> nearestToInt32, truncatedToInt32;
+    RowKernelWith<PowerOfTwo> nearestToInt16, truncatedToInt16;
 
+    static constexpr const char* kFamily = "ConvertFloat";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const ConvertFloatKernels& For();
 };

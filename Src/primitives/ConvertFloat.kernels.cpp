@@ -2,7 +2,7 @@
 // normal float, which become 0 either way.
 
 #include "primitives/ConvertFloat.h"
-#include "primitives/simd/RunGroups.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -29,9 +29,7 @@ struct Scale {
 };
 
 template <bool kNearest>
-struct ToInt32 : Scale {
-    static constexpr size_t kElements = kLanes;
-    static constexpr size_t kSourceElement = 4, kDestinationElement = 4;
+struct ToInt32 : Scale, Groups<kLanes, Each<4>, Each<4>> {
     using Scale::Scale;
 
     /// What the conversion cannot tell becomes INT32_MIN, whose complement is INT32_MAX.
@@ -43,9 +41,7 @@ struct ToInt32 : Scale {
 };
 
 template <bool kNearest>
-struct ToInt16 : Scale {
-    static constexpr size_t kElements = 2 * kLanes;
-    static constexpr size_t kSourceElement = 4, kDestinationElement = 2;
+struct ToInt16 : Scale, Groups<2 * kLanes, Each<2>, Each<4>> {
     using Scale::Scale;
 
     /// Limited from above, since what is too great for the conversion would become the least integer.
@@ -59,18 +55,13 @@ struct ToInt16 : Scale {
     }
 };
 
-template <class Formula>
-void ConvertRun(const uint8_t* source, uint8_t* destination, size_t count, PowerOfTwo scale) {
-    RunGroups(Formula(scale), static_cast<ptrdiff_t>(count), destination, source);
-}
-
 } // namespace
 } // namespace PK::PK_TARGET
 
 template <>
 const PK::ConvertFloatKernels& PK::ConvertFloatKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr ConvertFloatKernels kernels = {ConvertRun<ToInt32<true>>, ConvertRun<ToInt32<false>>,
-                                                    ConvertRun<ToInt16<true>>, ConvertRun<ToInt16<false>>};
+    static constexpr ConvertFloatKernels kernels = {RowWith<ToInt32<true>>, RowWith<ToInt32<false>>,
+                                                    RowWith<ToInt16<true>>, RowWith<ToInt16<false>>};
     return kernels;
 }

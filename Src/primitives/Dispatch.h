@@ -1,53 +1,58 @@
 #pragma once
 
-// Which instruction sets may be used at this moment, and the choice among the bodies of a kernel source.
+// Which targets may run at this moment, and the choice among the bodies of a family of kernels (Targets.h):
 //
-// A kernel source that is no family of row kernels hands over its functions as a structure of pointers:
-//
-//   struct TransposeKernels {
-//       void (*block)(...);
-//       template <Target> static const TransposeKernels& For(); // defined in Transpose.kernels.cpp, one a target
-//   };
-//
-//   Best<TransposeKernels>().block(...);
+//   Best<TransposeKernels>().pixels4(area);
 
 #include "primitives/simd/Targets.h"
 
+#include <cstddef>
+#include <span>
+#include <utility>
+
 namespace PK {
+
+struct CpuFlags;
+
+inline constexpr Target kFlagTargets[] = {Target::plain, Target::sse2, Target::ssse3,
+                                          Target::sse41, Target::avx2, Target::avx512};
+inline constexpr Target kProcessorTargets[] = {Target::plain, Target::sse2, Target::sse41, Target::avx,
+                                               Target::avx2fma};
+
+/// The targets of an offer, from the lowest up.
+constexpr std::span<const Target> TargetsOf(Offer offer) {
+    if (offer == Offer::processor) return kProcessorTargets;
+    return kFlagTargets;
+}
 
 const char* TargetName(Target target) noexcept;
 
-/// Whether the capability flags allow the bodies of a target at this moment. A target stands on all lower
-/// ones, so that switching SSE2 off leaves the plain bodies.
-bool IsEnabled(Target target) noexcept;
+/// Whether a processor of this record runs the bodies of a target.
+bool Runs(const CpuFlags& processor, Target target) noexcept;
 
-/// The highest target that is enabled at this moment.
-Target BestTarget() noexcept;
+/// Whether the bodies of a target of the offer may run at this moment. By the flags, a target stands on all lower ones:
+/// switching SSE2 off leaves the plain bodies.
+bool IsEnabled(Target target, Offer offer = Offer::flags) noexcept;
 
-/// The functions of one target; the tests compare them all.
-template <class Kernels>
-const Kernels& KernelsFor(Target target) noexcept {
-    switch (target) {
-    case Target::avx512:
-        return Kernels::template For<Target::avx512>();
-    case Target::avx2:
-        return Kernels::template For<Target::avx2>();
-    case Target::sse41:
-        return Kernels::template For<Target::sse41>();
-    case Target::ssse3:
-        return Kernels::template For<Target::ssse3>();
-    case Target::sse2:
-        return Kernels::template For<Target::sse2>();
-    case Target::plain:
-        break;
-    }
-    return Kernels::template For<Target::plain>();
+/// The highest target of the offer that is enabled at this moment.
+Target BestTarget(Offer offer = Offer::flags) noexcept;
+
+/// The functions of one target of the family's offer.
+template <class Family>
+const Family& KernelsFor(Target target) noexcept {
+    constexpr std::span<const Target> kTargets = TargetsOf(Family::kOffer);
+    const Family* kernels = nullptr;
+    const auto find = [&]<std::size_t... kIndices>(std::index_sequence<kIndices...>) {
+        ((target == kTargets[kIndices] && (kernels = &Family::template For<kTargets[kIndices]>())) || ...);
+    };
+    find(std::make_index_sequence<kTargets.size()>());
+    return *kernels;
 }
 
 /// The functions of the highest target that is enabled at this moment.
-template <class Kernels>
-const Kernels& Best() noexcept {
-    return KernelsFor<Kernels>(BestTarget());
+template <class Family>
+const Family& Best() noexcept {
+    return KernelsFor<Family>(BestTarget(Family::kOffer));
 }
 
 } // namespace PK

@@ -20,6 +20,8 @@ struct FillKernels {
     /// Fills a run of bytes that begins with the pattern's first.
     void (*run)(uint8_t* destination, size_t bytes, const FillPattern& pattern);
 
+    static constexpr const char* kFamily = "Fill";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const FillKernels& For();
 };

@@ -40,8 +40,7 @@ int32_t MultiplyConstant(const uint8_t* source, ptrdiff_t sourceStep, const uint
     const auto multiplyRow = isScaled ? kernels.scaled : kernels.unscaled;
     const ChannelFactors factors = isScaled ? ScaledFactors(value, scale) : UnscaledFactors(value, scale);
     for (ptrdiff_t row = 0; row < height; ++row) {
-        multiplyRow(source + row * sourceStep, destination + row * destinationStep,
-                    static_cast<size_t>(width), factors);
+        multiplyRow(source + row * sourceStep, destination + row * destinationStep, width, factors);
     }
     return kStatusOk;
 }

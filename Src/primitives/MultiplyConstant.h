@@ -2,10 +2,7 @@
 
 // Four-channel 8-bit pixels multiplied by a constant a channel.
 
-#include "primitives/simd/Targets.h"
-
-#include <cstddef>
-#include <cstdint>
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
@@ -18,10 +15,12 @@ struct ChannelFactors {
 
 /// The bodies of one instruction set. Source and destination may be the same row.
 struct MultiplyConstantKernels {
-    using Row = void (*)(const uint8_t* source, uint8_t* destination, size_t pixels, ChannelFactors factors);
-    Row unscaled; ///< the products saturated
-    Row scaled;   ///< the products divided by 2^scale, to the nearest, ties to even, and saturated
+    RowKernelWith<ChannelFactors> unscaled; ///< the products saturated
+    RowKernelWith<ChannelFactors>
+        scaled; ///< the products divided by 2^scale, to the nearest, ties to even, and saturated
 
+    static constexpr const char* kFamily = "MultiplyConstant";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const MultiplyConstantKernels& For();
 };

@@ -1,7 +1,7 @@
 // Products of bytes in 16-bit halves, and their rounding quotients by powers of two.
 
 #include "primitives/MultiplyConstant.h"
-#include "primitives/simd/RunGroups.h"
+#include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -27,9 +27,7 @@ inline I32 ScaleHalves(I32 halves, I32 unit) {
 }
 
 template <bool kScaled>
-struct Multiply {
-    static constexpr size_t kElements = kLanes;
-    static constexpr size_t kSourceElement = 4, kDestinationElement = 4;
+struct Multiply : Groups<kLanes, Each<4>, Each<4>> {
 
     explicit Multiply(ChannelFactors factors)
         : fEven(InEveryLane(factors.even)), fOdd(InEveryLane(factors.odd)), fUnit(InEveryLane(factors.unit)) {
@@ -53,17 +51,12 @@ struct Multiply {
     I32 fEven, fOdd, fUnit;
 };
 
-template <bool kScaled>
-void MultiplyRow(const uint8_t* source, uint8_t* destination, size_t pixels, ChannelFactors factors) {
-    RunGroups(Multiply<kScaled>(factors), static_cast<ptrdiff_t>(pixels), destination, source);
-}
-
 } // namespace
 } // namespace PK::PK_TARGET
 
 template <>
 const PK::MultiplyConstantKernels& PK::MultiplyConstantKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr MultiplyConstantKernels kernels = {MultiplyRow<false>, MultiplyRow<true>};
+    static constexpr MultiplyConstantKernels kernels = {RowWith<Multiply<false>>, RowWith<Multiply<true>>};
     return kernels;
 }

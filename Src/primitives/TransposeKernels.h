@@ -2,7 +2,7 @@
 
 // Rows and columns exchanged, in tiles of whole vectors.
 
-#include "primitives/simd/Targets.h"
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
@@ -22,8 +22,10 @@ struct TransposeKernels {
     void (*pixels4)(const TransposeArea& area);
     void (*pixels8)(const TransposeArea& area);
     void (*pixels16)(const TransposeArea& area);
-    void (*reverseRow)(const void* source, void* destination, int32_t width); ///< four-byte pixels
+    RowKernel reverseRow; ///< four-byte pixels
 
+    static constexpr const char* kFamily = "Transpose";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const TransposeKernels& For(); // Transpose.kernels.cpp
 };

@@ -6,18 +6,18 @@
 // Results are the same in all bodies. Those in float are rounded once, by the current rounding mode: in
 // rounding to nearest they are within 0.501 units in the last place of the exact value.
 
-#include "primitives/simd/Targets.h"
-
-#include <cstdint>
+#include "primitives/KernelShapes.h"
 
 namespace PK {
 
 /// The bodies of one target. They check nothing but the count.
 struct VectorMathKernels {
-    void (*pow)(const float* x, const float* y, float* result, int32_t count);
-    void (*exp)(const int32_t* mask, float* values, int32_t count);
-    void (*divide)(const int32_t* dividends, const int32_t* divisors, int32_t* quotients, int32_t count);
+    TwoRowKernel pow; ///< x, y and the result.
+    RowKernel exp;    ///< The mask, and the values that change.
+    TwoRowKernel divide;
 
+    static constexpr const char* kFamily = "VectorMath";
+    static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const VectorMathKernels& For();
 };

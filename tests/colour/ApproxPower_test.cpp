@@ -35,12 +35,12 @@ void ForAllMagnitudes(Function function) {
 }
 
 /// A value through the first power of a body; the second, with the exponent 1, is taken along.
-float PowerOfBody(FloatTarget target, float x, float exponent) {
-    const GammaConversion conversion = {exponent, 1, {0, 0, 0}, false, false};
+float PowerOfBody(Target target, float x, float exponent) {
+    const float unused[9] = {};
+    const GammaConversion conversion = {unused, exponent, 1, {0, 0, 0}, false, false};
     const ColourPixels source(8, {x, x, x, x});
     ColourPixels result(8);
-    const float unused[9] = {};
-    KernelsFor<GammaKernels>(target).convert(Floats(source), Floats(result), 8, unused, conversion);
+    KernelsFor<GammaKernels>(target).convert(Floats(source), Floats(result), 8, conversion);
     return result[0][0];
 }
 
@@ -71,26 +71,25 @@ TEST(ApproxPower, LogarithmOverAllMagnitudes) {
 }
 
 TEST(ApproxPower, NothingButPositiveNumbersHasAPower) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const float exponent : {2.4f, 0.41666666f, 0.0f}) {
-            EXPECT_EQ(std::bit_cast<uint32_t>(PowerOfBody(target, 0, exponent)), 0u)
-                << FloatTargetName(target);
+            EXPECT_EQ(std::bit_cast<uint32_t>(PowerOfBody(target, 0, exponent)), 0u) << TargetName(target);
             EXPECT_EQ(std::bit_cast<uint32_t>(PowerOfBody(target, -0.0f, exponent)), 0x80000000u)
-                << FloatTargetName(target);
-            EXPECT_EQ(PowerOfBody(target, kNaN, exponent), 0) << FloatTargetName(target);
+                << TargetName(target);
+            EXPECT_EQ(PowerOfBody(target, kNaN, exponent), 0) << TargetName(target);
         }
 }
 
 TEST(ApproxPower, DenormalsCountAsTheLeastNormalNumber) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const float x : {0x1p-149f, 0x1.8p-130f, 0x1.fffffcp-127f})
             EXPECT_EQ(PowerOfBody(target, x, 0.5f), PowerOfBody(target, 0x1p-126f, 0.5f))
-                << FloatTargetName(target);
+                << TargetName(target);
 }
 
 TEST(ApproxPower, IsHeldBetweenTheEndsOfTheExponent) {
     // Below 2^-126.5 nothing is left, and above 2^127.49999 nothing grows.
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
         for (const float x : {0x1p64f, 0x1p127f, std::numeric_limits<float>::infinity()}) {
             EXPECT_NEAR(static_cast<double>(PowerOfBody(target, x, 2.4f)) / kMostPower, 1, 0x1p-10) << x;
             EXPECT_EQ(PowerOfBody(target, 1 / x, 2.4f), 0) << x;
@@ -99,9 +98,9 @@ TEST(ApproxPower, IsHeldBetweenTheEndsOfTheExponent) {
 }
 
 TEST(ApproxPower, OneStaysOne) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const float exponent : {2.4f, 0.41666666f, 30.0f})
-            EXPECT_EQ(PowerOfBody(target, 1, exponent), 1) << FloatTargetName(target) << ", " << exponent;
+            EXPECT_EQ(PowerOfBody(target, 1, exponent), 1) << TargetName(target) << ", " << exponent;
 }
 
 } // namespace

@@ -178,12 +178,12 @@ TEST(ClampFloatPixels, EveryBodyAgreesWithTheSlowForm) {
     constexpr std::pair<float, float> kLimits[] = {
         {0, 1}, {-0.0f, 0.0f}, {1, 0}, {-kInfinity, 0.5f}, {0.25f, kInfinity}};
     for (const auto& [least, most] : kLimits)
-        for (const PK::FloatTarget target : FloatTargetsOfThisProcessor()) {
+        for (const PK::Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
             for (size_t i = 0; i < image.size(); ++i) expected[i] = ClampInGroup(image[i], least, most);
             Floats clamped(image.size());
-            PK::KernelsFor<PK::ClampKernels>(target).clamp(image.data(), clamped.data(), 4096, least, most);
+            PK::KernelsFor<PK::ClampKernels>(target).clamp(image.data(), clamped.data(), 4096, {least, most});
             EXPECT_EQ(std::memcmp(clamped.data(), expected.data(), 4 * image.size()), 0)
-                << PK::FloatTargetName(target) << ", from " << least << " to " << most;
+                << PK::TargetName(target) << ", from " << least << " to " << most;
         }
 }
 

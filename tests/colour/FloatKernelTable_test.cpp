@@ -22,7 +22,7 @@ std::atomic<int> sChoices = 0, sCalls = 0;
 template <int kTest>
 struct ProbeKernels {
     struct Call {
-        FloatTarget target;
+        Target target;
         const float* source;
         float* destination;
         int32_t count;
@@ -31,13 +31,15 @@ struct ProbeKernels {
 
     void (*probe)(const float* source, float* destination, int32_t count, float number, Call& call);
 
-    template <FloatTarget kTarget>
+    static constexpr Offer kOffer = Offer::processor;
+
+    template <Target kTarget>
     static void Probe(const float* source, float* destination, int32_t count, float number, Call& call) {
         ++sCalls;
         call = {kTarget, source, destination, count, number};
     }
 
-    template <FloatTarget kTarget>
+    template <Target kTarget>
     static const ProbeKernels& For() {
         static constexpr ProbeKernels kernels = {Probe<kTarget>};
         ++sChoices;
@@ -52,7 +54,7 @@ TEST(FloatKernelTable, TheFirstCallChoosesAndGoesOn) {
     for (int i = 1; i <= 3; ++i) {
         ProbeKernels<0>::Call call{};
         Slot::Call(&from, &to, 40 + i, 0.5f, call);
-        EXPECT_EQ(call.target, BestFloatTarget());
+        EXPECT_EQ(call.target, BestTarget(Offer::processor));
         EXPECT_EQ(call.source, &from);
         EXPECT_EQ(call.destination, &to);
         EXPECT_EQ(call.count, 40 + i);
@@ -76,7 +78,7 @@ TEST(FloatKernelTable, ThreadsMayMeetInTheFirstCall) {
         });
     for (std::thread& thread : threads) thread.join();
     for (size_t i = 0; i < kThreads; ++i) {
-        EXPECT_EQ(calls[i].target, BestFloatTarget());
+        EXPECT_EQ(calls[i].target, BestTarget(Offer::processor));
         EXPECT_EQ(calls[i].count, static_cast<int32_t>(i));
     }
     EXPECT_EQ(sCalls, kThreads);
@@ -90,8 +92,8 @@ void ExpectBound(const Arguments&... arguments) {
     Random random(5);
     const ColourPixels source = UniformPixels(random, 40, -0.3f, 1.3f);
     ColourPixels expected(source.size()), actual(source.size());
-    (KernelsFor<Kernels>(BestFloatTarget()).*kKernel)(source.data()->data(), expected.data()->data(),
-                                                      arguments...);
+    (KernelsFor<Kernels>(BestTarget(Offer::processor)).*kKernel)(source.data()->data(),
+                                                                 expected.data()->data(), arguments...);
     for (int i = 0; i < 2; ++i) {
         actual.assign(source.size(), ColourPixel{});
         Slot::Call(source.data()->data(), actual.data()->data(), arguments...);
@@ -103,15 +105,17 @@ void ExpectBound(const Arguments&... arguments) {
 TEST(FloatKernelTable, AllSlotsHoldTheBestBody) {
     using Table = FloatKernelTable;
     const float matrix[9] = {0.6f, 0.3f, 0.1f, 0.1f, 0.8f, 0.1f, -0.1f, 0.2f, 0.9f};
-    const GammaConversion conversion = {2.4f, 0.45f, {0.2126f, 0.7152f, 0.0722f}, true, true};
-    ExpectBound<Table::PQToRec709Kernel, &PQKernels::toRec709, PQKernels>(40, +matrix, PQDecodeTable());
-    ExpectBound<Table::Rec709ToPQKernel, &PQKernels::fromRec709, PQKernels>(40, +matrix, 1.5f);
-    ExpectBound<Table::HLGToRec709Kernel, &HLGKernels::toRec709, HLGKernels>(40, +matrix, HLGDecodeTable());
-    ExpectBound<Table::Rec709ToHLGKernel, &HLGKernels::fromRec709, HLGKernels>(40, +matrix);
-    ExpectBound<Table::ClampFloats, &ClampKernels::clamp, ClampKernels>(160, 0.1f, 0.9f);
+    const GammaConversion conversion = {matrix, 2.4f, 0.45f, {0.2126f, 0.7152f, 0.0722f}, true, true};
+    ExpectBound<Table::PQToRec709Kernel, &PQKernels::toRec709, PQKernels>(
+        40, SignalDecoding{matrix, PQDecodeTable()});
+    ExpectBound<Table::Rec709ToPQKernel, &PQKernels::fromRec709, PQKernels>(40, PQEncoding{matrix, 1.5f});
+    ExpectBound<Table::HLGToRec709Kernel, &HLGKernels::toRec709, HLGKernels>(
+        40, SignalDecoding{matrix, HLGDecodeTable()});
+    ExpectBound<Table::Rec709ToHLGKernel, &HLGKernels::fromRec709, HLGKernels>(40, HLGEncoding{matrix});
+    ExpectBound<Table::ClampFloats, &ClampKernels::clamp, ClampKernels>(160, FloatRange{0.1f, 0.9f});
     ExpectBound<Table::YUVToRGBKernel, &YUVKernels::toRGB, YUVKernels>(40);
     ExpectBound<Table::RGBToYUVKernel, &YUVKernels::fromRGB, YUVKernels>(40);
-    ExpectBound<Table::ConvertGammaKernel, &GammaKernels::convert, GammaKernels>(40, +matrix, conversion);
+    ExpectBound<Table::ConvertGammaKernel, &GammaKernels::convert, GammaKernels>(40, conversion);
 }
 
 } // namespace

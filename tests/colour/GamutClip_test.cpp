@@ -87,11 +87,11 @@ TEST(GamutClip, NaNPasses) {
 constexpr float kUnitMatrix[9] = {1, 0, 0, 0, 1, 0, 0, 0, 1};
 
 /// Linear pixels through the clip of one body: both powers are 1.
-ColourPixels ClippedBy(FloatTarget target, const ColourPixels& pixels, const float* luma) {
-    const GammaConversion conversion = {1, 1, {luma[0], luma[1], luma[2]}, true, true};
+ColourPixels ClippedBy(Target target, const ColourPixels& pixels, const float* luma) {
+    const GammaConversion conversion = {kUnitMatrix, 1, 1, {luma[0], luma[1], luma[2]}, true, true};
     ColourPixels result(pixels.size());
     KernelsFor<GammaKernels>(target).convert(pixels.data()->data(), result.data()->data(),
-                                             static_cast<int32_t>(pixels.size()), kUnitMatrix, conversion);
+                                             static_cast<ptrdiff_t>(pixels.size()), conversion);
     return result;
 }
 
@@ -124,9 +124,9 @@ TEST(GamutClip, BringsColoursIntoTheGamut) {
 TEST(GamutClipLanes, AreNearTheClipOfSinglePixels) {
     Random random(10);
     const ColourPixels colours = Colours(random, 8000);
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
         const ColourPixels clipped = ClippedBy(target, colours, kRec709);
-        WorstError worst(std::string("gamut clip in bulk, absolute, ") + FloatTargetName(target));
+        WorstError worst(std::string("gamut clip in bulk, absolute, ") + TargetName(target));
         for (size_t i = 0; i < colours.size(); ++i) {
             const ColourPixel exact = reference::SingleClip(colours[i], kRec709);
             for (size_t k = 0; k < 3; ++k)
@@ -137,17 +137,17 @@ TEST(GamutClipLanes, AreNearTheClipOfSinglePixels) {
 }
 
 TEST(GamutClipLanes, GreysAboveOneBecomeExactlyOneInEveryBody) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const float grey : {1.5f, 2.0f, 100.0f, 1e30f, kInfinity})
             for (const ColourPixel& pixel :
                  ClippedBy(target, ColourPixels(8, {grey, grey, grey, 7}), kRec709))
-                EXPECT_EQ(pixel, (ColourPixel{1, 1, 1, 7})) << FloatTargetName(target) << " " << grey;
+                EXPECT_EQ(pixel, (ColourPixel{1, 1, 1, 7})) << TargetName(target) << " " << grey;
 }
 
 TEST(GamutClipLanes, AChannelOfExactlyOneComesOutNearIt) {
-    for (const FloatTarget target : FloatTargetsOfThisProcessor())
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const ColourPixel& pixel : ClippedBy(target, ColourPixels(8, {0.25f, 0.5f, 1, 7}), kRec709)) {
-            EXPECT_NEAR(pixel[0], 0.25f, 0.25f * 0x1p-9f) << FloatTargetName(target);
+            EXPECT_NEAR(pixel[0], 0.25f, 0.25f * 0x1p-9f) << TargetName(target);
             EXPECT_NEAR(pixel[1], 0.5f, 0.5f * 0x1p-9f);
             EXPECT_NEAR(pixel[2], 1.0f, 0x1p-9f);
         }

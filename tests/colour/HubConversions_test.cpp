@@ -37,7 +37,7 @@ std::ostream& operator<<(std::ostream& stream, const HubConversion& conversion) 
 }
 
 Rounding BulkRounding() {
-    return RoundingOf(BestFloatTarget());
+    return RoundingOf(BestTarget(Offer::processor));
 }
 
 /// The matrix between a space and the hub, kept for the run.

@@ -131,10 +131,10 @@ TEST(Rec2020YUV, PixelsBehindGroupsAgreeWithTheSumsWrittenOut) {
 TEST(Rec2020YUV, EveryBodyAgreesWithTheSumsWrittenOut) {
     Random random(29);
     const ColourPixels pixels = MakePixels(Content::kMixed, 8000, random);
-    for (const FloatTarget target : FloatTargetsOfThisProcessor()) {
-        SCOPED_TRACE(FloatTargetName(target));
+    for (const Target target : TargetsOfThisProcessor(PK::Offer::processor)) {
+        SCOPED_TRACE(TargetName(target));
         const YUVKernels& kernels = KernelsFor<YUVKernels>(target);
-        const bool isFused = target == FloatTarget::avx2fma;
+        const bool isFused = target == Target::avx2fma;
         ExpectSame(Converted(pixels, kernels.toRGB), pixels, isFused ? GroupToRGB<true> : GroupToRGB<false>,
                    0, pixels.size());
         ExpectSame(Converted(pixels, kernels.fromRGB), pixels, isFused ? GroupToYUV<true> : GroupToYUV<false>,

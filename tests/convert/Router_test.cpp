@@ -152,10 +152,10 @@ TEST(Router, KernelsOnlyMeetRowsOfTheirLayout) {
         for (const Step& step : Walk(source, destination)) {
             if (source == PK_PixelFormat_RGB_444_10u && destination == source)
                 continue; // copied by pixel size
-            const KernelInfo& info = Info(step.kernel);
-            EXPECT_EQ(LayoutOf(info.source), LayoutOf(step.from))
+            const KernelRow& info = Info(step.kernel);
+            EXPECT_EQ(LayoutOf(info.operands.source.format), LayoutOf(step.from))
                 << info.name << std::hex << " " << step.from;
-            EXPECT_EQ(LayoutOf(info.destination), LayoutOf(step.to))
+            EXPECT_EQ(LayoutOf(info.operands.destination.format), LayoutOf(step.to))
                 << info.name << std::hex << " " << step.to;
         }
     });

@@ -4,6 +4,7 @@
 #include "frame/FloatMode.h"
 #include "support/KernelRows.h"
 #include "support/Random.h"
+#include "support/Targets.h"
 
 #include <algorithm>
 #include <bit>

@@ -17,10 +17,18 @@ namespace {
 
 using namespace PK;
 
+PK_PixelFormat FormatOfSource(Kernel kernel) {
+    return Info(kernel).operands.source.format;
+}
+PK_PixelFormat FormatOfDestination(Kernel kernel) {
+    return Info(kernel).operands.destination.format;
+}
+
 void RunReference(Kernel kernel, bool vectorRule, const void* source, void* destination, int32_t width) {
-    const KernelInfo& info = Info(kernel);
+    const KernelRow& row = Info(kernel);
     const int quality = kernel == Kernel::Upsample422To444Float32Row_Interpolate ? 4 : 0;
-    reference::Run(info.name, info.source, info.destination, vectorRule, source, destination, width, quality);
+    reference::Run(row.name, FormatOfSource(kernel), FormatOfDestination(kernel), vectorRule, source,
+                   destination, width, quality);
 }
 
 /// The pixels of a row of so many bytes; twelve pixels are whole units of every format.
@@ -35,7 +43,7 @@ struct ExpectedRows {
     ExpectedRows(Kernel kernel, const void* source, int32_t width)
         : plain(DestinationBytes(kernel, width)), vector(plain.size()) {
         RunExpected(kernel, false, source, plain.data(), width);
-        if (Info(kernel).agreement == Agreement::Exact)
+        if (Info(kernel).agreement.kind == Agreement::Exact)
             vector = plain;
         else
             RunExpected(kernel, true, source, vector.data(), width);
@@ -44,7 +52,7 @@ struct ExpectedRows {
     void Check(Kernel kernel, Target target, const uint8_t* actual) const {
         const Bytes& expected = HasVectorRule(kernel, target) ? vector : plain;
         if (std::memcmp(expected.data(), actual, expected.size()) == 0) return;
-        ASSERT_EQ("", FirstDifference(Info(kernel).destination, expected.size(), expected.data(), actual,
+        ASSERT_EQ("", FirstDifference(FormatOfDestination(kernel), expected.size(), expected.data(), actual,
                                       UnitsOff(kernel)));
     }
 };
@@ -52,17 +60,18 @@ struct ExpectedRows {
 Bytes AwkwardRow(Kernel kernel, int32_t width) {
     Bytes row(SourceBytes(kernel, width));
     Random random(static_cast<uint64_t>(kernel) + 1);
-    FillSamples(Info(kernel).source, row.data(), row.size(), random);
+    FillSamples(FormatOfSource(kernel), row.data(), row.size(), random);
     return row;
 }
 
 } // namespace
 
 std::string Describe(Kernel kernel) {
-    const KernelInfo& info = Info(kernel);
-    return std::string(info.name) + " from " + PK_PixelFormatName(info.source) + " to " +
-           (info.destination == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u"
-                                                           : PK_PixelFormatName(info.destination));
+    const auto name = [](PK_PixelFormat format) {
+        return format == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u" : PK_PixelFormatName(format);
+    };
+    return std::string(Info(kernel).name) + " from " + name(FormatOfSource(kernel)) + " to " +
+           name(FormatOfDestination(kernel));
 }
 
 std::vector<Target> TargetsWithBody(Kernel kernel) {
@@ -72,8 +81,8 @@ std::vector<Target> TargetsWithBody(Kernel kernel) {
 }
 
 bool HasVectorRule(Kernel kernel, Target target) {
-    if (Info(kernel).agreement == Agreement::Exact) return false;
-    return target >= (kernel == Kernel::Expand8uTo15uRow ? Target::sse2 : Target::ssse3);
+    const auto& agreement = Info(kernel).agreement;
+    return agreement.kind == Agreement::Declared && target >= agreement.from;
 }
 
 int64_t UnitsOff(Kernel kernel) {
@@ -81,11 +90,11 @@ int64_t UnitsOff(Kernel kernel) {
 }
 
 size_t SourceBytes(Kernel kernel, int32_t width) {
-    return static_cast<size_t>(PK_PixelFormatPackedRowBytes(Info(kernel).source, width));
+    return static_cast<size_t>(PK_PixelFormatPackedRowBytes(FormatOfSource(kernel), width));
 }
 
 size_t DestinationBytes(Kernel kernel, int32_t width) {
-    return static_cast<size_t>(PK_PixelFormatPackedRowBytes(Info(kernel).destination, width));
+    return static_cast<size_t>(PK_PixelFormatPackedRowBytes(FormatOfDestination(kernel), width));
 }
 
 void RunExpected(Kernel kernel, bool vectorRule, const void* source, void* destination, int32_t width) {

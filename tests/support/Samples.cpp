@@ -17,6 +17,7 @@ using namespace PK;
 
 constexpr std::array<uint8_t, 10> kEdgeBytes = {0, 1, 15, 16, 127, 128, 235, 240, 254, 255};
 constexpr std::array<uint16_t, 8> kEdgeWords = {0, 1, 127, 16384, 32767, 32768, 32769, 65535};
+constexpr std::array<uint32_t, 6> kEdgeIntegers = {0, 1, 0xffffffff, 0x7fffffff, 0x80000000, 0x80000001};
 constexpr float kInfinity = std::numeric_limits<float>::infinity();
 constexpr std::array<float, 20> kEdgeFloats = {0.0f,
                                                -0.0f,
@@ -55,21 +56,44 @@ float RandomFloat(Random& random) {
     return static_cast<float>(random.Next()) * 0x1p-31f - 0.5f;
 }
 
-void Fill(PK_PixelFormat format, uint8_t* row, size_t bytes, Random& random, bool withEdges) {
+/// Those of 10 bits in a word may have any bit set.
+Samples SamplesOf(PK_PixelFormat format) {
+    switch (format & kDepthMask) {
+    case kDepth32f:
+        return Samples::Floats;
+    case kDepth15u:
+        return Samples::Words;
+    case kDepth10u:
+        return Samples::Bits;
+    default:
+        return Samples::Bytes;
+    }
+}
+
+void Fill(Samples samples, uint8_t* row, size_t bytes, Random& random, bool withEdges) {
     const auto isEdge = [&] { return withEdges && random.Below(8) == 0; };
     const auto pick = [&](const auto& values) {
         return values[random.Below(static_cast<uint32_t>(values.size()))];
     };
-    switch (format & kDepthMask) {
-    case kDepth32f:
+    switch (samples) {
+    case Samples::Floats:
         for (size_t i = 0; i + 4 <= bytes; i += 4)
             StoreSample(row + i, isEdge() ? pick(kEdgeFloats) : RandomFloat(random));
         break;
-    case kDepth15u:
+    case Samples::Words:
         for (size_t i = 0; i + 2 <= bytes; i += 2)
             StoreSample(row + i, isEdge() ? pick(kEdgeWords) : static_cast<uint16_t>(random.Below(32769)));
         break;
-    default: // bytes, and 10-bit words of which any bit may be set
+    case Samples::SignedWords:
+        for (size_t i = 0; i + 2 <= bytes; i += 2)
+            StoreSample(row + i, isEdge() ? pick(kEdgeWords) : static_cast<uint16_t>(random.Next()));
+        break;
+    case Samples::Integers:
+        for (size_t i = 0; i + 4 <= bytes; i += 4)
+            StoreSample(row + i, isEdge() ? pick(kEdgeIntegers) : random.Next());
+        break;
+    case Samples::Bytes:
+    case Samples::Bits:
         for (size_t i = 0; i < bytes; ++i)
             row[i] = isEdge() ? pick(kEdgeBytes) : static_cast<uint8_t>(random.Next());
     }
@@ -104,30 +128,42 @@ std::string FirstDifferenceOf(size_t bytes, const uint8_t* expected, const uint8
 
 } // namespace
 
+void FillSamples(Samples samples, uint8_t* row, size_t bytes, Random& random) {
+    Fill(samples, row, bytes, random, true);
+}
+
 void FillSamples(PK_PixelFormat format, uint8_t* row, size_t bytes, Random& random) {
-    Fill(format, row, bytes, random, true);
+    FillSamples(SamplesOf(format), row, bytes, random);
 }
 
 void FillOrdinarySamples(PK_PixelFormat format, uint8_t* row, size_t bytes, Random& random) {
-    Fill(format, row, bytes, random, false);
+    Fill(SamplesOf(format), row, bytes, random, false);
 }
 
-std::string FirstDifference(PK_PixelFormat format, size_t bytes, const uint8_t* expected,
-                            const uint8_t* actual, int64_t ulps) {
+std::string FirstDifference(Samples samples, size_t bytes, const uint8_t* expected, const uint8_t* actual,
+                            int64_t ulps) {
     const auto same = [](auto a, auto b) { return a == b; };
-    switch (format & kDepthMask) {
-    case kDepth32f:
+    switch (samples) {
+    case Samples::Floats:
         return FirstDifferenceOf<float>(bytes, expected, actual, [ulps](float a, float b) {
             return UlpsApart(a, b) <= ulps &&
                    (ulps > 0 || std::isnan(a) || std::signbit(a) == std::signbit(b));
         });
-    case kDepth15u:
+    case Samples::Words:
         return FirstDifferenceOf<uint16_t>(bytes, expected, actual, same);
-    case kDepth10u:
+    case Samples::SignedWords:
+        return FirstDifferenceOf<int16_t>(bytes, expected, actual, same);
+    case Samples::Integers:
+    case Samples::Bits:
         return FirstDifferenceOf<uint32_t>(bytes, expected, actual, same);
     default:
         return FirstDifferenceOf<uint8_t>(bytes, expected, actual, same);
     }
+}
+
+std::string FirstDifference(PK_PixelFormat format, size_t bytes, const uint8_t* expected,
+                            const uint8_t* actual, int64_t ulps) {
+    return FirstDifference(SamplesOf(format), bytes, expected, actual, ulps);
 }
 
 std::string FirstDifferenceBeyond(PK_PixelFormat format, size_t bytes, const uint8_t* expected,

@@ -14,19 +14,20 @@
 
 namespace PKTest {
 
-inline std::vector<PK::Target> FindTargets() {
+inline std::vector<PK::Target> FindTargets(PK::Offer offer) {
     const FlagScope flags;
     FlagScope::ClearAll();
     PK::SetCapabilities(PK::ReadProcessor());
     std::vector<PK::Target> targets;
-    for (int i = 0; i < PK::kTargetCount; ++i)
-        if (PK::IsEnabled(static_cast<PK::Target>(i))) targets.push_back(static_cast<PK::Target>(i));
+    for (const PK::Target target : PK::TargetsOf(offer))
+        if (PK::IsEnabled(target, offer)) targets.push_back(target);
     return targets;
 }
 
-inline const std::vector<PK::Target>& TargetsOfThisProcessor() {
-    static const std::vector<PK::Target> targets = FindTargets();
-    return targets;
+inline const std::vector<PK::Target>& TargetsOfThisProcessor(PK::Offer offer = PK::Offer::flags) {
+    static const std::vector<PK::Target> byFlags = FindTargets(PK::Offer::flags),
+                                         byProcessor = FindTargets(PK::Offer::processor);
+    return offer == PK::Offer::flags ? byFlags : byProcessor;
 }
 
 /// Lets the library choose the bodies of one instruction set until the end of the scope.
@@ -35,9 +36,9 @@ public:
     /// The processor must have the instruction set.
     explicit TargetScope(PK::Target target) {
         using namespace PK;
-        uint8_t* const flags[kTargetCount - 1] = {&sCPUHasSSE2, &sCPUHasSSSE3, &sCPUHasSSE4, &sCPUHasAVX2,
-                                                  &sCPUHasAVX512};
-        for (int i = 0; i < kTargetCount - 1; ++i) *flags[i] = i < static_cast<int>(target);
+        uint8_t* const flags[] = {&sCPUHasSSE2, &sCPUHasSSSE3, &sCPUHasSSE4, &sCPUHasAVX2, &sCPUHasAVX512};
+        static_assert(std::size(flags) + 1 == std::size(kFlagTargets));
+        for (size_t i = 0; i < std::size(flags); ++i) *flags[i] = kFlagTargets[i + 1] <= target;
         EXPECT_EQ(BestTarget(), target);
     }
 
@@ -68,7 +69,7 @@ inline auto EveryTarget() {
 
 inline std::string TargetOf(const testing::TestParamInfo<PK::Target>& test) {
     std::string name = PK::TargetName(test.param);
-    std::erase_if(name, [](char c) { return c == '.' || c == '-'; });
+    std::erase_if(name, [](char c) { return c == '.' || c == '-' || c == ' '; });
     return name;
 }
 

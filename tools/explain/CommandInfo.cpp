@@ -41,7 +41,7 @@ std::string FlagsText() {
 }
 
 std::string BodiesText() {
-    return Join(TargetNames([](PK::Target target) { return PK::IsEnabled(target); }), " ");
+    return Join(TargetNames(PK::Offer::flags, [](PK::Target target) { return PK::IsEnabled(target); }), " ");
 }
 
 std::string CacheText(int name) {

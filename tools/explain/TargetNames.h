@@ -1,6 +1,6 @@
 #pragma once
 
-// The names of the instruction sets that answer a question with yes, from the lowest up.
+// The names of the targets of an offer that answer a question with yes, from the lowest up.
 
 #include "convert/KernelTable.h"
 
@@ -10,10 +10,10 @@
 namespace tool {
 
 template <typename Question>
-std::vector<std::string> TargetNames(Question question) {
+std::vector<std::string> TargetNames(PK::Offer offer, Question question) {
     std::vector<std::string> names;
-    for (int i = 0; i < PK::kTargetCount; ++i)
-        if (question(static_cast<PK::Target>(i))) names.push_back(PK::TargetName(static_cast<PK::Target>(i)));
+    for (const PK::Target target : PK::TargetsOf(offer))
+        if (question(target)) names.push_back(PK::TargetName(target));
     return names;
 }
 

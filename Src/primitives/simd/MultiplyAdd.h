@@ -8,12 +8,12 @@
 namespace PK::PK_TARGET {
 
 /// a b + c
-inline F32 MultiplyAdd(F32 a, F32 b, F32 c) {
-#ifdef __FMA__
-    return {_mm256_fmadd_ps(a.v, b.v, c.v)};
-#else
-    return a * b + c;
-#endif
+template <class Vector>
+inline Vector MultiplyAdd(Vector a, Vector b, Vector c) {
+    if constexpr (Target::PK_TARGET == Target::avx2fma)
+        return {_mm256_fmadd_ps(a.v, b.v, c.v)};
+    else
+        return a * b + c;
 }
 
 } // namespace PK::PK_TARGET

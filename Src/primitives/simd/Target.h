@@ -20,6 +20,8 @@
 //                            places of their own in memory
 //   LoadChannels, ...        kLanes four-channel pixels to and from four vectors, one a channel
 
+#include "primitives/simd/Targets.h"
+
 #include PK_TARGET_HEADER
 
 namespace PK::PK_TARGET {

@@ -3,6 +3,8 @@
 // The vector types of 128 bits, for SSE2, SSSE3 and SSE4.1: the same text, with the shorter instruction
 // sequences where the target has them.
 
+#include "primitives/simd/Targets.h"
+
 #include <cstdint>
 #include <cstring>
 #include <immintrin.h>
@@ -10,11 +12,8 @@
 namespace PK::PK_TARGET {
 
 inline constexpr int kLanes = 4;
-#ifdef __SSSE3__
-inline constexpr bool kHasByteShuffle = true;
-#else
-inline constexpr bool kHasByteShuffle = false;
-#endif
+inline constexpr bool kHasByteShuffle = Target::PK_TARGET >= Target::ssse3;
+inline constexpr bool kHasSSE41 = Target::PK_TARGET >= Target::sse41;
 
 struct F32 {
     __m128 v;
@@ -112,14 +111,14 @@ inline I32 ShiftLeft(I32 a, int32_t bits) {
     return {_mm_sll_epi32(a.v, _mm_cvtsi32_si128(bits))};
 }
 inline I32 operator*(I32 a, I32 b) {
-#ifdef __SSE4_1__
-    return {_mm_mullo_epi32(a.v, b.v)};
-#else
-    const __m128i even = _mm_mul_epu32(a.v, b.v);
-    const __m128i odd = _mm_mul_epu32(_mm_srli_epi64(a.v, 32), _mm_srli_epi64(b.v, 32));
-    return {_mm_unpacklo_epi32(_mm_shuffle_epi32(even, _MM_SHUFFLE(0, 0, 2, 0)),
-                               _mm_shuffle_epi32(odd, _MM_SHUFFLE(0, 0, 2, 0)))};
-#endif
+    if constexpr (kHasSSE41) {
+        return {_mm_mullo_epi32(a.v, b.v)};
+    } else {
+        const __m128i even = _mm_mul_epu32(a.v, b.v);
+        const __m128i odd = _mm_mul_epu32(_mm_srli_epi64(a.v, 32), _mm_srli_epi64(b.v, 32));
+        return {_mm_unpacklo_epi32(_mm_shuffle_epi32(even, _MM_SHUFFLE(0, 0, 2, 0)),
+                                   _mm_shuffle_epi32(odd, _MM_SHUFFLE(0, 0, 2, 0)))};
+    }
 }
 /// The low 16 bits of the product of each 16-bit half with its counterpart.
 inline I32 MultiplyHalves(I32 a, I32 b) {
@@ -151,18 +150,18 @@ inline F32 Select(I32 mask, F32 a, F32 b) {
 }
 
 inline I32 Min(I32 a, I32 b) {
-#ifdef __SSE4_1__
-    return {_mm_min_epi32(a.v, b.v)};
-#else
-    return Select(I32{_mm_cmplt_epi32(a.v, b.v)}, a, b);
-#endif
+    if constexpr (kHasSSE41) {
+        return {_mm_min_epi32(a.v, b.v)};
+    } else {
+        return Select(I32{_mm_cmplt_epi32(a.v, b.v)}, a, b);
+    }
 }
 inline I32 Max(I32 a, I32 b) {
-#ifdef __SSE4_1__
-    return {_mm_max_epi32(a.v, b.v)};
-#else
-    return Select(I32{_mm_cmpgt_epi32(a.v, b.v)}, a, b);
-#endif
+    if constexpr (kHasSSE41) {
+        return {_mm_max_epi32(a.v, b.v)};
+    } else {
+        return Select(I32{_mm_cmpgt_epi32(a.v, b.v)}, a, b);
+    }
 }
 
 inline F32 ToFloat(I32 a) {
@@ -224,12 +223,12 @@ inline F32 ShufflePixel(F32 a) {
 
 /// Reverses the four bytes of each lane.
 inline I32 ReverseBytes(I32 a) {
-#ifdef __SSSE3__
-    return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(3, 2, 1, 0, 7, 6, 5, 4, 11, 10, 9, 8, 15, 14, 13, 12))};
-#else
-    const __m128i swapped = _mm_or_si128(_mm_slli_epi16(a.v, 8), _mm_srli_epi16(a.v, 8));
-    return {_mm_or_si128(_mm_slli_epi32(swapped, 16), _mm_srli_epi32(swapped, 16))};
-#endif
+    if constexpr (kHasByteShuffle) {
+        return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(3, 2, 1, 0, 7, 6, 5, 4, 11, 10, 9, 8, 15, 14, 13, 12))};
+    } else {
+        const __m128i swapped = _mm_or_si128(_mm_slli_epi16(a.v, 8), _mm_srli_epi16(a.v, 8));
+        return {_mm_or_si128(_mm_slli_epi32(swapped, 16), _mm_srli_epi32(swapped, 16))};
+    }
 }
 
 /// Turns four interleaved pixels, one a vector, into four channels of four pixels, and back.
@@ -263,16 +262,17 @@ inline void StoreFloatChannels(void* destination, F32 c0, F32 c1, F32 c2, F32 c3
 
 /// Saturates each channel to a byte and interleaves them into kLanes four-byte pixels.
 inline I32 PackByteChannels(I32 c0, I32 c1, I32 c2, I32 c3) {
-#ifdef __SSSE3__
-    const __m128i planes = _mm_packus_epi16(_mm_packs_epi32(c0.v, c1.v), _mm_packs_epi32(c2.v, c3.v));
-    return {_mm_shuffle_epi8(planes, _mm_setr_epi8(0, 4, 8, 12, 1, 5, 9, 13, 2, 6, 10, 14, 3, 7, 11, 15))};
-#else
-    const __m128i even = _mm_packs_epi32(c0.v, c2.v);
-    const __m128i odd = _mm_packs_epi32(c1.v, c3.v);
-    const __m128i first = _mm_unpacklo_epi16(even, odd);  // c0 c1 of each pixel
-    const __m128i second = _mm_unpackhi_epi16(even, odd); // c2 c3 of each pixel
-    return {_mm_packus_epi16(_mm_unpacklo_epi32(first, second), _mm_unpackhi_epi32(first, second))};
-#endif
+    if constexpr (kHasByteShuffle) {
+        const __m128i planes = _mm_packus_epi16(_mm_packs_epi32(c0.v, c1.v), _mm_packs_epi32(c2.v, c3.v));
+        return {
+            _mm_shuffle_epi8(planes, _mm_setr_epi8(0, 4, 8, 12, 1, 5, 9, 13, 2, 6, 10, 14, 3, 7, 11, 15))};
+    } else {
+        const __m128i even = _mm_packs_epi32(c0.v, c2.v);
+        const __m128i odd = _mm_packs_epi32(c1.v, c3.v);
+        const __m128i first = _mm_unpacklo_epi16(even, odd);  // c0 c1 of each pixel
+        const __m128i second = _mm_unpackhi_epi16(even, odd); // c2 c3 of each pixel
+        return {_mm_packus_epi16(_mm_unpacklo_epi32(first, second), _mm_unpackhi_epi32(first, second))};
+    }
 }
 
 /// The lanes of a and b at even places, a first, and those at odd places.
@@ -301,37 +301,37 @@ inline I32 MinHalves(I32 a, I32 b) {
 }
 /// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
 inline I32 LookUpBytes(I32 table, I32 places) {
-#ifdef __SSSE3__
-    return {_mm_shuffle_epi8(table.v, places.v)};
-#else
-    uint8_t from[16], bytes[16];
-    Store(from, table);
-    Store(bytes, places);
-    for (uint8_t& byte : bytes) byte = from[byte];
-    return LoadInts(bytes);
-#endif
+    if constexpr (kHasByteShuffle) {
+        return {_mm_shuffle_epi8(table.v, places.v)};
+    } else {
+        uint8_t from[16], bytes[16];
+        Store(from, table);
+        Store(bytes, places);
+        for (uint8_t& byte : bytes) byte = from[byte];
+        return LoadInts(bytes);
+    }
 }
 /// Twice the products of unsigned bytes of `a` with signed bytes of `b`, in 16-bit halves in their order. They
 /// must fit.
 inline void DoubleByteProducts(I32 a, I32 b, I32& first, I32& second) {
-#ifdef __SSSE3__
-    first = {_mm_maddubs_epi16(_mm_unpacklo_epi8(a.v, a.v), _mm_unpacklo_epi8(b.v, b.v))};
-    second = {_mm_maddubs_epi16(_mm_unpackhi_epi8(a.v, a.v), _mm_unpackhi_epi8(b.v, b.v))};
-#else
-    const __m128i zero = _mm_setzero_si128(), sign = _mm_cmpgt_epi8(zero, b.v);
-    const __m128i low = _mm_mullo_epi16(_mm_unpacklo_epi8(a.v, zero), _mm_unpacklo_epi8(b.v, sign));
-    const __m128i high = _mm_mullo_epi16(_mm_unpackhi_epi8(a.v, zero), _mm_unpackhi_epi8(b.v, sign));
-    first = {_mm_adds_epi16(low, low)};
-    second = {_mm_adds_epi16(high, high)};
-#endif
+    if constexpr (kHasByteShuffle) {
+        first = {_mm_maddubs_epi16(_mm_unpacklo_epi8(a.v, a.v), _mm_unpacklo_epi8(b.v, b.v))};
+        second = {_mm_maddubs_epi16(_mm_unpackhi_epi8(a.v, a.v), _mm_unpackhi_epi8(b.v, b.v))};
+    } else {
+        const __m128i zero = _mm_setzero_si128(), sign = _mm_cmpgt_epi8(zero, b.v);
+        const __m128i low = _mm_mullo_epi16(_mm_unpacklo_epi8(a.v, zero), _mm_unpacklo_epi8(b.v, sign));
+        const __m128i high = _mm_mullo_epi16(_mm_unpackhi_epi8(a.v, zero), _mm_unpackhi_epi8(b.v, sign));
+        first = {_mm_adds_epi16(low, low)};
+        second = {_mm_adds_epi16(high, high)};
+    }
 }
 /// Swaps the two bytes of each 16-bit half.
 inline I32 SwapBytes(I32 a) {
-#ifdef __SSSE3__
-    return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(1, 0, 3, 2, 5, 4, 7, 6, 9, 8, 11, 10, 13, 12, 15, 14))};
-#else
-    return {_mm_or_si128(_mm_slli_epi16(a.v, 8), _mm_srli_epi16(a.v, 8))};
-#endif
+    if constexpr (kHasByteShuffle) {
+        return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(1, 0, 3, 2, 5, 4, 7, 6, 9, 8, 11, 10, 13, 12, 15, 14))};
+    } else {
+        return {_mm_or_si128(_mm_slli_epi16(a.v, 8), _mm_srli_epi16(a.v, 8))};
+    }
 }
 /// Reverses the four 16-bit halves of each pair of lanes.
 inline I32 ReverseHalves(I32 a) {
@@ -352,13 +352,13 @@ inline I32 PackLanes(I32 a, I32 b, I32 c, I32 d) {
 }
 /// The lanes of two vectors, each from 0 to 65535, to 16-bit halves in their order.
 inline I32 PackLanesToHalves(I32 a, I32 b) {
-#ifdef __SSE4_1__
-    return {_mm_packus_epi32(a.v, b.v)};
-#else
-    // Sign-extending the low halves first makes the saturating pack exact.
-    return {_mm_packs_epi32(_mm_srai_epi32(_mm_slli_epi32(a.v, 16), 16),
-                            _mm_srai_epi32(_mm_slli_epi32(b.v, 16), 16))};
-#endif
+    if constexpr (kHasSSE41) {
+        return {_mm_packus_epi32(a.v, b.v)};
+    } else {
+        // Sign-extending the low halves first makes the saturating pack exact.
+        return {_mm_packs_epi32(_mm_srai_epi32(_mm_slli_epi32(a.v, 16), 16),
+                                _mm_srai_epi32(_mm_slli_epi32(b.v, 16), 16))};
+    }
 }
 /// The lanes of two vectors to signed 16-bit halves in their order, saturated.
 inline I32 PackSignedLanes(I32 a, I32 b) {
@@ -522,17 +522,17 @@ inline void StoreThreeOfFourHalves(void* destination, I32 pair, I32 third) {
 /// The 16 bits that start at each of eight byte offsets in a block.
 template <int k0, int k1, int k2, int k3, int k4, int k5, int k6, int k7>
 inline I32 HalvesAt(I32 a) {
-#ifdef __SSSE3__
-    return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(k0, k0 + 1, k1, k1 + 1, k2, k2 + 1, k3, k3 + 1, k4, k4 + 1,
-                                                k5, k5 + 1, k6, k6 + 1, k7, k7 + 1))};
-#else
-    uint8_t bytes[16];
-    Store(bytes, a);
-    const int offsets[8] = {k0, k1, k2, k3, k4, k5, k6, k7};
-    int16_t halves[8];
-    for (int i = 0; i < 8; ++i) std::memcpy(&halves[i], bytes + offsets[i], 2);
-    return LoadInts(halves);
-#endif
+    if constexpr (kHasByteShuffle) {
+        return {_mm_shuffle_epi8(a.v, _mm_setr_epi8(k0, k0 + 1, k1, k1 + 1, k2, k2 + 1, k3, k3 + 1, k4,
+                                                    k4 + 1, k5, k5 + 1, k6, k6 + 1, k7, k7 + 1))};
+    } else {
+        uint8_t bytes[16];
+        Store(bytes, a);
+        const int offsets[8] = {k0, k1, k2, k3, k4, k5, k6, k7};
+        int16_t halves[8];
+        for (int i = 0; i < 8; ++i) std::memcpy(&halves[i], bytes + offsets[i], 2);
+        return LoadInts(halves);
+    }
 }
 
 /// Whether the highest bit of any lane is set.
@@ -561,11 +561,11 @@ inline I32 MultiplyAddHalves(I32 a, I32 b) {
 /// In each block, the lanes of `a` whose bits are set in kMask, lane 0 the lowest, and the others of `b`.
 template <int kMask>
 inline F32 BlendBlocks(F32 a, F32 b) {
-#ifdef __SSE4_1__
-    return {_mm_blend_ps(b.v, a.v, kMask)};
-#else
-    return Select(PixelInts(-(kMask & 1), -(kMask >> 1 & 1), -(kMask >> 2 & 1), -(kMask >> 3 & 1)), a, b);
-#endif
+    if constexpr (kHasSSE41) {
+        return {_mm_blend_ps(b.v, a.v, kMask)};
+    } else {
+        return Select(PixelInts(-(kMask & 1), -(kMask >> 1 & 1), -(kMask >> 2 & 1), -(kMask >> 3 & 1)), a, b);
+    }
 }
 template <int kMask>
 inline I32 BlendBlocks(I32 a, I32 b) {

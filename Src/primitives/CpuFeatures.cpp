@@ -1,4 +1,4 @@
-#include "colour/CpuFeatures.h"
+#include "primitives/CpuFeatures.h"
 
 #include <cpuid.h>
 

@@ -1,8 +1,8 @@
 // What the colour spaces know of the processor, and how they choose by it.
 
-#include "colour/CpuFeatures.h"
+#include "primitives/CpuFeatures.h"
 
-#include "colour/FloatTargets.h"
+#include "primitives/Dispatch.h"
 #include "support/FlagScope.h"
 
 #include <gtest/gtest.h>
@@ -158,39 +158,38 @@ TEST(CpuFeatures, TheRecordIsThreeRunsOfWhatThisProcessorHas) {
     EXPECT_EQ(flags.xop != 0, __builtin_cpu_supports("xop") != 0);
 }
 
-TEST(FloatTargets, RunWhereTheirInstructionsAre) {
-    EXPECT_TRUE(Runs(CpuFlags{}, FloatTarget::plain));
-    for (const FloatTarget target :
-         {FloatTarget::sse2, FloatTarget::sse41, FloatTarget::avx, FloatTarget::avx2fma})
-        EXPECT_FALSE(Runs(CpuFlags{}, target)) << FloatTargetName(target);
+TEST(ProcessorTargets, RunWhereTheirInstructionsAre) {
+    EXPECT_TRUE(Runs(CpuFlags{}, Target::plain));
+    for (const Target target : {Target::sse2, Target::sse41, Target::avx, Target::avx2fma})
+        EXPECT_FALSE(Runs(CpuFlags{}, target)) << TargetName(target);
     CpuFlags flags{};
     flags.sse2 = 1;
-    EXPECT_TRUE(Runs(flags, FloatTarget::sse2));
+    EXPECT_TRUE(Runs(flags, Target::sse2));
     flags.sse41 = 1;
-    EXPECT_TRUE(Runs(flags, FloatTarget::sse41));
-    EXPECT_FALSE(Runs(flags, FloatTarget::avx));
+    EXPECT_TRUE(Runs(flags, Target::sse41));
+    EXPECT_FALSE(Runs(flags, Target::avx));
     flags.avx = 1;
-    EXPECT_TRUE(Runs(flags, FloatTarget::avx));
+    EXPECT_TRUE(Runs(flags, Target::avx));
     flags.avx2 = 1;
-    EXPECT_FALSE(Runs(flags, FloatTarget::avx2fma)) << "its arithmetic is fused";
+    EXPECT_FALSE(Runs(flags, Target::avx2fma)) << "its arithmetic is fused";
     flags.fma3 = 1;
-    EXPECT_TRUE(Runs(flags, FloatTarget::avx2fma));
+    EXPECT_TRUE(Runs(flags, Target::avx2fma));
     flags.avx2 = 0;
-    EXPECT_FALSE(Runs(flags, FloatTarget::avx2fma));
+    EXPECT_FALSE(Runs(flags, Target::avx2fma));
 }
 
-TEST(FloatTargets, TheBestIsTheHighestThatRuns) {
+TEST(ProcessorTargets, TheBestIsTheHighestThatRuns) {
     int best = 0;
-    for (int i = 0; i < kFloatTargetCount; ++i)
-        if (Runs(CpuFeatures::Flags(), static_cast<FloatTarget>(i))) best = i;
-    EXPECT_EQ(static_cast<int>(BestFloatTarget()), best);
+    for (const Target target : kProcessorTargets)
+        if (Runs(CpuFeatures::Flags(), target)) best = static_cast<int>(target);
+    EXPECT_EQ(static_cast<int>(BestTarget(Offer::processor)), best);
 }
 
-TEST(FloatTargets, SwitchesOfTheLibraryDoNotReachThem) {
+TEST(ProcessorTargets, SwitchesOfTheLibraryDoNotReachThem) {
     const FlagScope saved;
-    const FloatTarget best = BestFloatTarget();
+    const Target best = BestTarget(Offer::processor);
     FlagScope::ClearAll();
-    EXPECT_EQ(BestFloatTarget(), best);
+    EXPECT_EQ(BestTarget(Offer::processor), best);
 }
 
 } // namespace

@@ -1,0 +1,296 @@
+#include "support/KernelTrial.h"
+
+#include "colour/ColourKernels.h"
+#include "colour/DecodeTables.h"
+#include "composite/MaskKernels.h"
+#include "convert/BridgeKernels.h"
+#include "filters/BoxBlurKernels.h"
+#include "geometry/WarpSpan.h"
+#include "primitives/BlockTransforms.h"
+#include "primitives/Channels.h"
+#include "primitives/Coefficients.h"
+#include "primitives/ConvertFloat.h"
+#include "primitives/FillPixels.h"
+#include "primitives/MultiplyConstant.h"
+#include "primitives/TransposeKernels.h"
+#include "scale/QuarterScaleKernels.h"
+#include "support/Random.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstring>
+#include <stdexcept>
+#include <string>
+
+namespace PKTest {
+namespace {
+
+using namespace PK;
+
+using Sources = std::vector<const uint8_t*>;
+using MakeKernelTrial = KernelTrial (*)(const KernelRow& kernel, int32_t size, Random& random);
+
+TrialRow RowOf(const Operand& operand, int64_t elements) {
+    return {operand.samples, operand.RowBytes(elements)};
+}
+
+size_t Count(int32_t size) {
+    return static_cast<size_t>(size);
+}
+
+/// A typed call behind a body of the register.
+template <class Function, class Call>
+auto Typed(Call call) {
+    return [call](AnyKernel body, const Sources& sources, uint8_t* destination) {
+        call(reinterpret_cast<Function>(body), sources, destination);
+    };
+}
+
+KernelTrial RowTrial(const KernelRow& kernel, int32_t size, Random&) {
+    return {{RowOf(kernel.operands.source, size)},
+            RowOf(kernel.operands.destination, size),
+            Typed<RowKernel>([=](RowKernel run, const Sources& sources, uint8_t* destination) {
+                run(sources[0], destination, size);
+            })};
+}
+
+KernelTrial TwoRowTrial(const KernelRow& kernel, int32_t size, Random&) {
+    return {{RowOf(kernel.operands.source, size), RowOf(kernel.operands.second, size)},
+            RowOf(kernel.operands.destination, size),
+            Typed<TwoRowKernel>([=](TwoRowKernel run, const Sources& sources, uint8_t* destination) {
+                run(sources[0], sources[1], destination, size);
+            })};
+}
+
+/// One row in and one out by constants that are drawn.
+template <class Constants, Constants (*kDraw)(Random&)>
+KernelTrial TrialWith(const KernelRow& kernel, int32_t size, Random& random) {
+    const Constants constants = kDraw(random);
+    return {{RowOf(kernel.operands.source, size)},
+            RowOf(kernel.operands.destination, size),
+            Typed<RowKernelWith<Constants>>(
+                [=](RowKernelWith<Constants> run, const Sources& sources, uint8_t* destination) {
+                    run(sources[0], destination, size, constants);
+                })};
+}
+
+ChannelPattern DrawInteger(Random& random) {
+    const auto channel = static_cast<int32_t>(random.Below(4));
+    return random.Below(2) ? PatternOfChannel(channel, static_cast<uint8_t>(random.Next()))
+                           : PatternOfChannel(channel, static_cast<uint16_t>(random.Next()));
+}
+ChannelPattern DrawFloat(Random& random) {
+    return PatternOfChannel(static_cast<int32_t>(random.Below(4)),
+                            static_cast<float>(random.Below(7)) * 0.3f);
+}
+int32_t DrawScale(Random& random) {
+    return static_cast<int32_t>(random.Below(40)) - 8;
+}
+PowerOfTwo DrawPower(Random& random) {
+    return {std::ldexp(1.0f, static_cast<int32_t>(random.Below(12))),
+            std::ldexp(1.0f, static_cast<int32_t>(random.Below(12)))};
+}
+uint32_t DrawFactors(Random& random, uint32_t limit) {
+    return random.Below(limit) | random.Below(limit) << 16;
+}
+ChannelFactors DrawUnscaled(Random& random) {
+    return {DrawFactors(random, 257), DrawFactors(random, 257), 0};
+}
+ChannelFactors DrawScaled(Random& random) {
+    const uint32_t unit = 1u << random.Below(16);
+    return {DrawFactors(random, 256), DrawFactors(random, 256), unit | unit << 16};
+}
+
+constexpr float kMatrix[9] = {0.61f, 0.32f, 0.07f, 0.12f, 0.83f, 0.11f, -0.13f, 0.21f, 0.92f};
+
+GammaConversion DrawGamma(Random& random) {
+    return {kMatrix, 2.4f, 0.45f, {0.2126f, 0.7152f, 0.0722f}, random.Below(2) != 0, random.Below(2) != 0};
+}
+SignalDecoding DrawPQDecoding(Random&) {
+    return {kMatrix, PQDecodeTable()};
+}
+SignalDecoding DrawHLGDecoding(Random&) {
+    return {kMatrix, HLGDecodeTable()};
+}
+PQEncoding DrawPQEncoding(Random& random) {
+    return {kMatrix, random.Below(2) ? 1.0f : 1.7f};
+}
+HLGEncoding DrawHLGEncoding(Random&) {
+    return {kMatrix};
+}
+FloatRange DrawRange(Random&) {
+    return {0.1f, 0.9f};
+}
+
+KernelTrial MaskTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    const auto bit = static_cast<int32_t>(random.Below(8));
+    const size_t maskBytes = size == 0 ? 0 : Count(size + bit + 7) / 8;
+    return {{RowOf(kernel.operands.source, size),
+             RowOf(kernel.operands.second, size),
+             {Samples::Bytes, maskBytes}},
+            RowOf(kernel.operands.destination, size),
+            Typed<MaskKernels::Select>(
+                [=](MaskKernels::Select run, const Sources& sources, uint8_t* destination) {
+                    run(sources[0], sources[1], destination, size, {sources[2], bit});
+                })};
+}
+
+/// Y, U and V, and for an average the same of the row below.
+template <int kRows>
+KernelTrial PlanesTrial(const KernelRow& kernel, int32_t size, Random&) {
+    const TrialRow luma = RowOf(kernel.operands.source, size), chroma = RowOf(kernel.operands.second, size);
+    std::vector<TrialRow> planes;
+    for (int row = 0; row < kRows; ++row) planes.insert(planes.end(), {luma, chroma, chroma});
+    return {planes, RowOf(kernel.operands.destination, size),
+            Typed<PlanesRow>([=](PlanesRow run, const Sources& sources, uint8_t* destination) {
+                run(sources.data(), destination, size);
+            })};
+}
+
+KernelTrial InterleaveTrial(const KernelRow& kernel, int32_t size, Random&) {
+    const TrialRow chroma = RowOf(kernel.operands.second, size);
+    using Interleave = QuarterScaleKernels::Interleave;
+    return {{RowOf(kernel.operands.source, size), chroma, chroma},
+            RowOf(kernel.operands.destination, size),
+            Typed<Interleave>([=](Interleave run, const Sources& sources, uint8_t* destination) {
+                run(sources[0], sources[1], sources[2], destination, size);
+            })};
+}
+
+KernelTrial FillTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    FillPattern pattern;
+    random.Fill(pattern.bytes, FillPattern::kPeriod);
+    for (size_t at = FillPattern::kPeriod; at < sizeof pattern.bytes; ++at)
+        pattern.bytes[at] = pattern.bytes[at - FillPattern::kPeriod];
+    using Run = decltype(FillKernels::run);
+    return {{},
+            RowOf(kernel.operands.destination, size),
+            Typed<Run>([=](Run run, const Sources&, uint8_t* destination) {
+                run(destination, Count(size), pattern);
+            })};
+}
+
+/// An area of nearly `size` pixels in all.
+KernelTrial TransposeTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    const int32_t rows = static_cast<int32_t>(random.Below(static_cast<uint32_t>(std::min(size, 79)) + 1));
+    const int32_t columns = rows == 0 ? 0 : size / rows;
+    const int64_t pixel = kernel.operands.source.bytes;
+    using Run = decltype(TransposeKernels::pixels4);
+    const TrialRow area = RowOf(kernel.operands.source, int64_t{rows} * columns);
+    return {{area}, area, Typed<Run>([=](Run run, const Sources& sources, uint8_t* destination) {
+                run({sources[0], columns * pixel, destination, rows * pixel, rows, columns});
+            })};
+}
+
+KernelTrial TransformTrial(const KernelRow& kernel, int32_t, Random&) {
+    using Transform = BlockTransformKernels::Transform;
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Transform>([](Transform run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                run(block, block);
+                std::memcpy(destination, block, sizeof block);
+            })};
+}
+
+KernelTrial CountTrial(const KernelRow& kernel, int32_t, Random&) {
+    using CountZeros = decltype(CoefficientKernels::countZeros8x8);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<CountZeros>([](CountZeros run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                const uint32_t count = run(block);
+                std::memcpy(destination, &count, sizeof count);
+            })};
+}
+
+KernelTrial BoxTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    const int32_t radius = 1 + static_cast<int32_t>(random.Below(40));
+    const int32_t length = size + radius + 2;
+    const BoxPass pass = {length, radius, static_cast<int32_t>(random.Below(3) * random.Below(128)),
+                          random.Below(2) != 0, random.Below(2) ? ~0u : 0x00ff00ffu};
+    using Run = BoxBlurKernels::Run;
+    const TrialRow line = RowOf(kernel.operands.source, length);
+    return {{line}, line, Typed<Run>([=](Run run, const Sources& sources, uint8_t* destination) {
+                run(pass, sources[0], destination);
+            })};
+}
+
+/// A span across a small picture, whose places leave it on both sides.
+KernelTrial WarpTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    constexpr int32_t kSide = 24;
+    const auto draw = [&random](float least, float most) {
+        return least + (most - least) * static_cast<float>(random.Next()) * 0x1p-32f;
+    };
+    WarpSource source{};
+    source.stride = kSide;
+    source.right = source.bottom = kSide - 1;
+    source.rowScale = 1;
+    source.rowStep = 1;
+    source.lastRow = kSide - 1;
+    source.offsetsFit = true;
+    const WarpPaint paint = {static_cast<int32_t>(random.Below(256)), random.Below(2) != 0};
+    const WarpSpan span = {nullptr,      size,        draw(-3, 20), draw(-3, 20),
+                           draw(0, 255), draw(-2, 2), draw(-1, 1),  draw(-2, 2)};
+    return {{RowOf(kernel.operands.source, kSide * kSide)},
+            RowOf(kernel.operands.destination, size),
+            Typed<FillWarpSpan>([=](FillWarpSpan run, const Sources& sources, uint8_t* destination) {
+                WarpSource picture = source;
+                picture.pixels = sources[0];
+                WarpSpan here = span;
+                here.pixels = destination;
+                run(picture, paint, here);
+            })};
+}
+
+struct SpecialTrial {
+    const char* family;
+    MakeKernelTrial make;
+    const char* name = ""; ///< The beginning of the kernel's name, where the family has several kinds.
+};
+
+constexpr SpecialTrial kSpecial[] = {
+    {"Channel", TrialWith<ChannelPattern, DrawFloat>, "InvertChannelRow_Float"},
+    {"Channel", TrialWith<ChannelPattern, DrawInteger>},
+    {"Coefficient", CountTrial, "CountZeros"},
+    {"Coefficient", TrialWith<int32_t, DrawScale>},
+    {"ConvertFloat", TrialWith<PowerOfTwo, DrawPower>},
+    {"MultiplyConstant", TrialWith<ChannelFactors, DrawUnscaled>, "MultiplyConstantRow_Unscaled"},
+    {"MultiplyConstant", TrialWith<ChannelFactors, DrawScaled>},
+    {"Fill", FillTrial},
+    {"Transpose", TransposeTrial, "TransposeArea"},
+    {"BlockTransform", TransformTrial},
+    {"W210", PlanesTrial<2>, "Average"},
+    {"W210", PlanesTrial<1>},
+    {"QuarterScale", InterleaveTrial, "Interleave"},
+    {"Mask", MaskTrial},
+    {"BoxBlur", BoxTrial},
+    {"WarpNearest", WarpTrial},
+    {"WarpBilinear", WarpTrial},
+    {"Gamma", TrialWith<GammaConversion, DrawGamma>},
+    {"PQ", TrialWith<SignalDecoding, DrawPQDecoding>, "PQTo"},
+    {"PQ", TrialWith<PQEncoding, DrawPQEncoding>},
+    {"HLG", TrialWith<SignalDecoding, DrawHLGDecoding>, "HLGTo"},
+    {"HLG", TrialWith<HLGEncoding, DrawHLGEncoding>},
+    {"Clamp", TrialWith<FloatRange, DrawRange>},
+};
+
+MakeKernelTrial TrialOf(const KernelRow& kernel) {
+    const std::string family = kernel.family, name = kernel.name;
+    for (const SpecialTrial& special : kSpecial)
+        if (family == special.family && name.starts_with(special.name)) return special.make;
+    if (kernel.shape == Shape::Row) return RowTrial;
+    if (kernel.shape == Shape::TwoRows) return TwoRowTrial;
+    throw std::logic_error("nobody knows how to call " + family + " " + name);
+}
+
+} // namespace
+
+KernelTrial MakeTrial(const KernelRow& kernel, int32_t size, uint64_t seed) {
+    Random random(seed);
+    return TrialOf(kernel)(kernel, size - size % kernel.place.group, random);
+}
+
+} // namespace PKTest
