@@ -71,7 +71,6 @@ TEST(ApproxPower, LogarithmOverAllMagnitudes) {
 }
 
 TEST(ApproxPower, NothingButPositiveNumbersHasAPower) {
-    constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();
     for (const Target target : TargetsOfThisProcessor(PK::Offer::processor))
         for (const float exponent : {2.4f, 0.41666666f, 0.0f}) {
             EXPECT_EQ(std::bit_cast<uint32_t>(PowerOfBody(target, 0, exponent)), 0u) << TargetName(target);

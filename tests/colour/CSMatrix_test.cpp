@@ -2,7 +2,7 @@
 
 #include <PixelKiln/ColorSpace.h>
 
-#include "colour/Pixels.h"
+#include "support/ColourPixels.h"
 
 #include <algorithm>
 

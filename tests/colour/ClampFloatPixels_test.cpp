@@ -3,7 +3,8 @@
 #include <PixelKiln/ColorSpace.h>
 
 #include "colour/ColourKernels.h"
-#include "colour/Pixels.h"
+#include "colour/FloatBodies.h"
+#include "support/ColourPixels.h"
 #include "support/GuardedRows.h"
 
 #include <algorithm>
@@ -129,7 +130,7 @@ TEST(ClampFloatPixels, NeitherReadsNorWritesTheLastRow) {
             Random random(6);
             const Floats image = [&] {
                 Floats floats(bytes / 4);
-                for (float& x : floats) x = AnyFloat(random);
+                for (float& x : floats) x = MakeFloat(Content::kMixed, random);
                 return floats;
             }();
             Floats expected(image.size(), 0);
@@ -151,7 +152,7 @@ TEST(ClampFloatPixels, EveryWidthAgreesWithTheSlowForm) {
         for (const int32_t rows : {1, 2, 3, 6}) {
             const auto floats = static_cast<size_t>(rows * rowBytes / 4 + 2);
             Floats image(floats);
-            for (float& x : image) x = AnyFloat(random);
+            for (float& x : image) x = MakeFloat(Content::kMixed, random);
             const float least = Uniform(random, -1, 1), most = Uniform(random, -0.5f, 2);
             for (const size_t offset : {size_t{0}, size_t{1}}) { // aligned for vectors and not
                 alignas(64) static float source[1024], destination[1024];
@@ -173,7 +174,7 @@ TEST(ClampFloatPixels, EveryWidthAgreesWithTheSlowForm) {
 TEST(ClampFloatPixels, EveryBodyAgreesWithTheSlowForm) {
     Random random(8);
     Floats image(4096), expected(image.size());
-    for (float& x : image) x = AnyFloat(random);
+    for (float& x : image) x = MakeFloat(Content::kMixed, random);
     constexpr std::pair<float, float> kLimits[] = {
         {0, 1}, {-0.0f, 0.0f}, {1, 0}, {-kInfinity, 0.5f}, {0.25f, kInfinity}};
     for (const auto& [least, most] : kLimits)

@@ -3,7 +3,7 @@
 
 #include <PixelKiln/ColorSpace.h>
 
-#include "colour/Pixels.h"
+#include "support/ColourPixels.h"
 
 #include <algorithm>
 #include <barrier>
@@ -39,9 +39,9 @@ size_t OffsetIn(const void* object, const void* field) {
     return static_cast<size_t>(static_cast<const char*>(field) - static_cast<const char*>(object));
 }
 
-Pixels ThroughSpace(const ColorSpace& space, bool fromHub, bool gamutClip = true) {
+ColourPixels ThroughSpace(const ColorSpace& space, bool fromHub, bool gamutClip = true) {
     Random random(3);
-    Pixels pixels = UniformPixels(random, 11, -0.2f, 1.2f);
+    ColourPixels pixels = UniformPixels(random, 11, -0.2f, 1.2f);
     auto* floats = pixels.data()->data();
     const auto count = static_cast<int32_t>(pixels.size());
     if (fromHub)

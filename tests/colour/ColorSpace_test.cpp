@@ -2,8 +2,8 @@
 
 #include <PixelKiln/ColorSpace.h>
 
-#include "colour/Pixels.h"
 #include "colour/ReferenceColorimetry.h"
+#include "support/ColourPixels.h"
 #include "support/GuardedRows.h"
 
 #include <algorithm>
@@ -349,7 +349,7 @@ TEST(ColorSpace, AHostsSpaceConvertsItsPixelsByItsBase) {
     };
     const OwnLuma own;
     const Rec2020ColorSpace base;
-    const Pixels red = {{0.1f, 0.2f, 2.0f, 1.0f}};
+    const ColourPixels red = {{0.1f, 0.2f, 2.0f, 1.0f}};
     const auto through = [&red](const ColorSpace& space, bool gamutClip) {
         return Converted(red, [&](const float* source, float* destination, int32_t count) {
             space.ConvertPixelsFromRec709(source, destination, count, gamutClip);

@@ -42,12 +42,13 @@ exact::Triple ForChannels(const exact::Triple& c, Function function) {
 
 exact::Matrix Doubled(const CSMatrix& matrix) {
     exact::Matrix result;
-    std::copy_n(matrix.m, 9, result.begin());
+    for (size_t i = 0; i < 9; ++i) result[i / 3][i % 3] = double{matrix.m[i]};
     return result;
 }
 
 exact::Matrix Magnitudes(exact::Matrix matrix) {
-    for (double& m : matrix) m = std::abs(m);
+    for (auto& row : matrix)
+        for (double& m : row) m = std::abs(m);
     return matrix;
 }
 
@@ -155,7 +156,7 @@ constexpr double kPQ[2] = {kBulkBound, 2.5e-5};
 
 TEST(ColourAccuracy, PowerLaws) {
     const ColourPixels pixels = PixelsOfAllMagnitudes(true);
-    constexpr exact::Matrix kIdentity = {1, 0, 0, 0, 1, 0, 0, 0, 1};
+    constexpr exact::Matrix kIdentity = {{{1, 0, 0}, {0, 1, 0}, {0, 0, 1}}};
     for (const float gamma : {0.45f, 1 / 2.2f, 1 / 2.6f}) {
         const GammaColorSpace space(gamma);
         const std::string name = "gamma " + std::to_string(gamma);
@@ -171,10 +172,12 @@ TEST(ColourAccuracy, PowerLaws) {
 TEST(ColourAccuracy, Rec2020) {
     const ColourPixels pixels = PixelsOfAllMagnitudes(true);
     const Rec2020ColorSpace space;
-    constexpr exact::Matrix to = {0.6274020, 0.3292920, 0.0433061, 0.0690955, 0.9195440,
-                                  0.0113602, 0.0163937, 0.0880281, 0.8955780};
-    constexpr exact::Matrix from = {1.6605000,  -0.5876570, -0.0728399, -0.1245470, 1.1329000,
-                                    -0.0083480, -0.0181537, -0.1005970, 1.1187500};
+    constexpr exact::Matrix to = {{{0.6274020, 0.3292920, 0.0433061},
+                                   {0.0690955, 0.9195440, 0.0113602},
+                                   {0.0163937, 0.0880281, 0.8955780}}};
+    constexpr exact::Matrix from = {{{1.6605000, -0.5876570, -0.0728399},
+                                     {-0.1245470, 1.1329000, -0.0083480},
+                                     {-0.0181537, -0.1005970, 1.1187500}}};
     MeasureEncoded("hub to Rec. 2020", space, Way::kFromHub, pixels, to, kEncode24, kUsual, HubLight);
     MeasureEncoded("Rec. 2020 to hub", space, Way::kToHub, pixels, from, kEncode24, kUsual, HubLight);
 }
@@ -223,10 +226,12 @@ TEST(ColourAccuracy, PQ) {
 
 TEST(ColourAccuracy, HLG) {
     const HLGColorSpace space;
-    constexpr exact::Matrix to2020 = {0.6274020, 0.3292920, 0.0433061, 0.0690955, 0.9195440,
-                                      0.0113602, 0.0163937, 0.0880281, 0.8955780};
-    constexpr exact::Matrix from2020 = {1.6605000,  -0.5876570, -0.0728399, -0.1245470, 1.1329000,
-                                        -0.0083480, -0.0181537, -0.1005970, 1.1187500};
+    constexpr exact::Matrix to2020 = {{{0.6274020, 0.3292920, 0.0433061},
+                                       {0.0690955, 0.9195440, 0.0113602},
+                                       {0.0163937, 0.0880281, 0.8955780}}};
+    constexpr exact::Matrix from2020 = {{{1.6605000, -0.5876570, -0.0728399},
+                                         {-0.1245470, 1.1329000, -0.0083480},
+                                         {-0.0181537, -0.1005970, 1.1187500}}};
     MeasureSignals("hub to HLG", space, PixelsOfAllMagnitudes(false), kUsual, [&](const exact::Triple& c) {
         const exact::Triple light = exact::Apply(to2020, HubLight(c));
         // In the deepest black the gain is held.

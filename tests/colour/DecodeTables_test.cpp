@@ -65,8 +65,6 @@ TEST(SignalIndex, TakesTheEntryBelow) {
 }
 
 TEST(SignalIndex, LimitsWhatIsNoSignal) {
-    constexpr float kInfinity = std::numeric_limits<float>::infinity();
-    constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();
     for (const float below : {-0.0f, -1e-45f, -0.5f, -3e38f, -kInfinity, kNaN, -kNaN})
         EXPECT_EQ(SignalIndex(below, 4096), 0) << below;
     for (const float above : {0x1.000002p+0f, 2.0f, 3e38f, kInfinity})

@@ -3,6 +3,8 @@
 // Colour science in double precision, from the standards' own formulas and figures, to hold the library against. It
 // includes nothing of the library.
 
+#include "colour/ReferenceColorimetry.h"
+
 #include <array>
 #include <cmath>
 
@@ -52,62 +54,30 @@ inline Triple HLGSceneLight(const Triple& display) {
     return {gain * display[0], gain * display[1], gain * display[2]};
 }
 
-/// Row by row.
-using Matrix = std::array<double, 9>;
+using Matrix = PKTest::Matrix3<double>;
 
 inline Triple Apply(const Matrix& m, const Triple& v) {
-    return {m[0] * v[0] + m[1] * v[1] + m[2] * v[2], m[3] * v[0] + m[4] * v[1] + m[5] * v[2],
-            m[6] * v[0] + m[7] * v[1] + m[8] * v[2]};
-}
-
-inline Matrix Multiply(const Matrix& a, const Matrix& b) {
-    Matrix product{};
-    for (size_t i = 0; i < 9; ++i)
-        for (size_t k = 0; k < 3; ++k) product[i] += a[i / 3 * 3 + k] * b[3 * k + i % 3];
-    return product;
-}
-
-inline Matrix Inverse(const Matrix& m) {
-    const auto minor = [&](size_t row, size_t column) {
-        const size_t r0 = row == 0 ? 1 : 0, r1 = row == 2 ? 1 : 2;
-        const size_t c0 = column == 0 ? 1 : 0, c1 = column == 2 ? 1 : 2;
-        return m[3 * r0 + c0] * m[3 * r1 + c1] - m[3 * r0 + c1] * m[3 * r1 + c0];
-    };
-    const double determinant = m[0] * minor(0, 0) - m[1] * minor(0, 1) + m[2] * minor(0, 2);
-    Matrix inverse{};
-    for (size_t row = 0; row < 3; ++row)
-        for (size_t column = 0; column < 3; ++column)
-            inverse[3 * row + column] = ((row + column) % 2 == 0 ? 1 : -1) * minor(column, row) / determinant;
-    return inverse;
+    return PKTest::Times(m, v);
 }
 
 /// x and y of red, green, blue and white.
 struct Gamut {
-    double x[4], y[4];
+    double primaries[6], white[2];
 };
 
 /// ITU-R BT.709, ITU-R BT.2020, and the primaries of SMPTE RP 431-2 with the white of the others.
-inline constexpr Gamut kRec709 = {{0.640, 0.300, 0.150, 0.3127}, {0.330, 0.600, 0.060, 0.3290}};
-inline constexpr Gamut kRec2020 = {{0.708, 0.170, 0.131, 0.3127}, {0.292, 0.797, 0.046, 0.3290}};
-inline constexpr Gamut kP3D65 = {{0.680, 0.265, 0.150, 0.3127}, {0.320, 0.690, 0.060, 0.3290}};
-
-inline Triple XYZ(const Gamut& gamut, size_t i) {
-    return {gamut.x[i] / gamut.y[i], 1, (1 - gamut.x[i] - gamut.y[i]) / gamut.y[i]};
-}
+inline constexpr Gamut kRec709 = {{0.640, 0.330, 0.300, 0.600, 0.150, 0.060}, {0.3127, 0.3290}};
+inline constexpr Gamut kRec2020 = {{0.708, 0.292, 0.170, 0.797, 0.131, 0.046}, {0.3127, 0.3290}};
+inline constexpr Gamut kP3D65 = {{0.680, 0.320, 0.265, 0.690, 0.150, 0.060}, {0.3127, 0.3290}};
 
 /// Linear RGB to XYZ, so that (1, 1, 1) is white of luminance 1 (SMPTE RP 177).
 inline Matrix ToXYZ(const Gamut& gamut) {
-    Matrix m{};
-    for (size_t i = 0; i < 3; ++i)
-        for (size_t row = 0; row < 3; ++row) m[3 * row + i] = XYZ(gamut, i)[row];
-    const Triple scale = Apply(Inverse(m), XYZ(gamut, 3));
-    for (size_t i = 0; i < 9; ++i) m[i] *= scale[i % 3];
-    return m;
+    return PKTest::RGBToXYZOf<double>(gamut.primaries, gamut.white);
 }
 
 /// Linear RGB of one gamut to that of another of the same white.
 inline Matrix Between(const Gamut& from, const Gamut& to) {
-    return Multiply(Inverse(ToXYZ(to)), ToXYZ(from));
+    return PKTest::Times(PKTest::Inverse(ToXYZ(to)), ToXYZ(from));
 }
 
 } // namespace exact

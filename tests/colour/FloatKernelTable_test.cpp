@@ -3,7 +3,7 @@
 #include "colour/FloatKernelTable.h"
 
 #include "colour/DecodeTables.h"
-#include "colour/Pixels.h"
+#include "support/ColourPixels.h"
 
 #include <PixelKiln/ColorSpace.h>
 
@@ -90,16 +90,16 @@ TEST(FloatKernelTable, ThreadsMayMeetInTheFirstCall) {
 template <class Slot, auto kKernel, class Kernels, class... Arguments>
 void ExpectBound(const Arguments&... arguments) {
     Random random(5);
-    const Pixels source = UniformPixels(random, 40, -0.3f, 1.3f);
-    Pixels expected(source.size()), actual(source.size());
+    const ColourPixels source = UniformPixels(random, 40, -0.3f, 1.3f);
+    ColourPixels expected(source.size()), actual(source.size());
     (KernelsFor<Kernels>(BestTarget(Offer::processor)).*kKernel)(source.data()->data(),
                                                                  expected.data()->data(), arguments...);
     for (int i = 0; i < 2; ++i) {
-        actual.assign(source.size(), Pixel{});
+        actual.assign(source.size(), ColourPixel{});
         Slot::Call(source.data()->data(), actual.data()->data(), arguments...);
         EXPECT_TRUE(AreSameBits(actual, expected)) << "call " << i;
     }
-    EXPECT_FALSE(AreSameBits(actual, Pixels(source.size())));
+    EXPECT_FALSE(AreSameBits(actual, ColourPixels(source.size())));
 }
 
 TEST(FloatKernelTable, AllSlotsHoldTheBestBody) {

@@ -12,8 +12,6 @@ namespace {
 
 using namespace PK;
 
-constexpr float kInfinity = std::numeric_limits<float>::infinity();
-constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();
 constexpr size_t kRed = 2;
 
 float HubGrey(double candelas) {

@@ -13,7 +13,6 @@ namespace {
 
 using namespace PK;
 
-constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();
 constexpr float kSignalOf100 = 0.50807786f;
 constexpr float kPrimaries709[6] = {0.64f, 0.33f, 0.30f, 0.60f, 0.15f, 0.06f};
 /// Red, the channel of the tests on greys.

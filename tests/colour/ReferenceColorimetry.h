@@ -15,7 +15,7 @@ template <class Number>
 using Vector3 = std::array<Number, 3>;
 
 template <class Number>
-Vector3<Number> Times(const Matrix3<Number>& m, const Vector3<Number>& v) {
+constexpr Vector3<Number> Times(const Matrix3<Number>& m, const Vector3<Number>& v) {
     Vector3<Number> result;
     for (size_t i = 0; i < 3; ++i) result[i] = m[i][0] * v[0] + m[i][1] * v[1] + m[i][2] * v[2];
     return result;
@@ -42,14 +42,14 @@ Matrix3<Number> Inverse(const Matrix3<Number>& m) {
              {first[2] * r, (c[0] * a[1] - c[1] * a[0]) * r, (a[0] * b[1] - a[1] * b[0]) * r}}};
 }
 
-template <class Number>
-Vector3<Number> WhiteOf(const float* xy) {
+template <class Number, class Figure>
+Vector3<Number> WhiteOf(const Figure* xy) {
     const Number x = static_cast<Number>(xy[0]), y = static_cast<Number>(xy[1]);
     return {x / y, 1, (1 - y - x) / y};
 }
 
-template <class Number>
-Matrix3<Number> RGBToXYZOf(const float* primaries, const float* white) {
+template <class Number, class Figure>
+Matrix3<Number> RGBToXYZOf(const Figure* primaries, const Figure* white) {
     Matrix3<Number> chromaticities;
     for (size_t i = 0; i < 3; ++i) {
         const Number x = static_cast<Number>(primaries[2 * i]), y = static_cast<Number>(primaries[2 * i + 1]);

@@ -2,8 +2,8 @@
 
 #include "colour/ToneCurve.h"
 
-#include "colour/Pixels.h"
 #include "colour/ReferenceColorimetry.h"
+#include "support/ColourPixels.h"
 
 #include <algorithm>
 #include <cmath>
@@ -153,7 +153,7 @@ TEST(CompressPixelsToSDR, GreysFollowTheCurve) {
     for (const Compressing& c : kCompressing)
         for (const Settings& s : kSettings)
             for (const float grey : {0.05f, 0.5f, 1.0f, 2.0f, 5.0f, 20.0f}) {
-                const Pixel pixel = Converted({{grey, grey, grey, 0.5f}}, Compress(c.space, s))[0];
+                const ColourPixel pixel = Converted({{grey, grey, grey, 0.5f}}, Compress(c.space, s))[0];
                 const double exact = c.encode(SlowCurve(c.decode(static_cast<double>(grey)), s));
                 for (size_t k = 0; k < 3; ++k)
                     EXPECT_NEAR(static_cast<double>(pixel[k]), exact, 2e-5 * exact + 1e-7)
@@ -165,12 +165,12 @@ TEST(CompressPixelsToSDR, GreysFollowTheCurve) {
 TEST(CompressPixelsToSDR, Rec2020AndP3LeaveLinearPixels) {
     // 0.5 is 0.18946 in linear light of Rec. 2020; the slope 1 makes (sqrt(1 + 99.99 Y) - 1) / 99 of it, 0.035009,
     // which is not encoded again.
-    const Pixel rec2020 = Converted({{0.5f, 0.5f, 0.5f, 1}}, Compress(sRec2020, {1, 1, 0.5f}))[0];
+    const ColourPixel rec2020 = Converted({{0.5f, 0.5f, 0.5f, 1}}, Compress(sRec2020, {1, 1, 0.5f}))[0];
     for (size_t k = 0; k < 3; ++k) EXPECT_NEAR(rec2020[k], 0.0350094, 1e-6);
-    const Pixel p3 = Converted({{0.5f, 0.5f, 0.5f, 1}}, Compress(sP3, {1, 1, 0.5f}))[0];
+    const ColourPixel p3 = Converted({{0.5f, 0.5f, 0.5f, 1}}, Compress(sP3, {1, 1, 0.5f}))[0];
     for (size_t k = 0; k < 3; ++k)
         EXPECT_NEAR(p3[k], (std::sqrt(1 + 99.99 * std::pow(0.5, 2.6)) - 1) / 99, 1e-6);
-    const Pixel rec709 = Converted({{0.5f, 0.5f, 0.5f, 1}}, Compress(sRec709, {1, 1, 0.5f}))[0];
+    const ColourPixel rec709 = Converted({{0.5f, 0.5f, 0.5f, 1}}, Compress(sRec709, {1, 1, 0.5f}))[0];
     for (size_t k = 0; k < 3; ++k)
         EXPECT_NEAR(rec709[k], std::pow(0.0350094, 1 / 2.4), 1e-5) << "this one encodes";
 }
@@ -179,24 +179,25 @@ TEST(CompressPixelsToSDR, BlackStaysBlack) {
     for (const Compressing& c : kCompressing)
         for (const Settings& s : kSettings)
             for (const float black : {0.0f, -0.0f}) {
-                const Pixel pixel = Converted({{black, black, black, 1}}, Compress(c.space, s))[0];
+                const ColourPixel pixel = Converted({{black, black, black, 1}}, Compress(c.space, s))[0];
                 // What the curve may leave, and the matrices multiply, is encoded by some.
                 for (size_t k = 0; k < 3; ++k)
                     EXPECT_LE(static_cast<double>(std::abs(pixel[k])), c.encode(1.5e-9)) << c.name;
             }
-    EXPECT_EQ(Converted({{0, 0, 0, 1}}, Compress(sRec709, {1, 1, 0.5f}))[0], (Pixel{0, 0, 0, 1}));
-    EXPECT_EQ(Converted({{0, 0, 0, 1}}, Compress(sSRGB, {1, 1, 0.5f}))[0], (Pixel{0, 0, 0, 1}));
+    EXPECT_EQ(Converted({{0, 0, 0, 1}}, Compress(sRec709, {1, 1, 0.5f}))[0], (ColourPixel{0, 0, 0, 1}));
+    EXPECT_EQ(Converted({{0, 0, 0, 1}}, Compress(sSRGB, {1, 1, 0.5f}))[0], (ColourPixel{0, 0, 0, 1}));
 }
 
 TEST(CompressPixelsToSDR, NegativePixelsTakeTheChromaticityOfWhite) {
     for (const Compressing& c : kCompressing) {
-        const Pixel pixel = Converted({{-0.5f, -0.5f, -0.5f, 1}}, Compress(c.space, {1, 1.2f, 0.7f}))[0];
+        const ColourPixel pixel =
+            Converted({{-0.5f, -0.5f, -0.5f, 1}}, Compress(c.space, {1, 1.2f, 0.7f}))[0];
         for (size_t k = 0; k < 3; ++k)
             EXPECT_LE(static_cast<double>(std::abs(pixel[k])), c.encode(1.5e-9)) << c.name;
     }
     // Without a slope every luminance becomes 1 / 11, in the white of the space: its three channels are the same.
     for (const Compressing& c : kCompressing) {
-        const Pixel pixel = Converted({{-0.9f, -0.1f, -0.3f, 1}}, Compress(c.space, {1, 0, 0.5f}))[0];
+        const ColourPixel pixel = Converted({{-0.9f, -0.1f, -0.3f, 1}}, Compress(c.space, {1, 0, 0.5f}))[0];
         for (size_t k = 0; k < 3; ++k)
             EXPECT_NEAR(static_cast<double>(pixel[k]), c.encode(1.0 / 11), 1e-5) << c.name;
     }
@@ -207,7 +208,7 @@ TEST(CompressPixelsToSDR, ColoursBelowAMillionthCountAsBlack) {
     const auto compressed = [](float linear) {
         return Converted({{std::pow(linear, 1 / 2.4f), 0, 0, 1}}, Compress(sRec2020, {1, 0, 0.5f}))[0];
     };
-    const Pixel below = compressed(7.4e-7f), above = compressed(8e-7f);
+    const ColourPixel below = compressed(7.4e-7f), above = compressed(8e-7f);
     for (size_t k = 0; k < 3; ++k) EXPECT_NEAR(below[k], 1.0f / 11, 1e-5f) << "white";
     EXPECT_NEAR(above[0], 1 / (11 * 0.0593), 0.001) << "blue of that luminance";
     EXPECT_NEAR(above[1], 0.0f, 1e-4f);
@@ -223,7 +224,7 @@ TEST(CompressPixelsToSDR, NothingGuardsAColourWithoutLuminance) {
         }
     };
     const Host host;
-    const Pixel pixel = Converted({{0.5f, 0.5f, 0.5f, 0.25f}}, Compress(host, {1, 1, 0.5f}))[0];
+    const ColourPixel pixel = Converted({{0.5f, 0.5f, 0.5f, 0.25f}}, Compress(host, {1, 1, 0.5f}))[0];
     EXPECT_TRUE(std::isnan(pixel[0]) || std::isnan(pixel[2])) << "0 / 0";
     EXPECT_EQ(pixel[3], 0.25f);
 }
@@ -234,8 +235,8 @@ TEST(CompressPixelsToSDR, ColoursAgreeWithDoublePrecision) {
         const Matrix3<double> toXYZ = RGBToXYZOf<double>(c.space.Primaries(), c.space.WhitePoint());
         const Matrix3<double> toRGB = Inverse(toXYZ);
         for (const Settings& s : kSettings) {
-            const Pixels pixels = UniformPixels(random, 1000, 0.01f, 6);
-            const Pixels compressed = Converted(pixels, Compress(c.space, s));
+            const ColourPixels pixels = UniformPixels(random, 1000, 0.01f, 6);
+            const ColourPixels compressed = Converted(pixels, Compress(c.space, s));
             for (size_t i = 0; i < pixels.size(); ++i) {
                 Vector3<double> linear;
                 for (size_t k = 0; k < 3; ++k)
@@ -263,7 +264,7 @@ TEST(CompressPixelsToSDR, ColoursAgreeWithDoublePrecision) {
 
 TEST(CompressPixelsToSDR, ChromaticityIsKept) {
     Random random(35);
-    const auto chromaticity = [](const ColorSpace& space, const Pixel& linear) {
+    const auto chromaticity = [](const ColorSpace& space, const ColourPixel& linear) {
         const CSMatrix& m = space.RGBtoXYZ();
         double XYZ[3];
         for (size_t i = 0; i < 3; ++i)
@@ -272,9 +273,9 @@ TEST(CompressPixelsToSDR, ChromaticityIsKept) {
         const double sum = XYZ[0] + XYZ[1] + XYZ[2];
         return std::pair(XYZ[0] / sum, XYZ[1] / sum);
     };
-    for (const Pixel& pixel : UniformPixels(random, 300, 0.3f, 4)) {
-        const Pixel bent = Converted({pixel}, Compress(sRec2020, {2, 1.5f, 0.6f}))[0];
-        Pixel linear = pixel;
+    for (const ColourPixel& pixel : UniformPixels(random, 300, 0.3f, 4)) {
+        const ColourPixel bent = Converted({pixel}, Compress(sRec2020, {2, 1.5f, 0.6f}))[0];
+        ColourPixel linear = pixel;
         for (size_t k = 0; k < 3; ++k) linear[k] = std::pow(pixel[k], 2.4f);
         const auto [x, y] = chromaticity(sRec2020, linear);
         const auto [bentX, bentY] = chromaticity(sRec2020, bent);
@@ -286,11 +287,11 @@ TEST(CompressPixelsToSDR, ChromaticityIsKept) {
 TEST(CompressPixelsToSDR,
      APixelDoesNotDependOnItsPlace) { // nor does any value harm in place or at a guard page
     Random random(36);
-    const Pixels pixels = AnyPixels(random, 200);
+    const ColourPixels pixels = MakePixels(Content::kMixed, 200, random);
     for (const Compressing& c : kCompressing)
         for (const Settings& s :
              {kSettings[1], Settings{kNaN, 1, 0.5f}, Settings{1, 0, 0}, Settings{1, 2, 1}}) {
-            const Pixels all = Converted(pixels, Compress(c.space, s));
+            const ColourPixels all = Converted(pixels, Compress(c.space, s));
             for (size_t i = 0; i < pixels.size(); ++i) {
                 EXPECT_TRUE(AreSameBits(Converted({pixels[i]}, Compress(c.space, s)), {all[i]})) << c.name;
                 EXPECT_EQ(Pattern(all[i][3]), Pattern(pixels[i][3])) << "alpha";
@@ -302,11 +303,11 @@ TEST(CompressPixelsToSDR, ThreeClassesDoNothing) {
     const GammaColorSpace gamma;
     const PQColorSpace pq(false, true), ownPQ(sP3.Primaries(), false);
     const HLGColorSpace hlg;
-    const Pixels source(9, {0.5f, 0.25f, 2, 1}), untouched(9, {7, 8, 9, 10});
+    const ColourPixels source(9, {0.5f, 0.25f, 2, 1}), untouched(9, {7, 8, 9, 10});
     for (const ColorSpace* space :
          {static_cast<const ColorSpace*>(&gamma), static_cast<const ColorSpace*>(&pq),
           static_cast<const ColorSpace*>(&ownPQ), static_cast<const ColorSpace*>(&hlg)}) {
-        Pixels destination = untouched;
+        ColourPixels destination = untouched;
         space->CompressPixelsToSDR(source.data()->data(), destination.data()->data(), 9, 1, 1.2f, 0.5f);
         EXPECT_TRUE(AreSameBits(destination, untouched));
         space->CompressPixelsToSDR(nullptr, nullptr, 9, 1, 1.2f, 0.5f);

@@ -6,7 +6,6 @@
 #include "frame/PixelFormat.h"
 #include "support/FlagScope.h"
 #include "support/FloatEnvironment.h"
-#include "support/RowBuffer.h"
 #include "support/Samples.h"
 #include "support/Targets.h"
 
@@ -32,22 +31,6 @@ protected:
     static PK::MaskKernels::Select Kernel(size_t pixelBytes) {
         const auto& kernels = PK::KernelsFor<PK::MaskKernels>(GetParam());
         return pixelBytes == 4 ? kernels.pixels4 : pixelBytes == 8 ? kernels.pixels8 : kernels.pixels16;
-    }
-
-    void CheckRow(size_t pixelBytes, size_t width, int32_t bit, Placement place) {
-        SCOPED_TRACE(testing::Message() << pixelBytes << " bytes a pixel, width " << width << ", bit " << bit
-                                        << ", " << place << ", seed " << fRandom.Seed());
-        const size_t bytes = width * pixelBytes;
-        const RowBuffer first(bytes, place), second(bytes, place), destination(bytes, place);
-        const RowBuffer mask((static_cast<size_t>(bit) * (width > 0) + width + 7) / 8, place);
-        for (const RowBuffer* row : {&first, &second, &mask}) fRandom.Fill(row->Data(), row->Size());
-        Kernel(pixelBytes)(first.Data(), second.Data(), destination.Data(), static_cast<int32_t>(width),
-                           {mask.Data(), bit});
-        for (size_t i = 0; i < bytes; ++i) {
-            const bool isSet = BitOf(mask.Data(), static_cast<size_t>(bit) + i / pixelBytes);
-            ASSERT_EQ(destination.Data()[i], (isSet ? first : second).Data()[i]) << "byte " << i;
-        }
-        ASSERT_TRUE(destination.MarginsIntact());
     }
 
     Random fRandom{460};
@@ -94,15 +77,6 @@ protected:
 };
 
 } // namespace
-
-TEST_P(MaskBodies, TakeThePixelThatTheBitNames) {
-    const Placement places[] = {
-        {Placement::kBeforeGuard}, {Placement::kAfterGuard}, {Placement::kAtOffset, 1}};
-    for (const size_t pixelBytes : {4u, 8u, 16u})
-        for (int32_t bit = 0; bit < 8; ++bit)
-            for (size_t width = 0; width <= 85; ++width)
-                CheckRow(pixelBytes, width, bit, places[(width + static_cast<size_t>(bit)) % 3]);
-}
 
 TEST_P(MaskBodies, WorkInPlaceOfEitherRow) {
     const uint8_t mask[9] = {0x5a, 0xff, 0x00, 0x81, 0x7e, 0x33, 0xcc, 0x0f, 0xf0};

@@ -15,6 +15,7 @@
 #include <algorithm>
 #include <array>
 #include <set>
+#include <string>
 #include <vector>
 
 namespace PK {
@@ -120,19 +121,24 @@ TEST(Router, QualityOnlyChangesHowFloatChromaIsUpsampled) {
 
 TEST(Router, AgreesWithTheRestatedRouter) {
     const PKTest::FlagScope flags;
-    for (const bool sse2 : {false, true}) {
-        sCPUHasSSE2 = sse2;
-        ForEachPair([sse2](PK_PixelFormat source, PK_PixelFormat destination) {
-            const std::vector<Step> steps = Walk(source, destination);
-            const std::vector<reference::Step> expected =
-                reference::Chain(source, destination, kInterpolating, sse2);
-            ASSERT_EQ(steps.size(), expected.size()) << std::hex << source << " to " << destination;
-            for (size_t i = 0; i < steps.size(); ++i) {
-                EXPECT_EQ(Info(steps[i].kernel).name, expected[i].kernel);
-                EXPECT_EQ(steps[i].to, expected[i].next);
-            }
-        });
-    }
+    std::set<std::string> names;
+    for (const int32_t quality : {kRepeating, kInterpolating})
+        for (const bool sse2 : {false, true}) {
+            sCPUHasSSE2 = sse2;
+            ForEachPair([&](PK_PixelFormat source, PK_PixelFormat destination) {
+                const std::vector<Step> steps = Walk(source, destination, quality);
+                const auto expected = reference::Chain(source, destination, quality, sse2);
+                ASSERT_EQ(steps.size(), expected.size()) << std::hex << source << " to " << destination;
+                for (size_t i = 0; i < steps.size(); ++i) {
+                    EXPECT_EQ(Info(steps[i].kernel).name, expected[i].kernel);
+                    EXPECT_EQ(steps[i].to, expected[i].next);
+                    EXPECT_EQ(steps[i].kernel == Upsample422To444Float32Row_Interpolate,
+                              expected[i].interpolated);
+                    names.insert(expected[i].kernel);
+                }
+            });
+        }
+    EXPECT_EQ(names.size(), 59u) << "some kernel is named by no chain, or one is new";
 }
 
 /// What a kernel relies on of a format: how its pixels lie in memory.
@@ -261,6 +267,15 @@ TEST(Router, DroppingStraightAlphaGoesOverBlackAndDroppingPremultipliedAlphaKeep
               Kernels{ForceOpaqueRow_ARGB_15u});
     EXPECT_EQ(KernelsOf(PK_PixelFormat_VUYP_4444_8u, PK_PixelFormat_VUYA_4444_8u),
               Kernels{UnpremultiplyRow_VUYA_8u});
+}
+
+TEST(Router, OtherKnownWays) {
+    EXPECT_EQ(KernelsOf(PK_PixelFormat_BGRP_4444_8u, PK_PixelFormat_BGRX_4444_8u),
+              Kernels{ForceOpaqueRow_BGRA_8u});
+    EXPECT_EQ(KernelsOf(PK_PixelFormat_V210_422_10u_709, PK_PixelFormat_UYVY_422_8u),
+              (Kernels{V210ToUYVY8uRow, UYVY709To601Row}));
+    EXPECT_EQ(KernelsOf(PK_PixelFormat_YUYV_422_32f, PK_PixelFormat_VUYA_4444_32f),
+              (Kernels{SwapOrderRow_422_32f, Upsample422To444Float32Row_Interpolate}));
 }
 
 TEST(Router, Straight15BitsToTenBitsRunsTheUnpremultiplier) {

@@ -1,27 +1,22 @@
-// The transfer function in all bodies: powers against extended precision, 8-bit codes against their
-// thresholds.
+// The transfer function in all bodies: powers against extended precision, 8-bit codes against their thresholds.
 
-#include "convert/KernelTable.h"
 #include "convert/TransferTables.h"
-#include "frame/Capabilities.h"
 #include "frame/FloatMode.h"
+#include "support/KernelRows.h"
 #include "support/Random.h"
 #include "support/Targets.h"
-
-#include <gtest/gtest.h>
 
 #include <algorithm>
 #include <bit>
 #include <cfenv>
 #include <cmath>
 #include <limits>
-#include <string>
 #include <utility>
-#include <vector>
 
 namespace {
 
 using namespace PK;
+using namespace PKTest;
 
 constexpr float kInfinity = std::numeric_limits<float>::infinity();
 constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();
@@ -39,37 +34,15 @@ std::vector<To> Convert(Kernel kernel, Target target, const std::vector<From>& s
     return destination;
 }
 
-/// Pixels with the sample in all four channels.
-template <class Sample>
-std::vector<Sample> Grey(const std::vector<Sample>& samples) {
-    std::vector<Sample> pixels;
-    for (const Sample sample : samples) pixels.insert(pixels.end(), 4, sample);
-    return pixels;
-}
-
 class Transfer : public testing::TestWithParam<Target> {
 protected:
-    void SetUp() override {
-        DetectProcessor();
-        for (const Kernel kernel : {Kernel::GammaToLinearRow, Kernel::LinearToGammaRow,
-                                    Kernel::Gamma8uToLinearFloat32Row, Kernel::LinearFloat32ToGamma8uRow})
-            ASSERT_NE(nullptr, Body(kernel, target));
-    }
-
     Target target = GetParam();
 
-    float ToLinear(float c) {
-        return Convert<float>(Kernel::GammaToLinearRow, target, std::vector<float>(4, c))[0];
-    }
-    float ToGamma(float c) {
-        return Convert<float>(Kernel::LinearToGammaRow, target, std::vector<float>(4, c))[0];
-    }
-    int ToCode(float c) {
-        return Convert<uint8_t>(Kernel::LinearFloat32ToGamma8uRow, target, std::vector<float>(4, c))[0];
-    }
+    float ToLinear(float c) { return Convert<float>(Kernel::GammaToLinearRow, target, Floats(4, c))[0]; }
+    float ToGamma(float c) { return Convert<float>(Kernel::LinearToGammaRow, target, Floats(4, c))[0]; }
 };
 
-INSTANTIATE_TEST_SUITE_P(Bodies, Transfer, PKTest::EveryTarget(), PKTest::TargetOf);
+INSTANTIATE_TEST_SUITE_P(Bodies, Transfer, EveryTarget(), TargetOf);
 
 TEST_P(Transfer, KnownPowers) {
     EXPECT_EQ(1.0f, ToLinear(1));
@@ -108,9 +81,9 @@ TEST_P(Transfer, OverflowAndUnderflowKeepTheSign) {
 }
 
 TEST_P(Transfer, AlphaIsCopiedBitForBit) {
-    const std::vector<uint32_t> alphas = {0,          0x80000000, 0x00000001, 0x3f000000, 0xc1234567,
-                                          0x7f800000, 0x7fa12345, 0xffc54321}; // signalling NaN among them
-    std::vector<uint32_t> pixels(4 * alphas.size(), std::bit_cast<uint32_t>(0.3f));
+    const DoubleWords alphas = {0,          0x80000000, 0x00000001, 0x3f000000,
+                                0xc1234567, 0x7f800000, 0x7fa12345, 0xffc54321}; // signalling NaN among them
+    DoubleWords pixels(4 * alphas.size(), std::bit_cast<uint32_t>(0.3f));
     for (size_t i = 0; i < alphas.size(); ++i) pixels[4 * i + 3] = alphas[i];
     for (const Kernel kernel : {Kernel::GammaToLinearRow, Kernel::LinearToGammaRow}) {
         const auto result = Convert<uint32_t>(kernel, target, pixels);
@@ -119,8 +92,8 @@ TEST_P(Transfer, AlphaIsCopiedBitForBit) {
 }
 
 /// Samples of every exponent, denormals included, with random fractions and both signs.
-std::vector<float> SamplesOfAllExponents(PKTest::Random& random, int perExponent) {
-    std::vector<float> samples;
+Floats SamplesOfAllExponents(Random& random, int perExponent) {
+    Floats samples;
     for (uint32_t exponent = 0; exponent < 255; ++exponent)
         for (int i = 0; i < perExponent; ++i)
             samples.push_back(std::bit_cast<float>(exponent << 23 | (random.Next() & 0x807fffff)));
@@ -136,12 +109,12 @@ double ErrorInUlps(float actual, long double exact) {
 }
 
 /// The worst error of both power kernels over samples of all exponents, computed under a rounding mode.
-double WorstPowerError(Target target, int roundingMode, const std::vector<float>& source) {
+double WorstPowerError(Target target, int roundingMode, const Floats& source) {
     double worst = 0;
     for (const auto& [kernel, power] :
          {std::pair{Kernel::GammaToLinearRow, 2.4L}, std::pair{Kernel::LinearToGammaRow, 0.41666666L}}) {
         std::fesetround(roundingMode);
-        const std::vector<float> result = Convert<float>(kernel, target, source);
+        const Floats result = Convert<float>(kernel, target, source);
         std::fesetround(FE_TONEAREST);
         for (size_t i = 0; i < source.size(); ++i) {
             if (IsAlpha(i)) continue;
@@ -157,14 +130,14 @@ double WorstPowerError(Target target, int roundingMode, const std::vector<float>
 }
 
 TEST_P(Transfer, PowersAreAsExactAsAFloatCanBe) {
-    PKTest::Random random(24);
-    const std::vector<float> source = SamplesOfAllExponents(random, 512);
+    Random random(24);
+    const Floats source = SamplesOfAllExponents(random, 512);
     EXPECT_LT(WorstPowerError(target, FE_TONEAREST, source), 0.501) << "seed " << random.Seed();
 }
 
 TEST_P(Transfer, PowersStandEveryRoundingMode) {
-    PKTest::Random random(42);
-    const std::vector<float> source = SamplesOfAllExponents(random, 64);
+    Random random(42);
+    const Floats source = SamplesOfAllExponents(random, 64);
     for (const int mode : {FE_UPWARD, FE_DOWNWARD, FE_TOWARDZERO})
         EXPECT_LT(WorstPowerError(target, mode, source), 1.001)
             << "mode " << mode << ", seed " << random.Seed();
@@ -177,106 +150,61 @@ TEST_P(Transfer, DenormalSamplesCountWhereDenormalResultsAreFlushed) {
     EXPECT_EQ(0.0f, ToLinear(0x1p-55f)); // 2^-132
 }
 
-TEST_P(Transfer, PowersWorkInPlace) {
-    PKTest::Random random(7);
-    const std::vector<float> source = SamplesOfAllExponents(random, 4);
-    for (const Kernel kernel : {Kernel::GammaToLinearRow, Kernel::LinearToGammaRow}) {
-        std::vector<float> row = source;
-        Body(kernel, target)(row.data(), row.data(), static_cast<int32_t>(row.size() / 4));
-        EXPECT_EQ(Convert<float>(kernel, target, source), row);
-    }
+TEST(Transfer, PowersByHand) {
+    const Floats gamma = {0.5f, -0.5f, 1, 0.7f, 0, 2, -1, 3};
+    const Floats linear = {0.18946457f, -0.18946457f, 1, 0.7f, 0, 5.2780316f, -1, 3};
+    ExpectRow(Kernel::GammaToLinearRow, 2, gamma, linear, Rule::kBoth, 1e-6f);
+    ExpectRow(Kernel::LinearToGammaRow, 2, linear, gamma, Rule::kBoth, 1e-6f);
 }
 
-TEST_P(Transfer, EveryCodeHasItsLinearValue) {
-    std::vector<uint8_t> codes(256);
-    for (int i = 0; i < 256; ++i) codes[static_cast<size_t>(i)] = static_cast<uint8_t>(i);
-    const auto linear = Convert<float>(Kernel::Gamma8uToLinearFloat32Row, target, Grey(codes));
-    for (size_t i = 0; i < linear.size(); ++i) {
-        const auto code = static_cast<float>(i / 4);
-        if (IsAlpha(i))
-            EXPECT_EQ(code * 0x1.010102p-8f, linear[i]); // times 1 / 255, rounded to float first
-        else
-            EXPECT_EQ(static_cast<float>(std::pow(code / 255.0, 2.4)), linear[i]);
-    }
-    EXPECT_EQ(0.0f, linear[0]);
-    EXPECT_EQ(1.0f, linear[4 * 255]);
-    EXPECT_EQ(1.0f, linear[4 * 255 + 3]);
+TEST(Transfer, PowersWorkInPlace) {
+    for (const Kernel kernel : {Kernel::GammaToLinearRow, Kernel::LinearToGammaRow})
+        ExpectReferenceInPlace(kernel);
 }
 
-TEST_P(Transfer, EveryCodeComesBack) {
-    std::vector<uint8_t> codes(256);
-    for (int i = 0; i < 256; ++i) codes[static_cast<size_t>(i)] = static_cast<uint8_t>(255 - i);
-    const std::vector<uint8_t> pixels = Grey(codes);
-    const auto linear = Convert<float>(Kernel::Gamma8uToLinearFloat32Row, target, pixels);
-    EXPECT_EQ(pixels, Convert<uint8_t>(Kernel::LinearFloat32ToGamma8uRow, target, linear));
+TEST(Transfer, EveryCodeHasItsLinearValueAndComesBack) {
+    ExpectRow(Kernel::Gamma8uToLinearFloat32Row, 1, Bytes{0, 255, 51, 255},
+              Floats{0, 1, 0.021012222f, 1}, // 0.2^2.4
+              Rule::kBoth, 1e-9f);
+    const Bytes codes = AllCodesAtEveryPlace<uint8_t>();
+    ExpectReference(Kernel::Gamma8uToLinearFloat32Row, codes);
+    ForEachBody(Kernel::Gamma8uToLinearFloat32Row, [&](Target target, RowKernel) {
+        const Floats linear = Convert<float>(Kernel::Gamma8uToLinearFloat32Row, target, codes);
+        EXPECT_EQ(codes, Convert<uint8_t>(Kernel::LinearFloat32ToGamma8uRow, target, linear));
+    });
 }
 
-/// The 255 thresholds, ascending, computed apart from the library's tables.
-std::vector<float> Thresholds() {
-    std::vector<float> thresholds;
-    for (int k = 0; k < 255; ++k) thresholds.push_back(static_cast<float>(std::pow((k + 0.5) / 255, 2.4)));
-    return thresholds;
-}
-
-TEST_P(Transfer, CodesChangeExactlyAtTheThresholds) {
-    const std::vector<float> thresholds = Thresholds();
-    for (int k = 0; k < 255; ++k) {
-        const float threshold = thresholds[static_cast<size_t>(k)];
-        const auto codes = Convert<uint8_t>(
-            Kernel::LinearFloat32ToGamma8uRow, target,
-            Grey<float>({std::nextafter(threshold, 0.0f), threshold, std::nextafter(threshold, 2.0f)}));
-        for (size_t i = 0; i < codes.size(); ++i) {
-            if (IsAlpha(i)) continue;
-            ASSERT_EQ(i < 4 ? k : k + 1, codes[i]) << "threshold " << k;
-        }
-    }
-}
-
-TEST_P(Transfer, CodesCountTheThresholdsNotAboveAnySample) {
-    PKTest::Random random(255);
-    std::vector<float> source = SamplesOfAllExponents(random, 64);
+TEST(Transfer, CodesCountTheThresholdsNotAboveAnySample) {
+    Random random(255);
+    Floats source = SamplesOfAllExponents(random, 64);
     for (uint32_t upper = 0; upper < 0x10000; ++upper) // the ends of all look-up cells, of NaN too
         for (const uint32_t lower : {0x0000u, 0xffffu})
             source.push_back(std::bit_cast<float>(upper << 16 | lower));
     for (int i = 0; i < 400000; ++i) // where the thresholds are
         source.push_back(std::bit_cast<float>(0x34000000 + random.Below(0x0c000000)));
-
-    const std::vector<float> thresholds = Thresholds();
-    const auto codes = Convert<uint8_t>(Kernel::LinearFloat32ToGamma8uRow, target, source);
-    for (size_t i = 0; i < source.size(); ++i) {
-        if (IsAlpha(i)) continue;
-        const auto count =
-            std::isnan(source[i])
-                ? 0
-                : std::upper_bound(thresholds.begin(), thresholds.end(), source[i]) - thresholds.begin();
-        ASSERT_EQ(count, codes[i]) << source[i] << ", seed " << random.Seed();
-    }
+    for (const float threshold : kTransferTables.thresholds)
+        for (const float value :
+             {std::nextafter(threshold, 0.0f), threshold, std::nextafter(threshold, 2.0f)})
+            source.insert(source.end(), 4, value);
+    ExpectReference(Kernel::LinearFloat32ToGamma8uRow, source);
 }
 
-TEST_P(Transfer, CodesOfExtremeSamples) {
-    EXPECT_EQ(0, ToCode(0));
-    EXPECT_EQ(0, ToCode(-0.0f));
-    EXPECT_EQ(0, ToCode(-0.5f));
-    EXPECT_EQ(0, ToCode(-kInfinity));
-    EXPECT_EQ(0, ToCode(kNaN));
-    EXPECT_EQ(0, ToCode(-kNaN));
-    EXPECT_EQ(0, ToCode(0x1p-149f));
-    EXPECT_EQ(255, ToCode(1));
-    EXPECT_EQ(255, ToCode(kLargest));
-    EXPECT_EQ(255, ToCode(kInfinity));
+TEST(Transfer, CodesOfExtremeSamples) {
+    ExpectRow(Kernel::LinearFloat32ToGamma8uRow, 4,
+              Floats{0, -0.0f, -0.5f, 0, -kInfinity, kNaN, -kNaN, 0, 0x1p-149f, 1, kLargest, 0, kInfinity,
+                     0.5f, 2, 0},
+              Bytes{0, 0, 0, 0, 0, 0, 0, 0, 0, 255, 255, 0, 255, 191, 255, 0});
 }
 
-TEST_P(Transfer, AlphaIsRoundedToTheNearestCodeAndClamped) {
-    const std::vector<std::pair<float, int>> cases = {
+TEST(Transfer, AlphaIsRoundedToTheNearestCodeAndClamped) {
+    const std::vector<std::pair<float, uint8_t>> cases = {
         {0.0f, 0},       {1.0f, 255},     {0.5f, 128}, // 127.5 goes to the even code
         {0.1f, 26},      {0.498f, 127},   {-0.1f, 0},     {1.1f, 255},      {1e30f, 255},
         {-1e30f, 0},     {kLargest, 255}, {kNaN, 0},      {kInfinity, 255}, {-kInfinity, 0},
         {0.0019607f, 0}, {0.0019609f, 1}, {0.9980f, 254}, {0.99805f, 255},
     };
-    for (const auto& [alpha, code] : cases) {
-        const auto pixel = Convert<uint8_t>(Kernel::LinearFloat32ToGamma8uRow, target, Grey<float>({alpha}));
-        EXPECT_EQ(code, pixel[3]) << alpha;
-    }
+    for (const auto& [alpha, code] : cases)
+        ExpectRow(Kernel::LinearFloat32ToGamma8uRow, 1, Floats{0, 0, 0, alpha}, Bytes{0, 0, 0, code});
 }
 
 TEST(TransferTables, AreThePowersToTheLastBit) {

@@ -1,6 +1,7 @@
 // Every body of the quad warp against the restatement, pixel for pixel.
 
 #include "reference/ReferenceQuadWarp.h"
+#include "support/FloatEnvironment.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
 #include "support/Targets.h"
@@ -8,7 +9,6 @@
 #include <PixelKiln/QuadWarp.h>
 
 #include <algorithm>
-#include <cfenv>
 #include <gtest/gtest.h>
 #include <vector>
 
@@ -97,17 +97,6 @@ PK_Result Call(const QuadWarp& warp) {
                              warp.featherOver, warp.feather);
 }
 
-class RoundingScope {
-public:
-    explicit RoundingScope(int mode) : fSaved(std::fegetround()) { std::fesetround(mode); }
-    ~RoundingScope() { std::fesetround(fSaved); }
-    RoundingScope(const RoundingScope&) = delete;
-    RoundingScope& operator=(const RoundingScope&) = delete;
-
-private:
-    int fSaved;
-};
-
 } // namespace
 
 TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
@@ -125,8 +114,8 @@ TEST(WarpSpan, EveryBodyDrawsAsTheRestatement) {
         warp.sourceRowBytes = 4 * (random.Below(2) == 0 ? sourceStride : -sourceStride);
         warp.destinationRowBytes = 4 * (random.Below(2) == 0 ? destinationStride : -destinationStride);
 
-        constexpr int kModes[] = {FE_TONEAREST, FE_TONEAREST, FE_UPWARD, FE_DOWNWARD};
-        const RoundingScope rounding(kModes[random.Below(4)]);
+        constexpr uint32_t kModes[] = {0, 0, kRoundUp, kRoundDown};
+        const FloatEnvironment rounding(kModes[random.Below(4)]);
         const std::vector<uint8_t> before = destination.Copy();
         DrawQuadWarp(warp);
         const std::vector<uint8_t> expected = destination.Copy();

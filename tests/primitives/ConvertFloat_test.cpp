@@ -4,7 +4,6 @@
 
 #include "support/FloatEnvironment.h"
 #include "support/Random.h"
-#include "support/RowBuffer.h"
 #include "support/Targets.h"
 
 #include <cmath>
@@ -131,39 +130,6 @@ TEST(ConvertFloat, IsTheSameUnderEveryFloatingPointMode) {
             }
         });
     }
-}
-
-template <class Integer>
-void CheckEveryLength() {
-    Random random(32);
-    AtEveryTarget([&] {
-        for (size_t count = 0; count <= 70; ++count) {
-            for (const Placement place :
-                 {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
-                  Placement{Placement::kAtOffset, 3}}) {
-                const RowBuffer source(count * sizeof(float), place), result(count * sizeof(Integer), place);
-                for (size_t i = 0; i < count; ++i) {
-                    const float x = static_cast<float>(static_cast<int32_t>(random.Next())) * 0x1p-14f;
-                    std::memcpy(source.Data() + i * sizeof x, &x, sizeof x);
-                }
-                Convert(reinterpret_cast<const float*>(source.Data()),
-                        reinterpret_cast<Integer*>(result.Data()), static_cast<int32_t>(count), 1, 2);
-                for (size_t i = 0; i < count; ++i) {
-                    float x;
-                    Integer integer;
-                    std::memcpy(&x, source.Data() + i * sizeof x, sizeof x);
-                    std::memcpy(&integer, result.Data() + i * sizeof integer, sizeof integer);
-                    ASSERT_EQ(integer, Expected<Integer>(x, 1, 2)) << "count " << count;
-                }
-                ASSERT_TRUE(result.MarginsIntact());
-            }
-        }
-    });
-}
-
-TEST(ConvertFloat, TouchesExactlyItsElements) {
-    CheckEveryLength<int32_t>();
-    CheckEveryLength<int16_t>();
 }
 
 TEST(ConvertFloat, To32BitsWorksInPlace) {

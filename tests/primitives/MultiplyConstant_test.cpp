@@ -2,8 +2,6 @@
 
 #include "primitives/MultiplyConstant.h"
 
-#include "support/Random.h"
-#include "support/RowBuffer.h"
 #include "support/Targets.h"
 
 #include <algorithm>
@@ -58,26 +56,6 @@ TEST(MultiplyConstant, IsExactForEveryCodeConstantAndScale) {
                 }
                 MultiplyConstant(pixels.data(), 1024, value, pixels.data(), 1024, 256, 1, scale);
                 ASSERT_EQ(pixels, expected) << "constant " << constant << ", scale " << scale;
-            }
-        }
-    });
-}
-
-TEST(MultiplyConstant, TouchesExactlyItsPixels) {
-    Random random(41);
-    const uint8_t value[4] = {200, 100, 50, 25};
-    AtEveryTarget([&] {
-        for (size_t width = 0; width <= 70; ++width) {
-            for (const Placement place :
-                 {Placement{Placement::kBeforeGuard}, Placement{Placement::kAfterGuard},
-                  Placement{Placement::kAtOffset, 5}}) {
-                const RowBuffer source(4 * width, place), result(4 * width, place);
-                random.Fill(source.Data(), source.Size());
-                MultiplyConstant(source.Data(), 0, value, result.Data(), 0, static_cast<int32_t>(width), 1,
-                                 7);
-                for (size_t i = 0; i < 4 * width; ++i)
-                    ASSERT_EQ(result.Data()[i], Expected(source.Data()[i], value[i % 4], 7));
-                ASSERT_TRUE(result.MarginsIntact());
             }
         }
     });

@@ -143,25 +143,6 @@ ColourPixel BulkClip(ColourPixel c, const float* luma, Rounding rounding) {
     return c;
 }
 
-ColourPixel SingleClip(ColourPixel c, const float* luma) {
-    if (c[0] < 0 || c[1] < 0 || c[2] < 0) {
-        const float Y = luma[2] * c[0] + luma[1] * c[1] + luma[0] * c[2];
-        const float scale = LeastOf(ForColour(c, [=](float v) { return v < 0 ? Y / (Y - v) : 1.0f; }));
-        c = ForColour(c, [=](float v) { return (v - Y) * scale + Y; });
-    }
-    if (c[0] > 1 || c[1] > 1 || c[2] > 1) {
-        if (c[0] == c[1] && c[1] == c[2]) return {1, 1, 1, c[3]};
-        const float least = LeastOf(c), most = MostOf(c);
-        const ColourPixel d = ForColour(c, [=](float v) { return v - least; });
-        const float dMost = MostOf(d);
-        const float weighted = luma[0] * d[2] + luma[1] * d[1] + luma[2] * d[0];
-        const float L = Lesser(Greater(weighted / dMost, 0.15f), 0.9f);
-        const float k = (1 - L) / (most - L);
-        c = ForColour(c, [=](float v) { return (v - L) * k + L; });
-    }
-    return c;
-}
-
 ColourPixel LookUp(const ColourPixel& pixel, const float* table, int last) {
     return ForColour(pixel, [=](float v) {
         const float signal = v > 0 ? std::min(v, 1.0f) : 0.0f;
@@ -175,7 +156,6 @@ constexpr int kLastOfPQ = 4095;
 
 // HLG: a, b / 12 and a ln 12 + c of ITU-R BT.2100, and its weights of R, G, B.
 constexpr float kA = 0.17883277f, kB12 = 0.02372241f, kCShifted = 1.0042934f, kTwelfth = 0.083333336f;
-constexpr float kWeights[3] = {0.2627f, 0.678f, 0.0593f};
 constexpr int kLastOfHLG = 2047;
 
 } // namespace
@@ -217,7 +197,7 @@ ColourPixel BulkHubToPQ(const ColourPixel& pixel, const float* matrix, float out
 ColourPixel BulkHLGToHub(const ColourPixel& pixel, const float* matrix, const float* table,
                          Rounding rounding) {
     const ColourPixel scene = LookUp(pixel, table, kLastOfHLG);
-    const float gain = ApproxPow(Weighted(kWeights, scene, rounding), 0.2f, rounding) * 10;
+    const float gain = ApproxPow(Weighted(kLuma2020, scene, rounding), 0.2f, rounding) * 10;
     const ColourPixel displayed = ForColour(scene, [=](float v) { return v * gain; });
     return BulkPower(Multiply(matrix, displayed, rounding), kHubEncoding, rounding);
 }
@@ -225,7 +205,7 @@ ColourPixel BulkHLGToHub(const ColourPixel& pixel, const float* matrix, const fl
 ColourPixel BulkHubToHLG(const ColourPixel& pixel, const float* matrix, Rounding rounding) {
     const ColourPixel linear = Multiply(matrix, BulkPower(pixel, kHubDecoding, rounding), rounding);
     const ColourPixel displayed = ForColour(linear, [](float v) { return std::abs(v) * 0.1f; });
-    const float power = ApproxPow(Weighted(kWeights, displayed, rounding), 1.0f / 6, rounding);
+    const float power = ApproxPow(Weighted(kLuma2020, displayed, rounding), 1.0f / 6, rounding);
     const float gain = Refined(Greater(power, 0.0001f), rounding);
     const auto encode = [=](float magnitude) {
         const float E = magnitude * 0.1f * gain;
@@ -233,6 +213,25 @@ ColourPixel BulkHubToHLG(const ColourPixel& pixel, const float* matrix, Rounding
         return Sum(ApproxLn(Greater(E - kB12, 0x1p-126f), rounding), kA, kCShifted, rounding);
     };
     return ForColour(linear, [=](float v) { return KeepSignBit(v, encode); });
+}
+
+ColourPixel SingleClip(ColourPixel c, const float* luma) {
+    if (c[0] < 0 || c[1] < 0 || c[2] < 0) {
+        const float Y = luma[2] * c[0] + luma[1] * c[1] + luma[0] * c[2];
+        const float scale = LeastOf(ForColour(c, [=](float v) { return v < 0 ? Y / (Y - v) : 1.0f; }));
+        c = ForColour(c, [=](float v) { return (v - Y) * scale + Y; });
+    }
+    if (c[0] > 1 || c[1] > 1 || c[2] > 1) {
+        if (c[0] == c[1] && c[1] == c[2]) return {1, 1, 1, c[3]};
+        const float least = LeastOf(c), most = MostOf(c);
+        const ColourPixel d = ForColour(c, [=](float v) { return v - least; });
+        const float dMost = MostOf(d);
+        const float weighted = luma[0] * d[2] + luma[1] * d[1] + luma[2] * d[0];
+        const float L = Lesser(Greater(weighted / dMost, 0.15f), 0.9f);
+        const float k = (1 - L) / (most - L);
+        c = ForColour(c, [=](float v) { return (v - L) * k + L; });
+    }
+    return c;
 }
 
 ColourPixel SinglePowerLaws(const ColourPixel& pixel, const PowerLaws& laws) {
@@ -269,7 +268,7 @@ ColourPixel SingleHubToPQ(const ColourPixel& pixel, const float* matrix, float o
 
 ColourPixel SingleHLGToHub(const ColourPixel& pixel, const float* matrix, const float* table) {
     const ColourPixel scene = LookUp(pixel, table, kLastOfHLG);
-    const float gain = std::pow(Weighted(kWeights, scene, Rounding::kEach), 0.2f) * 10;
+    const float gain = std::pow(Weighted(kLuma2020, scene, Rounding::kEach), 0.2f) * 10;
     const ColourPixel displayed = ForColour(scene, [=](float v) { return v * gain; });
     return SinglePower(Multiply(matrix, displayed, Rounding::kEach), kHubEncoding);
 }
@@ -277,13 +276,31 @@ ColourPixel SingleHLGToHub(const ColourPixel& pixel, const float* matrix, const 
 ColourPixel SingleHubToHLG(const ColourPixel& pixel, const float* matrix) {
     const ColourPixel linear = Multiply(matrix, SinglePower(pixel, kHubDecoding), Rounding::kEach);
     const ColourPixel displayed = ForColour(linear, [](float v) { return std::abs(v) * 0.1f; });
-    const float power = std::pow(Weighted(kWeights, displayed, Rounding::kEach), 1.0f / 6);
+    const float power = std::pow(Weighted(kLuma2020, displayed, Rounding::kEach), 1.0f / 6);
     const float gain = 1 / std::max(power, 0.0001f);
     const auto encode = [=](float magnitude) {
         const float E = magnitude * 0.1f * gain;
         return E < kTwelfth ? std::sqrt(3 * E) : std::log(E - kB12) * kA + kCShifted;
     };
     return ForColour(linear, [=](float v) { return KeepSign(v, encode); });
+}
+
+ColourPixel SingleHubToSRGB(const ColourPixel& pixel, bool gamutClip) {
+    const auto encode = [](float magnitude) {
+        const float d = std::pow(magnitude, kHubDecoding);
+        return d > 0.0031308f ? std::pow(d, 0.41666666f) * 1.055f - 0.055f : d * 12.92f;
+    };
+    const ColourPixel encoded = ForColour(pixel, [=](float v) { return KeepSign(v, encode); });
+    return gamutClip ? SingleClip(encoded, kLuma709) : encoded;
+}
+
+ColourPixel SingleSRGBToHub(const ColourPixel& pixel, bool gamutClip) {
+    const auto decode = [](float a) {
+        const float d = a > 0.04045f ? std::pow((a + 0.055f) * 0.94786733f, 2.4f) : a * 0.07739938f;
+        return std::pow(d, kHubEncoding);
+    };
+    const ColourPixel hub = ForColour(pixel, [=](float v) { return KeepSign(v, decode); });
+    return gamutClip ? SingleClip(hub, kLuma709) : hub;
 }
 
 } // namespace reference

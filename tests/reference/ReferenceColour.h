@@ -17,6 +17,13 @@ enum class Rounding { kEach, kFused };
 float ApproxPow(float x, float exponent, Rounding rounding);
 float ApproxLn(float x, Rounding rounding);
 
+// Between linear RGB of Rec. 709 and Rec. 2020, row by row, and the weights of R, G, B in luminance.
+inline constexpr float kTo2020[9] = {0.6274020f, 0.3292920f, 0.0433061f, 0.0690955f, 0.9195440f,
+                                     0.0113602f, 0.0163937f, 0.0880281f, 0.8955780f};
+inline constexpr float kFrom2020[9] = {1.6605000f,  -0.5876570f, -0.0728399f, -0.1245470f, 1.1329000f,
+                                       -0.0083480f, -0.0181537f, -0.1005970f, 1.1187500f};
+inline constexpr float kLuma709[3] = {0.2126f, 0.7152f, 0.0722f}, kLuma2020[3] = {0.2627f, 0.678f, 0.0593f};
+
 // B, G, R, alpha.
 using ColourPixel = std::array<float, 4>;
 
@@ -38,6 +45,7 @@ ColourPixel BulkHLGToHub(const ColourPixel& pixel, const float* matrix, const fl
 ColourPixel BulkHubToHLG(const ColourPixel& pixel, const float* matrix, Rounding rounding);
 
 // As single pixels are converted, with powers of single precision.
+ColourPixel SingleClip(ColourPixel pixel, const float* luma);
 ColourPixel SinglePowerLaws(const ColourPixel& pixel, const PowerLaws& laws);
 ColourPixel SinglePQToHubByTable(const ColourPixel& pixel, const float* matrix, const float* table);
 // By the formula. The clip works on encoded values here.
@@ -46,5 +54,8 @@ ColourPixel SinglePQToHub(const ColourPixel& pixel, const float* matrix, float i
 ColourPixel SingleHubToPQ(const ColourPixel& pixel, const float* matrix, float outScale);
 ColourPixel SingleHLGToHub(const ColourPixel& pixel, const float* matrix, const float* table);
 ColourPixel SingleHubToHLG(const ColourPixel& pixel, const float* matrix);
+// The clip works on encoded values here too.
+ColourPixel SingleHubToSRGB(const ColourPixel& pixel, bool gamutClip);
+ColourPixel SingleSRGBToHub(const ColourPixel& pixel, bool gamutClip);
 
 } // namespace reference

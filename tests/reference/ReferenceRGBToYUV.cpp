@@ -2,6 +2,8 @@
 #include "ReferenceFamilies.h"
 #include "ReferenceSamples.h"
 
+#include <cmath>
+
 namespace reference {
 namespace {
 
@@ -63,8 +65,14 @@ constexpr Matrix kMatrices[] = {
      {46.5594f, 156.6288f, 15.8118f}},
 };
 
+// A negative term is subtracted, as the formulas are written: under a directed rounding mode that differs. By the
+// magnitude, since a compiler adds what has a minus in front.
+float AddTerm(float sum, float weight, float x) {
+    return weight < 0 ? sum - std::abs(weight) * x : sum + weight * x;
+}
+
 float Apply(const Weights& weights, float r, float g, float b) {
-    return weights.r * r + weights.g * g + weights.b * b;
+    return AddTerm(AddTerm(weights.r * r, weights.g, g), weights.b, b);
 }
 
 float Sample(const Job& job, uint32_t depth, int64_t at) {

@@ -1,12 +1,8 @@
 // Quarter-resolution scaling: which samples are taken, how many are written, and what stays.
 
-#include "scale/QuarterScaleKernels.h"
-
 #include "frame/Capabilities.h"
 #include "support/FlagScope.h"
 #include "support/GuardedImage.h"
-#include "support/RowBuffer.h"
-#include "support/Targets.h"
 
 #include <PixelKiln/QuarterScale.h>
 
@@ -121,55 +117,7 @@ protected:
     Random fRandom{330};
 };
 
-/// Every body that this processor can run, by itself.
-class QuarterScaleBodies : public TargetTest {
-protected:
-    Random fRandom{331};
-};
-
-constexpr Placement kPlacements[] = {{Placement::kBeforeGuard},
-                                     {Placement::kAfterGuard},
-                                     {Placement::kAtOffset, 0},
-                                     {Placement::kAtOffset, 13}};
-
 } // namespace
-
-TEST_P(QuarterScaleBodies, TakesEveryEvenByte) {
-    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(GetParam());
-    for (const Placement& place : kPlacements)
-        for (size_t count = 0; count <= 300; ++count) {
-            SCOPED_TRACE(testing::Message() << count << " bytes " << place << ", seed " << fRandom.Seed());
-            const RowBuffer source(2 * count, place), destination(count, place);
-            fRandom.Fill(source.Data(), source.Size());
-            kernels.evenBytes(source.Data(), destination.Data(), static_cast<int32_t>(count));
-            for (size_t i = 0; i < count; ++i) ASSERT_EQ(destination.Data()[i], source.Data()[2 * i]) << i;
-            ASSERT_TRUE(destination.MarginsIntact());
-        }
-}
-
-TEST_P(QuarterScaleBodies, InterleavesLumaWithChroma) {
-    const auto& kernels = PK::KernelsFor<PK::QuarterScaleKernels>(GetParam());
-    for (const Placement& place : kPlacements)
-        for (size_t pairs = 0; pairs <= 150; ++pairs) {
-            SCOPED_TRACE(testing::Message() << pairs << " pairs " << place << ", seed " << fRandom.Seed());
-            const RowBuffer luma(2 * pairs, place), chroma1(pairs, place), chroma2(pairs, place);
-            for (const RowBuffer* row : {&luma, &chroma1, &chroma2}) fRandom.Fill(row->Data(), row->Size());
-            const RowBuffer lumaFirst(4 * pairs, place), chromaFirst(4 * pairs, place);
-            const auto count = static_cast<int32_t>(pairs);
-            kernels.lumaFirst(luma.Data(), chroma1.Data(), chroma2.Data(), lumaFirst.Data(), count);
-            kernels.chromaFirst(luma.Data(), chroma1.Data(), chroma2.Data(), chromaFirst.Data(), count);
-            for (size_t k = 0; k < 2 * pairs; ++k) {
-                const uint8_t chroma = (k % 2 == 0 ? chroma1 : chroma2).Data()[k / 2];
-                ASSERT_EQ(lumaFirst.Data()[2 * k], luma.Data()[k]) << k;
-                ASSERT_EQ(lumaFirst.Data()[2 * k + 1], chroma) << k;
-                ASSERT_EQ(chromaFirst.Data()[2 * k], chroma) << k;
-                ASSERT_EQ(chromaFirst.Data()[2 * k + 1], luma.Data()[k]) << k;
-            }
-            ASSERT_TRUE(lumaFirst.MarginsIntact() && chromaFirst.MarginsIntact());
-        }
-}
-
-INSTANTIATE_TEST_SUITE_P(Targets, QuarterScaleBodies, EveryTarget(), TargetOf);
 
 TEST_F(QuarterScale, TheSecondFieldTakesLumaRows1And3AndChromaRow0) {
     const uint8_t luma[4][4] = {{1, 2, 3, 4}, {5, 6, 7, 8}, {9, 10, 11, 12}, {13, 14, 15, 16}};

@@ -8,6 +8,11 @@
 #include <sstream>
 
 namespace PKTest {
+
+float Uniform(Random& random, float least, float most) {
+    return least + (most - least) * static_cast<float>(random.Next() >> 8) * 0x1p-24f;
+}
+
 namespace {
 
 constexpr uint32_t kEdgePatterns[] = {
@@ -18,6 +23,8 @@ constexpr uint32_t kEdgePatterns[] = {
     0x00800000, // the least normal one
     0x00800001,
     0x32000000, // 2^-27
+    0x3b4d2e1c, // the thresholds of sRGB
+    0x3d25aee6,
     0x3dcccccd, // 0.1
     0x3effffff, // below 0.5
     0x3f000000, // 0.5
@@ -36,10 +43,6 @@ constexpr uint32_t kEdgePatterns[] = {
     0x7fffffff,
 };
 
-float Between(float low, float high, Random& random) {
-    return low + (high - low) * static_cast<float>(random.Next() >> 8) * 0x1p-24f;
-}
-
 float AnyBits(Random& random) {
     return std::bit_cast<float>(random.Next());
 }
@@ -56,24 +59,21 @@ float WideValue(Random& random) {
     case 1:
         return 1;
     default:
-        return Between(-0.5f, 3, random);
+        return Uniform(random, -0.5f, 3);
     }
 }
 
-float Value(Content content, Random& random) {
-    switch (content) {
-    case Content::kOrdinary:
-        return Between(0, 1, random);
-    case Content::kWide:
-        return WideValue(random);
-    case Content::kHighlights:
-        return Between(0, 10, random);
-    case Content::kEdges:
+float MixedValue(Random& random) {
+    switch (random.Below(8)) {
+    case 0:
         return EdgeValue(random);
-    case Content::kAnyBits:
-        break;
+    case 1:
+        return AnyBits(random);
+    case 2:
+        return Uniform(random, -10, 110);
+    default:
+        return Uniform(random, -0.25f, 1.25f);
     }
-    return AnyBits(random);
 }
 
 void Print(std::ostream& stream, const ColourPixel& pixel) {
@@ -84,17 +84,42 @@ void Print(std::ostream& stream, const ColourPixel& pixel) {
 } // namespace
 
 const char* ContentName(Content content) {
-    constexpr const char* names[] = {"ordinary", "wide", "highlights", "edges", "any bits"};
+    constexpr const char* names[] = {"ordinary", "wide", "highlights", "edges", "any bits", "mixed"};
     return names[static_cast<size_t>(content)];
+}
+
+float MakeFloat(Content content, Random& random) {
+    switch (content) {
+    case Content::kOrdinary:
+        return Uniform(random, 0, 1);
+    case Content::kWide:
+        return WideValue(random);
+    case Content::kHighlights:
+        return Uniform(random, 0, 10);
+    case Content::kEdges:
+        return EdgeValue(random);
+    case Content::kMixed:
+        return MixedValue(random);
+    case Content::kAnyBits:
+        break;
+    }
+    return AnyBits(random);
 }
 
 ColourPixels MakePixels(Content content, size_t count, Random& random) {
     ColourPixels pixels(count);
     for (ColourPixel& pixel : pixels) {
-        for (float& v : pixel) v = Value(content, random);
+        for (float& v : pixel) v = MakeFloat(content, random);
         if (content == Content::kWide && random.Below(4) == 0) pixel[1] = pixel[2] = pixel[0];
         pixel[3] = AnyBits(random);
     }
+    return pixels;
+}
+
+ColourPixels UniformPixels(Random& random, size_t count, float least, float most) {
+    ColourPixels pixels(count);
+    for (ColourPixel& pixel : pixels)
+        for (float& v : pixel) v = Uniform(random, least, most);
     return pixels;
 }
 

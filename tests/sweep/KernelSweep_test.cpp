@@ -1,10 +1,9 @@
 // Walks the register: every body of every kernel, over all sizes and many alignments, on rows that end at guard pages.
 // Row kernels of conversion are held to their restatement, all others to the lowest body of the same rule.
 
-#include "convert/Fusion.h"
 #include "convert/KernelTable.h"
-#include "reference/ReferenceKernels.h"
 #include "register/KernelRegister.h"
+#include "support/KernelRows.h"
 #include "support/KernelTrial.h"
 #include "support/RowBuffer.h"
 #include "support/Samples.h"
@@ -65,33 +64,6 @@ std::optional<Kernel> ConversionAt(size_t index) {
     return static_cast<Kernel>(index);
 }
 
-void RunReference(Kernel kernel, Target target, const void* source, void* destination, int32_t width) {
-    const KernelRow& row = Info(kernel);
-    const int quality = kernel == Kernel::Upsample422To444Float32Row_Interpolate ? 4 : 0;
-    reference::Run(row.name, row.operands.source.format, row.operands.destination.format,
-                   HasOtherRule(row, target), source, destination, width, quality);
-}
-
-/// The row that a conversion must give: for a fused kernel, what its parts give one after the other.
-void RunRestatement(Kernel kernel, Target target, const void* source, void* destination, int32_t width) {
-    for (const Fusion& fusion : Fusions()) {
-        if (fusion.fused != kernel) continue;
-        std::vector<uint8_t> from, to(static_cast<size_t>(width) * 16);
-        for (const Kernel part : fusion.parts) {
-            const bool first = part == fusion.parts.front(), last = part == fusion.parts.back();
-            RunReference(part, target, first ? source : from.data(), last ? destination : to.data(), width);
-            from = to;
-        }
-        return;
-    }
-    RunReference(kernel, target, source, destination, width);
-}
-
-/// Powers are right to half a unit in the last place and a little, so that a restatement may round the other way.
-int64_t UnitsFromRestatement(Kernel kernel) {
-    return kernel == Kernel::GammaToLinearRow || kernel == Kernel::LinearToGammaRow ? 1 : 0;
-}
-
 class KernelSweep : public testing::TestWithParam<size_t> {
 protected:
     const KernelRow& row = Register()[GetParam()];
@@ -133,7 +105,7 @@ protected:
         trial.call(row.body(target), pointers, destination.Data());
         ASSERT_EQ(mode, _mm_getcsr() | kExceptionFlags) << "another floating-point mode was left";
         if (conversion)
-            RunRestatement(*conversion, target, pointers[0], expected.Data(), size);
+            PKTest::RunExpected(*conversion, HasOtherRule(row, target), pointers[0], expected.Data(), size);
         else
             trial.call(row.body(Leader(target)), pointers, expected.Data());
 
@@ -143,7 +115,7 @@ protected:
         ASSERT_TRUE(destination.MarginsIntact()) << "bytes outside the row were written";
         ASSERT_EQ("", PKTest::FirstDifference(trial.destination.samples, bytes, expected.Data(),
                                               destination.Data(),
-                                              conversion ? UnitsFromRestatement(*conversion) : 0));
+                                              conversion ? PKTest::UnitsOff(*conversion) : 0));
     }
 };
 
