@@ -8,17 +8,10 @@
 namespace PK {
 
 struct OrderKernels {
-    RowKernel ForceOpaqueRow_BGRA_8u;
-    RowKernel ForceOpaqueRow_ARGB_8u;
-    RowKernel ForceOpaqueRow_BGRA_15u;
-    RowKernel ForceOpaqueRow_ARGB_15u;
-    RowKernel ForceOpaqueRow_BGRA_32f;
-    RowKernel ForceOpaqueRow_ARGB_32f;
-    RowKernel SwapOrderRow_4444_8u;
-    RowKernel SwapOrderRow_4444_15u;
-    RowKernel SwapOrderRow_4444_32f;
-    RowKernel SwapOrderRow_422_8u;
-    RowKernel SwapOrderRow_422_32f;
+    RowKernel ForceOpaqueRow_BGRA_8u, ForceOpaqueRow_ARGB_8u, ForceOpaqueRow_BGRA_15u,
+        ForceOpaqueRow_ARGB_15u, ForceOpaqueRow_BGRA_32f, ForceOpaqueRow_ARGB_32f;
+    RowKernel SwapOrderRow_4444_8u, SwapOrderRow_4444_15u, SwapOrderRow_4444_32f, SwapOrderRow_422_8u,
+        SwapOrderRow_422_32f;
 
     static constexpr const char* kFamily = "Order";
     static constexpr Offer kOffer = Offer::flags;
@@ -27,20 +20,11 @@ struct OrderKernels {
 };
 
 struct PremultiplyKernels {
-    RowKernel PremultiplyRow_BGRA_8u;
-    RowKernel PremultiplyRow_ARGB_8u;
-    RowKernel PremultiplyRow_VUYA_8u;
-    RowKernel PremultiplyRow_BGRA_15u;
-    RowKernel PremultiplyRow_ARGB_15u;
-    RowKernel PremultiplyRow_BGRA_32f;
-    RowKernel PremultiplyRow_ARGB_32f;
-    RowKernel UnpremultiplyRow_BGRA_8u;
-    RowKernel UnpremultiplyRow_ARGB_8u;
-    RowKernel UnpremultiplyRow_VUYA_8u;
-    RowKernel UnpremultiplyRow_BGRA_15u;
-    RowKernel UnpremultiplyRow_ARGB_15u;
-    RowKernel UnpremultiplyRow_BGRA_32f;
-    RowKernel UnpremultiplyRow_ARGB_32f;
+    RowKernel PremultiplyRow_BGRA_8u, PremultiplyRow_ARGB_8u, PremultiplyRow_VUYA_8u, PremultiplyRow_BGRA_15u,
+        PremultiplyRow_ARGB_15u, PremultiplyRow_BGRA_32f, PremultiplyRow_ARGB_32f;
+    RowKernel UnpremultiplyRow_BGRA_8u, UnpremultiplyRow_ARGB_8u, UnpremultiplyRow_VUYA_8u,
+        UnpremultiplyRow_BGRA_15u, UnpremultiplyRow_ARGB_15u, UnpremultiplyRow_BGRA_32f,
+        UnpremultiplyRow_ARGB_32f;
     RowKernel BGRA8uToBGRP32fRow;
     RowKernel VUYA8uToVUYP32fRow;
 
@@ -51,16 +35,10 @@ struct PremultiplyKernels {
 };
 
 struct DepthKernels {
-    RowKernel ExpandTo32fRow_RGB_8u;
-    RowKernel ExpandTo32fRow_VUYA_8u;
-    RowKernel ExpandTo32fRow_UYVY_8u;
-    RowKernel ExpandTo32fRow_YUYV_8u;
-    RowKernel ExpandTo32fRow_RGB_15u;
-    RowKernel PackFrom32fRow_RGB_8u;
-    RowKernel PackFrom32fRow_VUYA_8u;
-    RowKernel PackFrom32fRow_UYVY_8u;
-    RowKernel PackFrom32fRow_YUYV_8u;
-    RowKernel PackFrom32fRow_RGB_15u;
+    RowKernel ExpandTo32fRow_RGB_8u, ExpandTo32fRow_VUYA_8u, ExpandTo32fRow_UYVY_8u, ExpandTo32fRow_YUYV_8u,
+        ExpandTo32fRow_RGB_15u;
+    RowKernel PackFrom32fRow_RGB_8u, PackFrom32fRow_VUYA_8u, PackFrom32fRow_UYVY_8u, PackFrom32fRow_YUYV_8u,
+        PackFrom32fRow_RGB_15u;
     RowKernel Expand8uTo15uRow;
     RowKernel Pack15uTo8uRow;
 
@@ -91,12 +69,9 @@ struct YUVToRGBKernels {
     RowKernel YUV709ToRGB32fRow;
     RowKernel YUV601ToRGBFloat32Row;
     RowKernel YUV709ToRGBFloat32Row;
-    RowKernel VUYX8uToRGB8uRow_601;
-    RowKernel VUYX8uToRGB8uRow_709;
-    RowKernel VUYX8uToRGB32fRow_601;
-    RowKernel VUYX8uToRGB32fRow_709;
-    RowKernel VUYX8uToBGR8uRow_601;
-    RowKernel VUYX8uToBGR8uRow_709;
+    RowKernel VUYX8uToRGB8uRow_601, VUYX8uToRGB8uRow_709;
+    RowKernel VUYX8uToRGB32fRow_601, VUYX8uToRGB32fRow_709;
+    RowKernel VUYX8uToBGR8uRow_601, VUYX8uToBGR8uRow_709;
 
     static constexpr const char* kFamily = "YUVToRGB";
     static constexpr Offer kOffer = Offer::flags;
@@ -123,10 +98,8 @@ struct YUVToYUVKernels {
 struct ChromaKernels {
     RowKernel Downsample444To422Row;
     RowKernel Downsample444To422Float32Row;
-    RowKernel Upsample422To444Row_UYVY;
-    RowKernel Upsample422To444Row_YUYV;
-    RowKernel Upsample422To444Float32Row_Repeat;
-    RowKernel Upsample422To444Float32Row_Interpolate;
+    RowKernel Upsample422To444Row_UYVY, Upsample422To444Row_YUYV;
+    RowKernel Upsample422To444Float32Row_Repeat, Upsample422To444Float32Row_Interpolate;
 
     static constexpr const char* kFamily = "Chroma";
     static constexpr Offer kOffer = Offer::flags;
@@ -163,8 +136,7 @@ struct V210Kernels {
     RowKernel V210ToUYVY8uRow;
     RowKernel V210ToVUY8uRow;
     RowKernel V210709ToVUY601_8uRow;
-    RowKernel V210ToBGR8uRow_601;
-    RowKernel V210ToBGR8uRow_709;
+    RowKernel V210ToBGR8uRow_601, V210ToBGR8uRow_709;
     RowKernel V210ToUYVY32fRow;
     RowKernel UYVY32fToV210Row;
 
