@@ -1,10 +1,13 @@
-// Every body of every row kernel on one row that stays in cache: what the instructions cost without memory.
+// Every body of every kernel of the register on 1920 elements that stay in cache: what the instructions cost without
+// memory.
 //
 //   pixelkiln_kernel_bench [--markdown] --benchmark_filter=Premultiply
 
 #include "KernelTableReporter.h"
 
-#include "convert/KernelTable.h"
+#include "register/KernelRegister.h"
+#include "support/KernelTrial.h"
+#include "support/Samples.h"
 
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/PixelFormat.h>
@@ -19,48 +22,50 @@ namespace {
 
 using namespace PK;
 
-constexpr int32_t kWidth = 1920;
+constexpr int32_t kSize = 1920;
+constexpr uint64_t kSeed = 1;
 
-std::vector<uint8_t> MakeRow(PK_PixelFormat format) {
-    std::vector<uint8_t> row(static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, kWidth)));
-    const bool isFloat = (format & 0x100) != 0;
-    for (size_t i = 0; i < row.size(); ++i)
-        row[i] = static_cast<uint8_t>(isFloat && i % 4 == 3 ? 0x3e : i * 37);
-    return row;
+std::vector<uint8_t> MakeRow(PKTest::TrialRow row, PKTest::Random& random) {
+    std::vector<uint8_t> bytes(row.bytes);
+    PKTest::FillOrdinarySamples(row.samples, bytes.data(), bytes.size(), random);
+    return bytes;
 }
 
-void RunBody(benchmark::State& state, Kernel kernel, Target target) {
-    const std::vector<uint8_t> source = MakeRow(Info(kernel).source);
-    std::vector<uint8_t> destination = MakeRow(Info(kernel).destination);
-    const RowKernel run = Body(kernel, target);
+void RunBody(benchmark::State& state, const KernelRow& row, Target target) {
+    const PKTest::KernelTrial trial = PKTest::MakeTrial(row, kSize, kSeed);
+    PKTest::Random random(kSeed);
+    std::vector<std::vector<uint8_t>> sources;
+    std::vector<const uint8_t*> pointers;
+    for (const PKTest::TrialRow& source : trial.sources)
+        pointers.push_back(sources.emplace_back(MakeRow(source, random)).data());
+    std::vector<uint8_t> destination = MakeRow(trial.destination, random);
+    const AnyKernel body = row.body(target);
     for (auto _ : state) {
-        run(source.data(), destination.data(), kWidth);
+        trial.call(body, pointers, destination.data());
         benchmark::ClobberMemory();
     }
-    state.SetItemsProcessed(state.iterations() * kWidth);
-    state.SetBytesProcessed(state.iterations() * static_cast<int64_t>(source.size() + destination.size()));
+    state.SetItemsProcessed(state.iterations() * kSize);
 }
 
 std::string FormatName(PK_PixelFormat format) {
+    if (format == PK_PixelFormat_Invalid) return "-";
     return format == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u" : PK_PixelFormatName(format);
 }
 
 void RegisterAll() {
-    for (int i = 0; i < kKernelCount; ++i)
-        for (const Target target : kFlagTargets) {
-            const auto kernel = static_cast<Kernel>(i);
-            if (!IsEnabled(target) || !Body(kernel, target)) continue;
-            const KernelRow& info = Info(kernel);
-            const std::string name = std::string(info.name) + "/" + FormatName(info.operands.source.format) +
-                                     "/" + FormatName(info.operands.destination.format) + "/" +
-                                     TargetName(target);
-            benchmark::RegisterBenchmark(name.c_str(), RunBody, kernel, target)->MinTime(0.05);
+    for (const KernelRow& row : KernelRegister())
+        for (const Target target : TargetsOf(row.offer)) {
+            if (!IsEnabled(target, row.offer) || row.body(target) == nullptr) continue;
+            const std::string name = std::string(row.family) + " " + row.name + "/" +
+                                     FormatName(row.operands.source.format) + "/" +
+                                     FormatName(row.operands.destination.format) + "/" + TargetName(target);
+            benchmark::RegisterBenchmark(name.c_str(), RunBody, row, target)->MinTime(0.05);
         }
 }
 
 std::vector<std::string> TargetNames() {
     std::vector<std::string> names;
-    for (const Target target : kFlagTargets) names.push_back(TargetName(target));
+    for (int i = 0; i < kTargetCount; ++i) names.push_back(TargetName(static_cast<Target>(i)));
     return names;
 }
 
@@ -73,7 +78,6 @@ void RunAll(bool asMarkdown) {
 }
 
 } // namespace
-
 int main(int argc, char** argv) {
     PK_Initialize();
     benchmark::Initialize(&argc, argv);

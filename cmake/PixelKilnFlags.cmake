@@ -14,11 +14,6 @@ if(PIXELKILN_SANITIZE)
                          -fno-sanitize-recover=all)
   target_link_options(pixelkiln_flags INTERFACE -fsanitize=${PIXELKILN_SANITIZE})
 endif()
-if(PIXELKILN_SANITIZE MATCHES thread)
-  # Asio's fences are not seen by this sanitizer; its mutex orders the same, and is.
-  target_compile_options(pixelkiln_flags INTERFACE -Wno-tsan)
-endif()
-
 # libFuzzer comes with Clang and wants to see which branches of the library its inputs reach.
 if(PIXELKILN_BUILD_FUZZ AND CMAKE_CXX_COMPILER_ID MATCHES Clang)
   set(PIXELKILN_LIBFUZZER ON)

@@ -1,11 +1,11 @@
 #include "ColourPictures.h"
 
 #include "Drawing.h"
+#include "Numbers.h"
 #include "Operations.h"
 
 #include <array>
 #include <cmath>
-#include <cstdio>
 #include <iterator>
 
 namespace tool {
@@ -66,8 +66,7 @@ Frame Shown(Frame frame, const Space& space) {
 void DrawLuminanceScale(cairo_t* context, double left, double top) {
     const double decades = std::log10(kGreatest / kLeast);
     for (int decade = 0; decade <= static_cast<int>(decades); ++decade) {
-        char label[32];
-        std::snprintf(label, sizeof(label), "%g", kLeast * std::pow(10, decade));
+        const std::string label = Formatted("%g", kLeast * std::pow(10, decade));
         const double x = left + kRampWidth * decade / decades;
         SetColour(context, kInk);
         cairo_rectangle(context, x - 0.5, top, 1, 6);
@@ -84,11 +83,7 @@ std::vector<Tile> ColourTiles(const Frame& picture) {
     for (const Stop& stop : kStops) {
         Frame frame = Converted(picture, kFloatFormat, kDefaultQuality);
         ConvertSpace(frame, photograph, ParseSpace(stop.space), /*gamutClip=*/false);
-        Tile tile;
-        tile.title = stop.title;
-        tile.caption = stop.caption;
-        tile.pictures.push_back(Converted(frame, kShownFormat, kDefaultQuality));
-        tiles.push_back(std::move(tile));
+        tiles.emplace_back(stop.title, stop.caption, Converted(frame, kShownFormat, kDefaultQuality));
     }
     return tiles;
 }

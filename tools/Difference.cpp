@@ -1,8 +1,9 @@
 #include "Difference.h"
 
+#include "Numbers.h"
+
 #include <algorithm>
 #include <cmath>
-#include <cstdio>
 #include <cstdlib>
 #include <limits>
 
@@ -61,9 +62,7 @@ Frame DifferencePicture(const Frame& a, const Frame& b, int factor) {
 
 std::string PsnrText(double psnr) {
     if (std::isinf(psnr)) return psnr > 0 ? "infinite" : "not a number";
-    char text[32];
-    std::snprintf(text, sizeof(text), "%.1f dB", psnr);
-    return text;
+    return Formatted("%.1f dB", psnr);
 }
 
 } // namespace tool

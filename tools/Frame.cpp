@@ -17,8 +17,7 @@ Frame::Frame(PK_PixelFormat format, int32_t width, int32_t height)
     fBlock = std::unique_ptr<void, FreePixels>(base, FreePixels{format, size});
     if (result != PK_Success || base == nullptr)
         throw Failure(kExitFailed, "there is no memory for a frame of " + FormatName(format) + " at " +
-                                       std::to_string(width) + "x" + std::to_string(height) +
-                                       "; a frame may take up to 2 GiB");
+                                       SizeText(width, height) + "; a frame may take up to 2 GiB");
     fPixels = static_cast<uint8_t*>(pixels);
     fBytes = static_cast<uint64_t>(PK_PixelFormatSize(format, width, height));
     std::memset(fPixels, 0, fBytes);
@@ -48,16 +47,18 @@ std::vector<Plane> Frame::Planes() const {
     return result;
 }
 
+std::string SizeText(int32_t width, int32_t height) {
+    return std::to_string(width) + "x" + std::to_string(height);
+}
+
 void Convert(const Frame& source, Frame& destination, int32_t quality) {
     const PK_Result result =
         PK_Convert(source.Pixels(), source.RowBytes(), source.Format(), destination.Pixels(),
                    destination.RowBytes(), destination.Format(), source.Width(), source.Height(), quality);
     if (result != PK_Success)
         throw Failure(kExitFailed, "cannot convert " + FormatName(source.Format()) + " to " +
-                                       FormatName(destination.Format()) + " at " +
-                                       std::to_string(source.Width()) + "x" +
-                                       std::to_string(source.Height()) + ": " + ResultText(result) +
-                                       " (result " + std::to_string(result) + ")");
+                                       FormatName(destination.Format()) + " at " + SizeText(source) + ": " +
+                                       ResultText(result) + " (result " + std::to_string(result) + ")");
 }
 
 Frame Copied(const Frame& source) {
@@ -73,8 +74,8 @@ Frame Converted(const Frame& source, PK_PixelFormat format, int32_t quality) {
 void Require(PK_Result result, const std::string& what, const Frame& frame) {
     if (result == PK_Success) return;
     throw Failure(kExitFailed, "cannot " + what + " a frame of " + FormatName(frame.Format()) + " at " +
-                                   std::to_string(frame.Width()) + "x" + std::to_string(frame.Height()) +
-                                   ": " + ResultText(result) + " (result " + std::to_string(result) + ")");
+                                   SizeText(frame) + ": " + ResultText(result) + " (result " +
+                                   std::to_string(result) + ")");
 }
 
 const char* ResultText(PK_Result result) {

@@ -60,6 +60,12 @@ private:
     std::unique_ptr<void, FreePixels> fBlock;
 };
 
+/// Such as 1920x1080.
+std::string SizeText(int32_t width, int32_t height);
+inline std::string SizeText(const Frame& frame) {
+    return SizeText(frame.Width(), frame.Height());
+}
+
 /// Throws a Failure that names both formats if the library refuses.
 void Convert(const Frame& source, Frame& destination, int32_t quality);
 Frame Converted(const Frame& source, PK_PixelFormat format, int32_t quality);

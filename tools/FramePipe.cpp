@@ -134,8 +134,8 @@ void PipeRawFrames(const Plan& plan, const std::string& name, const Step& step, 
 }
 
 std::string CountAndSize(int64_t count, const Frame& frame) {
-    return std::to_string(count) + (count == 1 ? " frame " : " frames ") + std::to_string(frame.Width()) +
-           "x" + std::to_string(frame.Height()) + ", " + FormatName(frame.Format());
+    return std::to_string(count) + (count == 1 ? " frame " : " frames ") + SizeText(frame) + ", " +
+           FormatName(frame.Format());
 }
 
 } // namespace
@@ -154,6 +154,14 @@ Size ParseSize(const std::string& text) {
     }
     throw Failure(kExitUsage,
                   "'" + text + "' is no size; write it as width x height in pixels, such as 1920x1080");
+}
+
+Step OnCopy(std::function<void(Frame&)> change) {
+    return [change = std::move(change)](const Frame& frame) {
+        Frame changed = Copied(frame);
+        change(changed);
+        return changed;
+    };
 }
 
 void PipeFrames(const PipeOptions& options, const Step& step) {

@@ -36,6 +36,9 @@ bool IsSilent(const PipeOptions& options);
 /// What becomes of a frame of the format of --from, before it is taken to that of --to.
 using Step = std::function<Frame(const Frame&)>;
 
+/// The step that changes a copy of the frame.
+Step OnCopy(std::function<void(Frame&)> change);
+
 /// Takes every frame of the input through the step, if there is one, to the output and prints a line about it.
 void PipeFrames(const PipeOptions& options, const Step& step);
 

@@ -4,6 +4,8 @@
 
 #include <charconv>
 #include <cmath>
+#include <cstdarg>
+#include <cstdio>
 
 namespace tool {
 
@@ -23,6 +25,15 @@ std::vector<double> ParseNumbers(const std::string& text, size_t count, const st
     if (numbers.size() == count && next == end) return numbers;
     throw Failure(kExitUsage, "'" + text + "' is not " + what + ": that takes " + std::to_string(count) +
                                   " numbers with commas between");
+}
+
+std::string Formatted(const char* format, ...) {
+    char text[160];
+    va_list values;
+    va_start(values, format);
+    std::vsnprintf(text, sizeof(text), format, values);
+    va_end(values);
+    return text;
 }
 
 } // namespace tool

@@ -1,6 +1,6 @@
 #pragma once
 
-// Lists of numbers on the command line, such as 0.5,12,-3.
+// Numbers from words and in words.
 
 #include <cstddef>
 #include <string>
@@ -8,8 +8,11 @@
 
 namespace tool {
 
-/// Reads exactly `count` finite numbers with commas between. Throws a usage Failure.
+/// Reads exactly `count` finite numbers with commas between, such as 0.5,12,-3. Throws a usage Failure.
 /// \param what  what the numbers are, such as "a place".
 std::vector<double> ParseNumbers(const std::string& text, size_t count, const std::string& what);
+
+/// As std::printf writes it.
+[[gnu::format(printf, 1, 2)]] std::string Formatted(const char* format, ...);
 
 } // namespace tool

@@ -28,7 +28,7 @@ struct BoxBlur {
 void Blur(Frame& frame, const BoxBlur& blur);
 
 struct Warp {
-    std::array<double, 8> quad; ///< where the corners of the picture go, clockwise from the top left one
+    std::array<double, 8> quad = {}; ///< where the corners of the picture go, clockwise from the top left one
     float feather = 0;
     int32_t opacity = 255;
     int32_t quality = kDefaultQuality;

@@ -9,14 +9,6 @@ namespace {
 
 constexpr double kQuad[] = {0.2, 0.06, 0.95, 0.2, 0.8, 0.95, 0.05, 0.75}; // as fractions of the sides
 
-Tile MakeTile(const char* title, const char* caption, Frame picture) {
-    Tile tile;
-    tile.title = title;
-    tile.caption = caption;
-    tile.pictures.push_back(std::move(picture));
-    return tile;
-}
-
 Frame Filled(const Frame& like, const char* colour) {
     Frame frame(like.Format(), like.Width(), like.Height());
     Fill(frame, colour);
@@ -51,7 +43,7 @@ std::vector<Tile> OperationTiles(const Frame& picture) {
     const auto feather = static_cast<float>(picture.Width()) / 16;
     std::vector<Tile> tiles;
     const auto add = [&](const char* title, const char* caption, Frame frame) {
-        tiles.push_back(MakeTile(title, caption, std::move(frame)));
+        tiles.emplace_back(title, caption, std::move(frame));
     };
     add("fill", "255,128,0,255", Filled(picture, "255,128,0,255"));
     add("rotate", "90 degrees", Rotated(picture, 90));

@@ -58,9 +58,9 @@ void RawReader::RefuseLength(const Frame& like, int64_t bytes) const {
     if (bytes > 0 && bytes % RawFrameBytes(like, other) == 0)
         advice = packed ? "without --packed it would fit" : "with --packed it would fit";
     throw Failure(kExitFile, "'" + fName + "' has " + std::to_string(bytes) + " bytes, but a frame of " +
-                                 FormatName(like.Format()) + " at " + std::to_string(like.Width()) + "x" +
-                                 std::to_string(like.Height()) + " with " + PackingText(fPacking) +
-                                 " takes " + std::to_string(RawFrameBytes(like, fPacking)) +
+                                 FormatName(like.Format()) + " at " + SizeText(like) + " with " +
+                                 PackingText(fPacking) + " takes " +
+                                 std::to_string(RawFrameBytes(like, fPacking)) +
                                  ", and the file must hold a whole number of them; " + advice);
 }
 

@@ -5,14 +5,20 @@
 #include "Frame.h"
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace tool {
 
 struct Tile {
-    std::vector<Frame> pictures; ///< BGRA_4444_8u, drawn next to each other
+    Tile(std::string words, std::string moreWords, Frame picture)
+        : title(std::move(words)), caption(std::move(moreWords)) {
+        pictures.push_back(std::move(picture));
+    }
+
     std::string title;
     std::string caption;
+    std::vector<Frame> pictures; ///< BGRA_4444_8u, drawn next to each other
 };
 
 /// Writes a PNG of all tiles, at least one, each with the same number of pictures.

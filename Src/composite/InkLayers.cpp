@@ -1,8 +1,7 @@
 #include "composite/InkLayers.h"
 
 #include "convert/RasterFormats.h"
-
-#include <PixelKiln/Buffers.h>
+#include "frame/Planes.h"
 
 #include <algorithm>
 #include <cstring>
@@ -32,12 +31,12 @@ constexpr Inks k422 = {{{kU, kU, kV, kY}, {kFloatU, kFloatY, kFloatV, kFloatY}},
 
 const Ink& InkOf(PK_PixelFormat format) {
     const Inks& inks = Is422(format) ? k422 : IsYUV(format) ? kVUY : kRGB;
-    return (format & kOrderMask) == kOrderARGB ? inks.turned : inks.ordinary;
+    return IsOrderReversed(format) ? inks.turned : inks.ordinary;
 }
 
 InkLayer RasterLayer(const DestinationImage& picture) {
     const Ink& ink = InkOf(picture.format);
-    const bool hasBytes = (picture.format & kDepthMask) == kDepth8u;
+    const bool hasBytes = DepthOf(picture.format) == kDepth8u;
     InkLayer layer = {};
     layer.unitBytes = hasBytes ? sizeof ink.bytes : sizeof ink.floats;
     std::memcpy(layer.ink, hasBytes ? static_cast<const void*>(ink.bytes) : ink.floats,
@@ -51,16 +50,8 @@ InkLayer RasterLayer(const DestinationImage& picture) {
     return layer;
 }
 
-InkLayer PlaneLayer(void* plane, int32_t rowBytes, const DestinationImage& image, int32_t shift,
-                    uint8_t ink) {
-    return {static_cast<uint8_t*>(plane),
-            rowBytes,
-            image.width >> shift,
-            image.height >> shift,
-            shift,
-            shift,
-            1,
-            {ink}};
+InkLayer PlaneLayer(const Plane<uint8_t>& plane, int32_t shift, uint8_t ink) {
+    return {plane.pixels, plane.rowBytes, plane.width, plane.height, shift, shift, 1, {ink}};
 }
 
 } // namespace
@@ -78,21 +69,14 @@ void InkLayer::Draw(const Stroke& stroke) const {
 }
 
 bool HasInk(PK_PixelFormat format) noexcept {
-    if ((format & kDepthMask) == kDepth15u) return false;
+    if (DepthOf(format) == kDepth15u) return false;
     return IsStream(format) ? Is420Planar(format) : IsRasterFormat(format & ~kOrderMask);
 }
 
 InkLayers LayersOf(const DestinationImage& image) noexcept {
-    if (!IsStream(image.format))
-        return {{RasterLayer(PK_IsOriginBottomLeft(image.format) ? Reversed(image) : image)}, 1};
-
-    void* planes[3];
-    int32_t rowBytes[3];
-    PK_GetPlanarBuffers(image.pixels, image.format, image.width, image.height, planes, rowBytes);
-    return {{PlaneLayer(planes[0], rowBytes[0], image, 0, kY),
-             PlaneLayer(planes[1], rowBytes[1], image, 1, kU),
-             PlaneLayer(planes[2], rowBytes[2], image, 1, kV)},
-            3};
+    if (!IsStream(image.format)) return {{RasterLayer(FromTop(image))}, 1};
+    const auto [y, u, v] = PlanesInBlock(image.pixels, image.format, image.width, image.height);
+    return {{PlaneLayer(y, 0, kY), PlaneLayer(u, 1, kU), PlaneLayer(v, 1, kV)}, 3};
 }
 
 } // namespace PK

@@ -3,97 +3,74 @@
 #include <PixelKiln/Overlay.h>
 
 #include "composite/MaskKernels.h"
-#include "convert/ConversionChain.h"
-#include "convert/Image.h"
 #include "convert/RasterFormats.h"
-#include "frame/RowScratch.h"
+#include "convert/WorkingRows.h"
+#include "frame/Arguments.h"
 #include "primitives/Dispatch.h"
 
 namespace PK {
 namespace {
 
-/// One of the two images, and the way to the destination's format where its own is another.
-struct MaskInput {
-    SourceImage image;
-    bool isConverted = false;
-    ConversionChain chain = {};
-
-    PK_Result Prepare(PK_PixelFormat destination, int32_t quality) {
-        isConverted = image.format != destination;
-        if (isConverted) chain.Build(image.format, destination, quality);
-        return isConverted && chain.count == 0 ? PK_ErrFailed : PK_Success;
-    }
-
-    /// The row in the destination's format: where it lies, or converted into `converted`.
-    const uint8_t* Row(int32_t row, uint8_t* converted, const ChainScratch& scratch) const {
-        if (!isConverted) return image.Row(row);
-        chain.ConvertRow(image.Row(row), converted, image.width, scratch);
-        return converted;
-    }
-};
-
 struct Mask {
     const uint8_t* bits;
     ptrdiff_t rowBytes;
     int32_t firstBit;
+
+    MaskRow Row(int32_t row) const { return {bits + row * rowBytes, firstBit}; }
 };
 
-MaskKernels::Select KernelFor(PK_PixelFormat format) {
-    const MaskKernels& kernels = Best<MaskKernels>();
-    switch (BytesPerPixel(format)) {
-    case 4:
-        return kernels.pixels4;
-    case 8:
-        return kernels.pixels8;
-    default:
-        return kernels.pixels16;
-    }
-}
+struct MaskImages {
+    SourceImage first, second;
+    Mask mask;
+    DestinationImage destination;
+};
 
-PK_Result CheckArguments(const SourceImage& first, const SourceImage& second, const Mask& mask,
-                         const DestinationImage& destination) {
+/// The ways to the destination's format, in which pixels are picked, and the kernel that picks them.
+class MaskPlan {
+public:
+    bool Build(PK_PixelFormat first, PK_PixelFormat second, PK_PixelFormat destination, int32_t quality) {
+        fSelect = KernelFor(BytesPerPixel(destination));
+        return fFirst.Build(first, destination, quality) && fSecond.Build(second, destination, quality);
+    }
+
+    /// Rows from `firstRow` up to `endRow` of images in the formats of the plan.
+    PK_Result Run(const MaskImages& images, int32_t firstRow, int32_t endRow) const {
+        const int32_t width = images.destination.width;
+        RowMemory memory(width);
+        memory.AddSource(fFirst);
+        memory.AddSource(fSecond);
+        return memory.With([&](TemporaryRows& rows) {
+            const RowSource first(images.first, fFirst, rows), second(images.second, fSecond, rows);
+            for (int32_t row = firstRow; row < endRow; ++row)
+                fSelect(first.Row(row), second.Row(row), images.destination.Row(row), width,
+                        images.mask.Row(row));
+            return PK_Success;
+        });
+    }
+
+private:
+    static MaskKernels::Select KernelFor(int32_t pixelBytes) {
+        const MaskKernels& kernels = Best<MaskKernels>();
+        return pixelBytes == 4 ? kernels.pixels4 : pixelBytes == 8 ? kernels.pixels8 : kernels.pixels16;
+    }
+
+    ConversionChain fFirst, fSecond;
+    MaskKernels::Select fSelect = nullptr;
+};
+
+PK_Result Composite(const MaskImages& images, int32_t quality) {
+    const auto& [first, second, mask, destination] = images;
     if (Is422(destination.format) || !IsRasterFormat(destination.format)) return PK_ErrBadDstFormat;
     if (!IsRasterFormat(first.format) || !IsRasterFormat(second.format)) return PK_ErrBadSrcFormat;
-    if (destination.width < 0 || destination.width > kMaximumWidth) return PK_ErrFailed;
-    if (destination.height < 0) return PK_ErrFailed;
-    if (destination.width == 0 || destination.height == 0) return PK_Success;
-    const bool hasNull = !first.pixels || !second.pixels || !mask.bits || !destination.pixels;
-    return hasNull ? PK_ErrFailed : PK_Success;
-}
+    if (destination.width > kMaximumWidth) return PK_ErrFailed; // of an image without rows, too
+    if (const auto result = ResultWithoutWork(destination.width, destination.height,
+                                              {first.pixels, second.pixels, mask.bits, destination.pixels},
+                                              BelowZero::Refused))
+        return *result;
 
-void SelectRows(const MaskInput& first, uint8_t* firstRow, const MaskInput& second, uint8_t* secondRow,
-                const ChainScratch& scratch, const Mask& mask, const DestinationImage& destination) {
-    const MaskKernels::Select select = KernelFor(destination.format);
-    for (int32_t row = 0; row < destination.height; ++row) {
-        select(first.Row(row, firstRow, scratch), second.Row(row, secondRow, scratch), destination.Row(row),
-               destination.width, {mask.bits + row * mask.rowBytes, mask.firstBit});
-    }
-}
-
-PK_Result Composite(const SourceImage& firstImage, const SourceImage& secondImage, const Mask& mask,
-                    const DestinationImage& destination, int32_t quality) {
-    const PK_Result checked = CheckArguments(firstImage, secondImage, mask, destination);
-    if (checked != PK_Success || destination.width == 0 || destination.height == 0) return checked;
-
-    MaskInput first{firstImage}, second{secondImage};
-    if (const PK_Result result = first.Prepare(destination.format, quality); result != PK_Success)
-        return result;
-    if (const PK_Result result = second.Prepare(destination.format, quality); result != PK_Success)
-        return result;
-
-    // The rows are converted one after the other, so that the longer chain's scratch serves both.
-    const bool firstIsLonger = first.chain.passCount > second.chain.passCount;
-    const ConversionChain& longer = firstIsLonger ? first.chain : second.chain;
-    const int32_t width = destination.width;
-    const uint64_t rowBytes = static_cast<uint64_t>(BytesPerPixel(destination.format)) * uint64_t(width);
-    return longer.WithScratch(width, [&](const ChainScratch& scratch) {
-        return WithRowScratch(first.isConverted ? rowBytes : 0, [&](uint8_t* firstRow) {
-            return WithRowScratch(second.isConverted ? rowBytes : 0, [&](uint8_t* secondRow) {
-                SelectRows(first, firstRow, second, secondRow, scratch, mask, destination);
-                return PK_Success;
-            });
-        });
-    });
+    MaskPlan plan;
+    if (!plan.Build(first.format, second.format, destination.format, quality)) return PK_ErrFailed;
+    return plan.Run(images, 0, destination.height);
 }
 
 } // namespace
@@ -106,8 +83,9 @@ PK_Result PK_OneBitMaskComposite(const void* first, int32_t firstRowBytes, PK_Pi
                                  const uint8_t* mask, int32_t maskRowBytes, uint8_t maskBitOffset, void* dest,
                                  int32_t destRowBytes, PK_PixelFormat destFormat, int32_t width,
                                  int32_t height, int32_t quality) noexcept {
-    return Composite({static_cast<const uint8_t*>(first), firstRowBytes, firstFormat, width, height},
-                     {static_cast<const uint8_t*>(second), secondRowBytes, secondFormat, width, height},
-                     {mask, maskRowBytes, maskBitOffset & 7},
-                     {static_cast<uint8_t*>(dest), destRowBytes, destFormat, width, height}, quality);
+    return Composite({{static_cast<const uint8_t*>(first), firstRowBytes, firstFormat, width, height},
+                      {static_cast<const uint8_t*>(second), secondRowBytes, secondFormat, width, height},
+                      {mask, maskRowBytes, maskBitOffset & 7},
+                      {static_cast<uint8_t*>(dest), destRowBytes, destFormat, width, height}},
+                     quality);
 }

@@ -1,29 +1,15 @@
 #pragma once
 
-// What the codec bridges share: their kernels by layout, the answers that need no look at memory, and the walk
-// over rows. A bridge is one fixed layout at each end, so there is no router and no chain.
+// What the codec bridges share: their kernels by layout and the walk over rows. A bridge is one fixed layout at each end, so there is no router and no chain.
 //
 // Kernel sources include BridgeKernels.h alone, since what is inline here may be compiled once only.
 
 #include "convert/BridgeKernels.h"
-#include "convert/Image.h"
+#include "frame/Arguments.h"
 
-#include <PixelKiln/Types.h>
-
-#include <initializer_list>
-#include <optional>
+#include <cstddef>
 
 namespace PK {
-
-/// The result of a bridge that has nothing to convert or must refuse; none where there is work to do.
-inline std::optional<PK_Result> ResultWithoutWork(int32_t width, int32_t height,
-                                                  std::initializer_list<const void*> pointers) {
-    if (height < 1 || width == 0) return PK_Success;
-    if (width < 0 || width > kMaximumWidth) return PK_ErrFailed;
-    for (const void* pointer : pointers)
-        if (pointer == nullptr) return PK_ErrFailed;
-    return std::nullopt;
-}
 
 /// The rows of an image that is read or written; row bytes of either sign.
 template <class Byte>

@@ -1,8 +1,8 @@
 // Chroma resampling between 4:4:4 and 4:2:2. The chroma of a pair stands at its even pixel.
 
-#include "convert/ChromaPairs.h"
 #include "convert/ConversionKernels.h"
 #include "convert/DownsampleRow.h"
+#include "primitives/lanes/ChromaPairs.h"
 
 namespace PK::PK_TARGET {
 namespace {

@@ -3,57 +3,62 @@
 #include "convert/Fusion.h"
 #include "convert/KernelTable.h"
 #include "convert/Router.h"
+#include "frame/PixelFormat.h"
+
+#include <algorithm>
 
 namespace PK {
 
-void ConversionChain::Build(PK_PixelFormat source, PK_PixelFormat destination, int32_t quality) noexcept {
+bool ConversionChain::Build(PK_PixelFormat from, PK_PixelFormat to, int32_t quality) noexcept {
+    source = from;
+    destination = to;
     count = 0;
     passCount = 0;
-    PK_PixelFormat current = source;
+    PK_PixelFormat current = from;
     for (int32_t i = 0; i < kMaximumSteps; ++i) {
         ConversionStep step;
-        if (ChooseConversionStep(current, destination, quality, step) != PK_Success) return;
+        if (ChooseConversionStep(current, to, quality, step) != PK_Success) return false;
         const RowKernel body = ChooseBody(step.kernel);
-        if (body == nullptr) return;
+        if (body == nullptr) return false;
 
         kernels[i] = step.kernel;
         steps[i] = body;
         formats[i] = step.next;
         current = step.next;
-        if (current == destination) {
+        if (current == to) {
             count = i + 1;
             ChoosePasses();
-            return;
+            return true;
         }
     }
+    return false;
 }
 
 void ConversionChain::ChoosePasses() noexcept {
     for (int32_t i = 0; i < count;) {
         int32_t consumed = 1;
         const RowKernel fused = ChooseFusedBody(kernels + i, count - i, consumed);
-        passes[passCount++] = fused != nullptr ? fused : steps[i];
-        i += fused != nullptr ? consumed : 1;
+        const RowKernel run = fused != nullptr ? fused : steps[i];
+        i += consumed;
+        passes[passCount++] = {run, formats[i - 1]};
     }
 }
 
-void ConversionChain::ConvertRow(const void* source, void* destination, int32_t width,
+uint64_t ConversionChain::ScratchBytes(int32_t width) const noexcept {
+    uint64_t bytes = 0;
+    for (int32_t i = 0; i + 1 < passCount; ++i) bytes = std::max(bytes, BytesOfRow(passes[i].next, width));
+    return bytes;
+}
+
+void ConversionChain::ConvertRow(const void* from, void* to, int32_t width,
                                  const ChainScratch& scratch) const noexcept {
-    const void* from = source;
+    const void* row = from;
     for (int32_t i = 0; i + 1 < passCount; ++i) {
-        void* to = scratch.rows[i % 2];
-        passes[i](from, to, width);
-        from = to;
+        void* next = scratch.rows[i % 2];
+        passes[i].run(row, next, width);
+        row = next;
     }
-    passes[passCount - 1](from, destination, width);
-}
-
-PK_Result ConversionChain::ConvertRow(const void* source, void* destination, int32_t width) const noexcept {
-    if (count == 0) return PK_ErrFailed;
-    return WithScratch(width, [&](const ChainScratch& scratch) {
-        ConvertRow(source, destination, width, scratch);
-        return PK_Success;
-    });
+    passes[passCount - 1].run(row, to, width);
 }
 
 } // namespace PK

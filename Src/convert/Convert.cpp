@@ -2,10 +2,11 @@
 
 #include <PixelKiln/Convert.h>
 
-#include "convert/ConvertRasterRows.h"
 #include "convert/CopySameFormat.h"
 #include "convert/RasterFormats.h"
 #include "convert/Streams.h"
+#include "convert/WorkingRows.h"
+#include "frame/Arguments.h"
 #include "frame/FloatMode.h"
 #include "frame/TransientMemory.h"
 
@@ -23,23 +24,36 @@ SourceImage AsSource(const DestinationImage& image) {
     return {image.pixels, image.rowBytes, image.format, image.width, image.height};
 }
 
+/// Row 0 of the source to row 0 of the destination and so on.
+PK_Result ConvertRows(const SourceImage& source, const DestinationImage& destination,
+                      const ConversionChain& chain) {
+    RowMemory memory(source.width);
+    memory.AddChain(chain);
+    return memory.With([&](const TemporaryRows& rows) {
+        const RowSource from(source, chain, rows.Scratch());
+        for (int32_t row = 0; row < source.height; ++row) from.ConvertRow(row, destination.Row(row));
+        return PK_Success;
+    });
+}
+
 PK_Result ConvertToRaster(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
-    // What is refused or does nothing has no last row whose address could be taken.
-    const bool hasRows = source.height > 0 && source.width > 0 && source.width <= kMaximumWidth &&
-                         source.pixels != nullptr && destination.pixels != nullptr;
-    if (!hasRows) return ConvertRasterRows(source, destination, quality);
+    ConversionChain chain;
+    if (!chain.Build(source.format, destination.format, quality)) return PK_ErrFailed;
+    if (const auto result =
+            ResultWithoutWork(source.width, source.height, {source.pixels, destination.pixels}))
+        return *result;
 
     // Only between a bottom-up and a top-down format do the rows change their order in memory. Otherwise both
-    // are walked upward in memory, which the processor fetches ahead up to twice as fast.
+    // are walked upward in memory, which the processor fetches ahead best.
     const bool turned = PK_IsOriginTopLeft(source.format) != PK_IsOriginTopLeft(destination.format);
-    return ConvertRasterRows(turned ? Reversed(source) : source, destination, quality);
+    return ConvertRows(turned ? Reversed(source) : source, destination, chain);
 }
 
 PK_Result Convert(const SourceImage& source, const DestinationImage& destination, int32_t quality);
 
 PK_Result ConvertToStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
     if (source.width < 0 || source.height < 0) return PK_ErrFailed;
-    if (source.pixels == nullptr || destination.pixels == nullptr) return PK_ErrFailed;
+    if (HasNull({source.pixels, destination.pixels})) return PK_ErrFailed;
 
     PK_PixelFormat format = PK_PixelFormat_Invalid;
     const PK_Result chosen = ChooseEncodeSource(source.format, destination.format, quality, format);
@@ -60,7 +74,7 @@ PK_Result ConvertRaster(const SourceImage& source, const DestinationImage& desti
 
 PK_Result ConvertFromStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
     if (source.width < 0) return PK_ErrFailed;
-    if (source.pixels == nullptr || destination.pixels == nullptr) return PK_ErrFailed;
+    if (HasNull({source.pixels, destination.pixels})) return PK_ErrFailed;
 
     // A stream without a target of its own keeps what is wanted here, and is refused by DecodeStream.
     const DecodeTarget wanted = {destination.format, source.width, source.height};

@@ -1,6 +1,7 @@
 #include "convert/CopySameFormat.h"
 
 #include "convert/RasterFormats.h"
+#include "frame/Arguments.h"
 #include "primitives/CopyImage.h"
 
 #include <PixelKiln/Buffers.h>
@@ -19,9 +20,9 @@ Byte* LowestRow(const Image<Byte>& image) {
 
 PK_Result CopyRaster(const SourceImage& source, const DestinationImage& destination) {
     if (!IsRasterFormat(source.format)) return PK_ErrBadSrcFormat;
-    if (source.height < 1 || source.width == 0) return PK_Success;
-    if (source.width < 0 || source.width > kMaximumWidth) return PK_ErrFailed;
-    if (source.pixels == nullptr || destination.pixels == nullptr) return PK_ErrFailed;
+    if (const auto result =
+            ResultWithoutWork(source.width, source.height, {source.pixels, destination.pixels}))
+        return *result;
 
     const int32_t rowLength = PK_PixelFormatPackedRowBytes(source.format, source.width);
     if (source.rowBytes == destination.rowBytes && std::abs(source.rowBytes) == rowLength) {

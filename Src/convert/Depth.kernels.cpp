@@ -1,8 +1,8 @@
 // Changes of sample depth between bytes, 15-bit words and floats.
 
 #include "convert/ConversionKernels.h"
-#include "convert/Samples.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/Samples.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -12,7 +12,7 @@ namespace {
 
 struct RGBSamples {
     static constexpr int kUnitPixels = 1;
-    static F32 Expand(F32 codes) { return codes * Floats(kReciprocal255); }
+    static F32 Expand(F32 codes) { return ExpandBGRA(codes); }
     static F32 Scale(F32 values) { return Floats(255) * values; }
 };
 

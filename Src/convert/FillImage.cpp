@@ -1,8 +1,8 @@
 #include "convert/FillImage.h"
 
+#include "frame/Arguments.h"
+#include "frame/Planes.h"
 #include "primitives/FillPixels.h"
-
-#include <PixelKiln/Buffers.h>
 
 #include <cstring>
 
@@ -11,9 +11,9 @@ namespace PK {
 namespace {
 
 /// A row of a plane is filled bytewise.
-void FillPlane(void* plane, ptrdiff_t rowBytes, int32_t width, int32_t height, uint8_t code) {
-    for (ptrdiff_t row = 0; row < height; ++row)
-        std::memset(static_cast<uint8_t*>(plane) + row * rowBytes, code, static_cast<size_t>(width));
+void FillPlane(const Plane<uint8_t>& plane, uint8_t code) {
+    for (int32_t row = 0; row < plane.height; ++row)
+        std::memset(plane.Row(row), code, static_cast<size_t>(plane.width));
 }
 
 /// The planes of larger images have no offsets in 32 bits.
@@ -33,7 +33,7 @@ int32_t FillWith(Fill fill, const DestinationImage& image, const FillUnit& unit,
 FillUnit EmptyFillUnit(PK_PixelFormat format) noexcept {
     const int32_t pixels = Is422(format) ? 2 : 1;
     const bool hasUnit = IsPacked4444(format) || Is422(format);
-    switch (format & kDepthMask) {
+    switch (DepthOf(format)) {
     case kDepth8u:
         return {{}, hasUnit ? 4 : 0, pixels};
     case kDepth15u:
@@ -57,9 +57,8 @@ FillUnit V210FillUnit(YUVCodes codes) noexcept {
 }
 
 PK_Result FillWithUnits(const DestinationImage& image, const FillUnit& unit, int32_t units) noexcept {
-    if (image.width < 0 || image.height < 0) return PK_ErrFailed;
-    if (image.width == 0 || image.height == 0) return PK_Success;
-    if (image.width > kMaximumWidth) return PK_ErrFailed;
+    if (const auto result = ResultWithoutWork(image.width, image.height, {image.pixels}, BelowZero::Refused))
+        return *result;
     int32_t status = 0;
     if (unit.size == 4)
         status = FillWith<uint8_t>(FillPixels4x8u, image, unit, units);
@@ -71,17 +70,12 @@ PK_Result FillWithUnits(const DestinationImage& image, const FillUnit& unit, int
 }
 
 PK_Result FillPlanes(const DestinationImage& image, YUVCodes codes) noexcept {
-    if (image.width < 0 || image.height < 0) return PK_ErrFailed;
-    if (image.width == 0 || image.height == 0) return PK_Success;
+    if (const auto result = ResultOfSize(image.width, image.height, BelowZero::Refused)) return *result;
     if (image.pixels == nullptr || !HavePlanesOffsets(image.width, image.height)) return PK_ErrFailed;
-    void* planes[3];
-    int32_t rowBytes[3];
-    const PK_Result result =
-        PK_GetPlanarBuffers(image.pixels, image.format, image.width, image.height, planes, rowBytes);
-    if (result != PK_Success) return result;
-    FillPlane(planes[0], rowBytes[0], image.width, image.height, codes.y);
-    FillPlane(planes[1], rowBytes[1], image.width / 2, image.height / 2, codes.u);
-    FillPlane(planes[2], rowBytes[2], image.width / 2, image.height / 2, codes.v);
+    const auto [y, u, v] = PlanesInBlock(image.pixels, image.format, image.width, image.height);
+    FillPlane(y, codes.y);
+    FillPlane(u, codes.u);
+    FillPlane(v, codes.v);
     return PK_Success;
 }
 

@@ -2,6 +2,7 @@
 
 #include "convert/FillImage.h"
 #include "convert/RasterFormats.h"
+#include "frame/Arguments.h"
 
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Fills.h>
@@ -46,10 +47,10 @@ PK_Result FillUnits(const DestinationImage& image, const ColourPair& colour) {
 }
 
 PK_Result FillPlanar(const DestinationImage& image, const ColourPair& colour) {
-    const bool is601 = (image.format & kMatrixMask) == kMatrix601;
+    const PK_PixelFormat pixelFormat =
+        IsMatrix601(image.format) ? PK_PixelFormat_VUYP_4444_8u : PK_PixelFormat_VUYP_4444_8u_709;
     YUVCodes codes;
-    const PK_Result result =
-        CodesOf(colour, is601 ? PK_PixelFormat_VUYP_4444_8u : PK_PixelFormat_VUYP_4444_8u_709, codes);
+    const PK_Result result = CodesOf(colour, pixelFormat, codes);
     return result == PK_Success ? FillPlanes(image, codes) : result;
 }
 
@@ -89,9 +90,9 @@ PK_Result PK_FillWithColor(void* buffer, int32_t rowBytes, int32_t width, int32_
                            PK_PixelFormat format, const void* pixel, PK_PixelFormat pixelFormat) noexcept {
     if (!CanBeFilled(format)) return PK_ErrBadDstFormat;
     if (!HasPixel(pixelFormat)) return PK_ErrBadSrcFormat;
-    if (width < 0 || height < 0) return PK_ErrFailed;
-    if (width == 0 || height == 0) return IsV210(format) ? PK_ErrBadDstFormat : PK_Success;
-    if (buffer == nullptr || pixel == nullptr) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Refused))
+        return *result == PK_Success && IsV210(format) ? PK_ErrBadDstFormat : *result;
+    if (HasNull({buffer, pixel})) return PK_ErrFailed;
 
     const DestinationImage image = {static_cast<uint8_t*>(buffer), rowBytes, format, width, height};
     const ColourPair colour(pixel, pixelFormat);

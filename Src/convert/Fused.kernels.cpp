@@ -1,9 +1,9 @@
 // Kernels that always go together, as one pass over the row with the numbers of the single ones.
 
-#include "convert/ByteScale.h"
 #include "convert/ColourMatrices.h"
 #include "convert/ConversionKernels.h"
 #include "convert/DownsampleRow.h"
+#include "primitives/lanes/ByteScale.h"
 
 namespace PK::PK_TARGET {
 namespace {
@@ -30,11 +30,11 @@ struct StraightRGB {
         OpaqueRGB<kMatrix>::Load(source, first, second);
         const I32 firstAlpha = ShiftRight<24>(LoadInts(source));
         const I32 secondAlpha = ShiftRight<24>(LoadInts(source + 4 * kLanes));
-        first.chroma = ScaleHalves(first.chroma, InBothHalves(firstAlpha), ChromaZero());
-        second.chroma = ScaleHalves(second.chroma, InBothHalves(secondAlpha), ChromaZero());
+        first.chroma = ScaleHalves<kChromaZeros>(first.chroma, InBothHalves(firstAlpha));
+        second.chroma = ScaleHalves<kChromaZeros>(second.chroma, InBothHalves(secondAlpha));
 
         const I32 alphas = firstAlpha | ShiftLeft<16>(secondAlpha);
-        const I32 lumas = ScaleHalves(first.luma | ShiftLeft<16>(second.luma), alphas, LumaZero());
+        const I32 lumas = ScaleHalves<kLumaZeros>(first.luma | ShiftLeft<16>(second.luma), alphas);
         first.luma = lumas & Ints(0xffff);
         second.luma = ShiftRight<16>(lumas);
     }

@@ -3,8 +3,8 @@
 
 #include "convert/BridgeKernels.h"
 #include "convert/ColourMatrices.h"
-#include "convert/SampleTriples.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/SampleTriples.h"
 #include "primitives/simd/Power.h"
 
 namespace PK::PK_TARGET {

@@ -15,7 +15,7 @@ struct DepthMembers {
 };
 
 Kernel AtDepth(PK_PixelFormat format, const DepthMembers& members) {
-    switch (format & kDepthMask) {
+    switch (DepthOf(format)) {
     case kDepth8u:
         return members.at8u;
     case kDepth15u:
@@ -30,15 +30,15 @@ Kernel AtDepth(PK_PixelFormat format, const DepthMembers& members) {
 /// For the four-channel layouts: alpha at the end of a pixel, or at its beginning.
 Kernel AtDepthInOrder(PK_PixelFormat format, const DepthMembers& alphaLast, const DepthMembers& alphaFirst) {
     if (!IsPacked4444(format)) return None;
-    return AtDepth(format, (format & kOrderMask) == kOrderBGRA ? alphaLast : alphaFirst);
+    return AtDepth(format, IsOrderReversed(format) ? alphaFirst : alphaLast);
 }
 
 Kernel In422Order(PK_PixelFormat format, Kernel uyvy, Kernel yuyv) {
-    return (format & kOrderMask) == kOrderBGRA ? uyvy : yuyv;
+    return IsOrderReversed(format) ? yuyv : uyvy;
 }
 
 Kernel InMatrix(PK_PixelFormat format, Kernel matrix601, Kernel matrix709) {
-    return (format & kMatrixMask) == kMatrix601 ? matrix601 : matrix709;
+    return IsMatrix601(format) ? matrix601 : matrix709;
 }
 
 } // namespace

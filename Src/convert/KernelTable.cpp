@@ -59,7 +59,7 @@ struct ConversionRow {
 };
 
 consteval Samples SamplesOf(PK_PixelFormat format) {
-    switch (format & kDepthMask) {
+    switch (DepthOf(format)) {
     case kDepth8u:
         return Samples::Bytes;
     case kDepth15u:
@@ -72,9 +72,8 @@ consteval Samples SamplesOf(PK_PixelFormat format) {
 }
 
 consteval Operand PixelsOf(PK_PixelFormat format) {
-    const RowLayout layout = LayoutOfRow(format);
-    const int32_t unit = Is422(format) && !IsV210(format) ? 2 : layout.groupPixels;
-    return {SamplesOf(format), unit * layout.groupBytes / layout.groupPixels, unit, format};
+    const RowUnit unit = UnitOfRow(format);
+    return {SamplesOf(format), unit.bytes, unit.pixels, format};
 }
 
 template <auto kMember>

@@ -35,7 +35,7 @@ constexpr Levels<float> kLevels32f = {0, 1, 0, 0, 1};
 /// One unit of four samples: a pixel in memory order, or a pair of pixels.
 template <class Sample>
 void SetSamples(FillUnit& unit, PK_PixelFormat format, Colour colour, const Levels<Sample>& levels) {
-    const bool isWhite = colour.shade == Shade::White, isReversed = (format & kOrderMask) == kOrderARGB;
+    const bool isWhite = colour.shade == Shade::White;
     const Sample luma = isWhite ? levels.white : levels.black;
     const Sample light = isWhite ? levels.full : levels.zero;
     const Sample alpha = colour.isOpaque ? levels.full : levels.zero;
@@ -43,7 +43,7 @@ void SetSamples(FillUnit& unit, PK_PixelFormat format, Colour colour, const Leve
     Sample yuv[4] = {levels.chroma, levels.chroma, luma, alpha};
     Sample rgb[4] = {light, light, light, alpha};
     Sample* samples = Is422(format) ? pair : IsYUV(format) ? yuv : rgb;
-    if (isReversed) std::reverse(samples, samples + 4);
+    if (IsOrderReversed(format)) std::reverse(samples, samples + 4);
     std::memcpy(unit.bytes, samples, 4 * sizeof(Sample));
 }
 
@@ -82,7 +82,7 @@ PK_Result FillStream(const DestinationImage& image, Colour colour) {
 PK_Result Fill(const DestinationImage& image, Colour colour) {
     if (!colour.isOpaque) {
         if (HasNoAlphaMeaning(image.format)) return PK_ErrBadDstFormat;
-        const bool isPremultiplied = (image.format & kAlphaMask) == kAlphaPremultiplied;
+        const bool isPremultiplied = AlphaOf(image.format) == kAlphaPremultiplied;
         if (isPremultiplied) colour.shade = Shade::Black; // what is transparent has no colour then
     }
     return IsStream(image.format) ? FillStream(image, colour) : FillRaster(image, colour);

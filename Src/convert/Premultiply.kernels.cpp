@@ -1,149 +1,112 @@
 // Premultiplication by alpha and its inverse, and the two kernels that expand to float on the way.
 
-#include "convert/ByteScale.h"
 #include "convert/ConversionKernels.h"
-#include "convert/Samples.h"
+#include "primitives/Thresholds.h"
+#include "primitives/lanes/ByteScale.h"
+#include "primitives/lanes/PixelLanes.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/Samples.h"
 
 namespace PK::PK_TARGET {
 namespace {
 
-struct PremultiplyBGRA8 : PixelGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const I32 pixels = LoadInts(source);
-        const I32 colour = ScaleBytes(pixels, ShiftRight<24>(pixels));
-        Store(destination, Select(Ints(0x00ffffff), colour, pixels));
+using enum AlphaPlace;
+
+// A depth tells how its pixels are loaded and stored as vectors, and what they become by their alpha: Scaled times it,
+// Unscaled divided by it. A host may have unmasked floating-point exceptions, and alpha 0 is ordinary: so nothing here
+// divides by it.
+
+/// The zeros of chroma and luma, which are scaled about.
+struct Zeros {
+    int32_t chroma, luma;
+};
+constexpr Zeros kRGB = {0, 0}, kVUY = {128, 16};
+
+template <AlphaPlace kAlpha, Zeros kZeros>
+struct Pixels8u : PixelGroup<4, 4> {
+    static I32 Load(const uint8_t* source) { return LoadInts(source); }
+    static void Put(uint8_t* destination, I32 pixels) { Store(destination, pixels); }
+
+    static I32 Scaled(I32 pixels) {
+        const I32 alpha = kAlpha == last ? ShiftRight<24>(pixels) : pixels & Ints(0xff);
+        const I32 colour = ScaleBytes<kZeros.chroma | kZeros.luma << 16, kZeros.chroma>(pixels, alpha);
+        return Select(Ints(kAlpha == last ? -0x1000000 : 0xff), pixels, colour);
+    }
+
+    /// nearest((c - zero) x (255 / a) + zero), clamped by the pack; a pixel of alpha 0 becomes all zeros.
+    static I32 Unscaled(I32 pixels) {
+        const IntChannels c = InOrder<kAlpha>(ByteChannels(pixels));
+        const F32 factor = Floats(255) / Max(ToFloat(c.c3), Floats(1));
+        const I32 result =
+            PackByteChannels(Moved<kZeros.chroma>(c.c0, factor), Moved<kZeros.chroma>(c.c1, factor),
+                             Moved<kZeros.luma>(c.c2, factor), c.c3);
+        return (kAlpha == last ? result : ReverseBytes(result)) & Not(Equal(c.c3, Ints(0)));
+    }
+
+    template <int32_t kZero>
+    static I32 Moved(I32 code, F32 factor) {
+        return Nearest((ToFloat(code) - Floats(kZero)) * factor + Floats(kZero));
     }
 };
 
-struct PremultiplyARGB8 : PixelGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const I32 pixels = LoadInts(source);
-        const I32 colour = ScaleBytes(pixels, pixels & Ints(0xff));
-        Store(destination, Select(Ints(0xff), pixels, colour));
+template <AlphaPlace kAlpha>
+struct Pixels15u : SampleGroup<2, 2> {
+    static I32 Load(const uint8_t* source) { return LoadWords(source); }
+    static void Put(uint8_t* destination, I32 samples) { StoreWords(destination, samples); }
+
+    static I32 Times(I32 samples, F32 factor) { return Min(Nearest(ToFloat(samples) * factor), Ints(32768)); }
+
+    static I32 Scaled(I32 samples) {
+        const F32 alpha = BroadcastAlpha<kAlpha>(ToFloat(samples));
+        return Select(AlphaLanes<kAlpha>(), samples, Times(samples, alpha * Floats(0x1p-15f)));
+    }
+
+    /// Alpha 0 clears the colour; otherwise nearest(c x (32768 / a)), limited to full scale.
+    static I32 Unscaled(I32 samples) {
+        const F32 alpha = BroadcastAlpha<kAlpha>(ToFloat(samples));
+        const I32 colour = Times(samples, Floats(32768) / Max(alpha, Floats(1)));
+        return Select(AlphaLanes<kAlpha>(), samples, colour & Less(Floats(0), alpha));
     }
 };
 
-/// Chroma is scaled about 128 and luma about 16.
-struct PremultiplyVUYA8 : PixelGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const I32 pixels = LoadInts(source);
-        const I32 low = Ints(0x00ff00ff);
-        const I32 alpha = InBothHalves(ShiftRight<24>(pixels));
-        const I32 vAndY = ScaleHalves(pixels & low, alpha, Ints(0x00100080));
-        const I32 u = ScaleHalves(ShiftRight<8>(pixels) & low, alpha, ChromaZero());
-        Store(destination, Select(Ints(0x00ffffff), vAndY | ShiftLeft<8>(u), pixels));
+template <AlphaPlace kAlpha>
+struct Pixels32 : SampleGroup<4, 4> {
+    static F32 Load(const uint8_t* source) { return LoadFloats(source); }
+    static void Put(uint8_t* destination, F32 samples) { Store(destination, samples); }
+
+    static F32 Scaled(F32 samples) {
+        return Select(AlphaLanes<kAlpha>(), samples, samples * BroadcastAlpha<kAlpha>(samples));
     }
-};
 
-/// The alpha of each interleaved pixel in all four of its lanes.
-template <bool kAlphaFirst>
-inline F32 BroadcastAlpha(F32 pixels) {
-    if constexpr (kAlphaFirst)
-        return ShufflePixel<0, 0, 0, 0>(pixels);
-    else
-        return ShufflePixel<3, 3, 3, 3>(pixels);
-}
-
-template <bool kAlphaFirst>
-inline I32 AlphaMask() {
-    return kAlphaFirst ? PixelInts(-1, 0, 0, 0) : PixelInts(0, 0, 0, -1);
-}
-
-template <bool kAlphaFirst>
-struct Premultiply15u : SampleGroup<2, 2> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const I32 samples = LoadWords(source);
-        const F32 values = ToFloat(samples);
-        const F32 factor = BroadcastAlpha<kAlphaFirst>(values) * Floats(3.0517578e-05f); // 1 / 32768
-        const I32 scaled = Min(Nearest(values * factor), Ints(32768));
-        StoreWords(destination, Select(AlphaMask<kAlphaFirst>(), samples, scaled));
-    }
-};
-
-template <bool kAlphaFirst>
-struct Premultiply32f : SampleGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const F32 pixels = LoadFloats(source);
-        const F32 scaled = pixels * BroadcastAlpha<kAlphaFirst>(pixels);
-        Store(destination, Select(AlphaMask<kAlphaFirst>(), pixels, scaled));
-    }
-};
-
-// A host may have unmasked floating-point exceptions, and alpha 0 is ordinary: so nothing here divides by it.
-
-/// nearest((c - zero) x (255 / a) + zero), clamped by the pack; a pixel of alpha 0 becomes all zeros.
-inline I32 UnpremultiplyChannel(I32 channel, F32 factor, float zero) {
-    return Nearest((ToFloat(channel) - Floats(zero)) * factor + Floats(zero));
-}
-
-inline I32 Unpremultiply(IntChannels pixel, float chromaZero, float lumaZero) {
-    const F32 factor = Floats(255) / Max(ToFloat(pixel.c3), Floats(1));
-    const I32 result = PackByteChannels(UnpremultiplyChannel(pixel.c0, factor, chromaZero),
-                                        UnpremultiplyChannel(pixel.c1, factor, chromaZero),
-                                        UnpremultiplyChannel(pixel.c2, factor, lumaZero), pixel.c3);
-    return result & Not(Equal(pixel.c3, Ints(0)));
-}
-
-struct UnpremultiplyBGRA8 : PixelGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        Store(destination, Unpremultiply(LoadByteChannels(source), 0, 0));
-    }
-};
-
-struct UnpremultiplyARGB8 : PixelGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const IntChannels argb = LoadByteChannels(source);
-        Store(destination, ReverseBytes(Unpremultiply({argb.c3, argb.c2, argb.c1, argb.c0}, 0, 0)));
-    }
-};
-
-struct UnpremultiplyVUYA8 : PixelGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        Store(destination, Unpremultiply(LoadByteChannels(source), 128, 16));
-    }
-};
-
-/// Alpha 0 clears the colour; otherwise nearest(c x (32768 / a)), limited to full scale.
-template <bool kAlphaFirst>
-struct Unpremultiply15u : SampleGroup<2, 2> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const I32 samples = LoadWords(source);
-        const F32 values = ToFloat(samples);
-        const F32 alpha = BroadcastAlpha<kAlphaFirst>(values);
-        const F32 factor = Floats(32768) / Max(alpha, Floats(1));
-        const I32 scaled = Min(Nearest(values * factor), Ints(32768));
-        const I32 colour = scaled & Less(Floats(0), alpha);
-        StoreWords(destination, Select(AlphaMask<kAlphaFirst>(), samples, colour));
-    }
-};
-
-/// c x the processor's reciprocal estimate of alpha, unrefined; below 8e-6 alpha counts as 0.
-template <bool kAlphaFirst>
-struct Unpremultiply32f : SampleGroup<4, 4> {
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        const F32 pixels = LoadFloats(source);
-        const F32 alpha = BroadcastAlpha<kAlphaFirst>(pixels);
-        const F32 least = Floats(8e-6f);
+    /// c x the processor's reciprocal estimate of alpha, unrefined; below 8e-6 alpha counts as 0.
+    static F32 Unscaled(F32 samples) {
+        const F32 alpha = BroadcastAlpha<kAlpha>(samples);
+        const F32 least = Floats(kNegligible);
         const F32 factor = ReciprocalEstimate(Max(least, alpha)); // NaN stays
-        const F32 scaled = Select(AlphaMask<kAlphaFirst>(), pixels, pixels * factor);
-        Store(destination, Select(Less(alpha, least), Floats(0), scaled));
+        const F32 result = Select(AlphaLanes<kAlpha>(), samples, samples * factor);
+        return Select(Less(alpha, least), Floats(0), result);
     }
 };
 
-struct ExpandPremultipliedBGRA8 : SampleGroup<1, 4> {
+/// Bytes that become floats before they are scaled.
+template <F32 (*kExpand)(F32)>
+struct BytesTo32f : SampleGroup<1, 4> {
+    static F32 Load(const uint8_t* source) { return kExpand(LoadBytesAsFloats(source)); }
+    static void Put(uint8_t* destination, F32 samples) { Store(destination, samples); }
+    static F32 Scaled(F32 samples) { return Pixels32<last>::Scaled(samples); }
+};
+
+template <class Pixels>
+struct Premultiply : Pixels {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        const F32 pixels = LoadBytesAsFloats(source) * Floats(kReciprocal255);
-        const F32 scaled = pixels * BroadcastAlpha<false>(pixels);
-        Store(destination, Select(AlphaMask<false>(), pixels, scaled));
+        Pixels::Put(destination, Pixels::Scaled(Pixels::Load(source)));
     }
 };
 
-struct ExpandPremultipliedVUYA8 : SampleGroup<1, 4> {
+template <class Pixels>
+struct Unpremultiply : Pixels {
     static void Group(const uint8_t* source, uint8_t* destination) {
-        const F32 pixels = ExpandVUYA(LoadBytesAsFloats(source));
-        const F32 scaled = pixels * BroadcastAlpha<false>(pixels);
-        Store(destination, Select(AlphaMask<false>(), pixels, scaled));
+        Pixels::Put(destination, Pixels::Unscaled(Pixels::Load(source)));
     }
 };
 
@@ -154,22 +117,22 @@ template <>
 const PK::PremultiplyKernels& PK::PremultiplyKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
     static constexpr PremultiplyKernels kernels = {
-        .PremultiplyRow_BGRA_8u = Row<PremultiplyBGRA8>,
-        .PremultiplyRow_ARGB_8u = Row<PremultiplyARGB8>,
-        .PremultiplyRow_VUYA_8u = Row<PremultiplyVUYA8>,
-        .PremultiplyRow_BGRA_15u = Row<Premultiply15u<false>>,
-        .PremultiplyRow_ARGB_15u = Row<Premultiply15u<true>>,
-        .PremultiplyRow_BGRA_32f = Row<Premultiply32f<false>>,
-        .PremultiplyRow_ARGB_32f = Row<Premultiply32f<true>>,
-        .UnpremultiplyRow_BGRA_8u = Row<UnpremultiplyBGRA8>,
-        .UnpremultiplyRow_ARGB_8u = Row<UnpremultiplyARGB8>,
-        .UnpremultiplyRow_VUYA_8u = Row<UnpremultiplyVUYA8>,
-        .UnpremultiplyRow_BGRA_15u = Row<Unpremultiply15u<false>>,
-        .UnpremultiplyRow_ARGB_15u = Row<Unpremultiply15u<true>>,
-        .UnpremultiplyRow_BGRA_32f = Row<Unpremultiply32f<false>>,
-        .UnpremultiplyRow_ARGB_32f = Row<Unpremultiply32f<true>>,
-        .BGRA8uToBGRP32fRow = Row<ExpandPremultipliedBGRA8>,
-        .VUYA8uToVUYP32fRow = Row<ExpandPremultipliedVUYA8>,
+        .PremultiplyRow_BGRA_8u = Row<Premultiply<Pixels8u<last, kRGB>>>,
+        .PremultiplyRow_ARGB_8u = Row<Premultiply<Pixels8u<first, kRGB>>>,
+        .PremultiplyRow_VUYA_8u = Row<Premultiply<Pixels8u<last, kVUY>>>,
+        .PremultiplyRow_BGRA_15u = Row<Premultiply<Pixels15u<last>>>,
+        .PremultiplyRow_ARGB_15u = Row<Premultiply<Pixels15u<first>>>,
+        .PremultiplyRow_BGRA_32f = Row<Premultiply<Pixels32<last>>>,
+        .PremultiplyRow_ARGB_32f = Row<Premultiply<Pixels32<first>>>,
+        .UnpremultiplyRow_BGRA_8u = Row<Unpremultiply<Pixels8u<last, kRGB>>>,
+        .UnpremultiplyRow_ARGB_8u = Row<Unpremultiply<Pixels8u<first, kRGB>>>,
+        .UnpremultiplyRow_VUYA_8u = Row<Unpremultiply<Pixels8u<last, kVUY>>>,
+        .UnpremultiplyRow_BGRA_15u = Row<Unpremultiply<Pixels15u<last>>>,
+        .UnpremultiplyRow_ARGB_15u = Row<Unpremultiply<Pixels15u<first>>>,
+        .UnpremultiplyRow_BGRA_32f = Row<Unpremultiply<Pixels32<last>>>,
+        .UnpremultiplyRow_ARGB_32f = Row<Unpremultiply<Pixels32<first>>>,
+        .BGRA8uToBGRP32fRow = Row<Premultiply<BytesTo32f<ExpandBGRA>>>,
+        .VUYA8uToVUYP32fRow = Row<Premultiply<BytesTo32f<ExpandVUYA>>>,
     };
     return kernels;
 }

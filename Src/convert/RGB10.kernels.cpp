@@ -3,8 +3,8 @@
 // lower and one in the upper 16-bit half of each lane.
 
 #include "convert/ConversionKernels.h"
-#include "convert/Samples.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/Samples.h"
 
 namespace PK::PK_TARGET {
 namespace {

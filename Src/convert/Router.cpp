@@ -35,48 +35,6 @@ using MaybeAnswer = std::optional<Answer>;
 
 constexpr MaybeAnswer kDoesNotApply = std::nullopt;
 
-constexpr uint32_t Model(PK_PixelFormat format) {
-    return format & kModelMask;
-}
-constexpr uint32_t Alpha(PK_PixelFormat format) {
-    return format & kAlphaMask;
-}
-constexpr uint32_t Structure(PK_PixelFormat format) {
-    return format & kStructureMask;
-}
-constexpr uint32_t Depth(PK_PixelFormat format) {
-    return format & kDepthMask;
-}
-constexpr uint32_t Order(PK_PixelFormat format) {
-    return format & kOrderMask;
-}
-constexpr bool IsMatrix601(PK_PixelFormat format) {
-    return (format & kMatrixMask) == kMatrix601;
-}
-constexpr bool IsLinear(PK_PixelFormat format) {
-    return (format & kLightMask) == kLightLinear;
-}
-
-/// The format with the field under the mask replaced.
-constexpr PK_PixelFormat With(PK_PixelFormat format, uint32_t mask, uint32_t bits) {
-    return (format & ~mask) | bits;
-}
-constexpr PK_PixelFormat WithAlpha(PK_PixelFormat format, uint32_t alpha) {
-    return With(format, kAlphaMask, alpha);
-}
-constexpr PK_PixelFormat WithDepth(PK_PixelFormat format, uint32_t depth) {
-    return With(format, kDepthMask, depth);
-}
-constexpr PK_PixelFormat WithOrder(PK_PixelFormat format, uint32_t order) {
-    return With(format, kOrderMask, order);
-}
-
-/// All that tells a colour coding: fields to clear on the way to RGB and to set on the way back.
-constexpr uint32_t kCodingMask = kModelMask | kMatrixMask | kRangeMask;
-constexpr uint32_t kCodingRGB = kModelRGB;
-constexpr uint32_t kCodingYUV601 = kModelYUV | kMatrix601 | kRangeVideo;
-constexpr uint32_t kCodingYUV709 = kModelYUV | kMatrix709 | kRangeVideo;
-
 constexpr bool SameButAlpha(const Question& q) {
     return WithAlpha(q.S, 0) == WithAlpha(q.D, 0);
 }
@@ -105,43 +63,43 @@ MaybeAnswer Copy(const Question& q) {
 /// A premultiplied source keeps its colour and loses its alpha: it is not unpremultiplied on this way.
 MaybeAnswer ForceOpaque(const Question& q) {
     if (!SameButAlpha(q)) return kDoesNotApply;
-    const bool dropsAlpha = Alpha(q.S) == kAlphaPremultiplied && HasNoAlphaMeaning(q.D);
+    const bool dropsAlpha = AlphaOf(q.S) == kAlphaPremultiplied && HasNoAlphaMeaning(q.D);
     if (!dropsAlpha && !HasNoAlphaMeaning(q.S)) return kDoesNotApply;
     return Answer{ForceOpaqueMember(q.S), q.D};
 }
 
 MaybeAnswer Unpremultiply(const Question& q) {
-    if (Alpha(q.S) != kAlphaPremultiplied || Alpha(q.D) != kAlphaStraight) return kDoesNotApply;
+    if (AlphaOf(q.S) != kAlphaPremultiplied || AlphaOf(q.D) != kAlphaStraight) return kDoesNotApply;
     if (!IsPacked4444(q.S) || !SameButAlpha(q)) return kDoesNotApply;
     return Answer{UnpremultiplyMember(q.S), q.D};
 }
 
 /// Losing straight alpha goes over black: by way of the premultiplied form.
 MaybeAnswer Premultiply(const Question& q) {
-    if (Alpha(q.S) != kAlphaStraight || Alpha(q.D) == kAlphaStraight) return kDoesNotApply;
+    if (AlphaOf(q.S) != kAlphaStraight || AlphaOf(q.D) == kAlphaStraight) return kDoesNotApply;
     if (!IsPacked4444(q.S) || !SameButAlpha(q)) return kDoesNotApply;
     return Answer{PremultiplyMember(q.S), WithAlpha(q.D, kAlphaPremultiplied)};
 }
 
 MaybeAnswer ExpandTo32f(const Question& q) {
     if (q.D != WithDepth(q.S, kDepth32f)) return kDoesNotApply;
-    if (Depth(q.S) != kDepth8u && Depth(q.S) != kDepth15u) return kDoesNotApply;
+    if (DepthOf(q.S) != kDepth8u && DepthOf(q.S) != kDepth15u) return kDoesNotApply;
     return Answer{ExpandTo32fMember(q.S), q.D};
 }
 
 MaybeAnswer PackFrom32f(const Question& q) {
     if (q.S != WithDepth(q.D, kDepth32f)) return kDoesNotApply;
-    if (Depth(q.D) != kDepth8u && Depth(q.D) != kDepth15u) return kDoesNotApply;
+    if (DepthOf(q.D) != kDepth8u && DepthOf(q.D) != kDepth15u) return kDoesNotApply;
     return Answer{PackFrom32fMember(q.D), q.D};
 }
 
 MaybeAnswer Expand8uTo15u(const Question& q) {
-    if (Depth(q.S) != kDepth8u || q.D != WithDepth(q.S, kDepth15u)) return kDoesNotApply;
+    if (DepthOf(q.S) != kDepth8u || q.D != WithDepth(q.S, kDepth15u)) return kDoesNotApply;
     return Answer{Expand8uTo15uRow, q.D};
 }
 
 MaybeAnswer Pack15uTo8u(const Question& q) {
-    if (Depth(q.D) != kDepth8u || q.S != WithDepth(q.D, kDepth15u)) return kDoesNotApply;
+    if (DepthOf(q.D) != kDepth8u || q.S != WithDepth(q.D, kDepth15u)) return kDoesNotApply;
     return Answer{Pack15uTo8uRow, q.D};
 }
 
@@ -149,15 +107,15 @@ MaybeAnswer Pack15uTo8u(const Question& q) {
 MaybeAnswer SwapOrder(const Question& q) {
     constexpr uint32_t mask = kAlphaMask | kOrderMask;
     if (With(q.S, mask, 0) != With(q.D, mask, 0)) return kDoesNotApply;
-    return Answer{SwapOrderMember(q.S), WithOrder(q.S, Order(q.D))};
+    return Answer{SwapOrderMember(q.S), WithOrder(q.S, OrderOf(q.D))};
 }
 
 /// A source without alpha meets a destination with it: opaque from here on, and of the destination's kind.
 MaybeAnswer GainAlpha(const Question& q) {
-    if (Depth(q.S) != kDepth8u && Depth(q.S) != kDepth32f) return kDoesNotApply;
+    if (DepthOf(q.S) != kDepth8u && DepthOf(q.S) != kDepth32f) return kDoesNotApply;
     if (!IsPacked4444(q.S) || !HasNoAlphaMeaning(q.S)) return kDoesNotApply;
     if (!IsPacked4444(q.D) || HasNoAlphaMeaning(q.D)) return kDoesNotApply;
-    return Answer{ForceOpaqueMember(q.S), WithAlpha(q.S, Alpha(q.D))};
+    return Answer{ForceOpaqueMember(q.S), WithAlpha(q.S, AlphaOf(q.D))};
 }
 
 MaybeAnswer LookUp(const Question& q) {
@@ -169,15 +127,15 @@ MaybeAnswer LookUp(const Question& q) {
 // Fallback rules: towards the float formats with four channels, and from there.
 
 MaybeAnswer FallBackToFirstOrder(const Question& q) {
-    if (Order(q.S) == kOrderBGRA) return kDoesNotApply;
+    if (OrderOf(q.S) == kOrderBGRA) return kDoesNotApply;
     return Answer{SwapOrderMember(q.S), WithOrder(q.S, kOrderBGRA)};
 }
 
 MaybeAnswer FallBackTo8uMatrix(const Question& q) {
-    if (Depth(q.S) != kDepth8u || Depth(q.D) != kDepth8u) return kDoesNotApply;
-    if (Model(q.S) == Model(q.D) || Is422(q.S)) return kDoesNotApply;
-    if (IsYUV(q.S)) return Answer{YUVToRGBMember(q.S), Alpha(q.S)};
-    return Answer{RGBToYUVMember(q.D), Alpha(q.S) | (IsMatrix601(q.D) ? kCodingYUV601 : kCodingYUV709)};
+    if (DepthOf(q.S) != kDepth8u || DepthOf(q.D) != kDepth8u) return kDoesNotApply;
+    if (ModelOf(q.S) == ModelOf(q.D) || Is422(q.S)) return kDoesNotApply;
+    if (IsYUV(q.S)) return Answer{YUVToRGBMember(q.S), AlphaOf(q.S)};
+    return Answer{RGBToYUVMember(q.D), AlphaOf(q.S) | (IsMatrix601(q.D) ? kCodingYUV601 : kCodingYUV709)};
 }
 
 MaybeAnswer FallBackFromV210(const Question& q) {
@@ -194,16 +152,16 @@ MaybeAnswer FallBackToFourChannels(const Question& q) {
 }
 
 MaybeAnswer FallBackTo32f(const Question& q) {
-    if (Depth(q.S) == kDepth32f) return kDoesNotApply;
-    const bool needsFloat = Depth(q.D) == kDepth32f || !Alike(q) || Structure(q.S) != Structure(q.D) ||
-                            Alpha(q.S) != Alpha(q.D) || Order(q.S) != Order(q.D);
+    if (DepthOf(q.S) == kDepth32f) return kDoesNotApply;
+    const bool needsFloat = DepthOf(q.D) == kDepth32f || !Alike(q) || StructureOf(q.S) != StructureOf(q.D) ||
+                            AlphaOf(q.S) != AlphaOf(q.D) || OrderOf(q.S) != OrderOf(q.D);
     if (!needsFloat) return kDoesNotApply;
     return Answer{ExpandTo32fMember(q.S), WithDepth(q.S, kDepth32f)};
 }
 
 /// The transfer function is for straight or opaque colour only.
 Answer ChangeLight(PK_PixelFormat S) {
-    if (Alpha(S) == kAlphaPremultiplied) return {UnpremultiplyMember(S), WithAlpha(S, kAlphaStraight)};
+    if (AlphaOf(S) == kAlphaPremultiplied) return {UnpremultiplyMember(S), WithAlpha(S, kAlphaStraight)};
     if (IsLinear(S)) return {LinearToGammaRow, With(S, kLightMask, kLightGamma)};
     return {GammaToLinearRow, With(S, kLightMask, kLightLinear)};
 }
@@ -233,15 +191,15 @@ constexpr bool AlphaAgrees(uint32_t source, uint32_t destination) {
 }
 
 MaybeAnswer FallBackToAlphaKind(const Question& q) {
-    if (!Alike(q) || AlphaAgrees(Alpha(q.S), Alpha(q.D))) return kDoesNotApply;
-    if (Alpha(q.S) == kAlphaStraight) {
+    if (!Alike(q) || AlphaAgrees(AlphaOf(q.S), AlphaOf(q.D))) return kDoesNotApply;
+    if (AlphaOf(q.S) == kAlphaStraight) {
         return Answer{PremultiplyMember(q.S), WithAlpha(q.S, kAlphaPremultiplied)};
     }
-    if (Alpha(q.S) == kAlphaPremultiplied) {
+    if (AlphaOf(q.S) == kAlphaPremultiplied) {
         if (HasNoAlphaMeaning(q.D)) return Answer{ForceOpaqueMember(q.S), WithAlpha(q.S, kAlphaMeaningless)};
         return Answer{UnpremultiplyMember(q.S), WithAlpha(q.S, kAlphaStraight)};
     }
-    return Answer{ForceOpaqueMember(q.S), WithAlpha(q.S, Alpha(q.D))};
+    return Answer{ForceOpaqueMember(q.S), WithAlpha(q.S, AlphaOf(q.D))};
 }
 
 MaybeAnswer FallBackTo422(const Question& q) {
@@ -258,7 +216,7 @@ MaybeAnswer FallBackToV210(const Question& q) {
 /// Only the depth is left to change, and perhaps the order in a last step of its own.
 MaybeAnswer FallBackFrom32f(const Question& q) {
     if (!Alike(q)) return kDoesNotApply;
-    if (Depth(q.S) != kDepth32f || Depth(q.D) == kDepth32f) {
+    if (DepthOf(q.S) != kDepth32f || DepthOf(q.D) == kDepth32f) {
         return Answer{None, PK_PixelFormat_Invalid, PK_ErrBadDstFormat};
     }
     const PK_PixelFormat next = WithOrder(q.D, kOrderBGRA);

@@ -23,7 +23,7 @@ struct FormatTest {
 /// The alpha kind of a destination. One without a fourth channel counts as having one that tells nothing,
 /// since the formats on the way there have four.
 constexpr uint32_t FourChannelAlpha(PK_PixelFormat destination) {
-    const uint32_t alpha = destination & kAlphaMask;
+    const uint32_t alpha = AlphaOf(destination);
     return alpha != kAlphaNone ? alpha : kAlphaMeaningless;
 }
 

@@ -62,7 +62,7 @@ DecodeTarget ChooseDVTarget(const DVPicture& picture, const DecodeTarget& wanted
 PK_PixelFormat ChooseDV25Source(PK_PixelFormat source) {
     if (!IsYUV(source)) return PK_PixelFormat_BGRA_4444_8u;
     if (IsPacked4444(source)) return PK_PixelFormat_VUYA_4444_8u;
-    return (source & kOrderMask) == 0 ? PK_PixelFormat_UYVY_422_8u : PK_PixelFormat_YUYV_422_8u;
+    return IsOrderReversed(source) ? PK_PixelFormat_YUYV_422_8u : PK_PixelFormat_UYVY_422_8u;
 }
 
 PK_PixelFormat ChoosePlanarSource(PK_PixelFormat source, PK_PixelFormat stream) {

@@ -1,9 +1,9 @@
 // The transfer function between gamma-coded and linear light.
 
 #include "convert/ConversionKernels.h"
-#include "convert/Samples.h"
 #include "convert/TransferTables.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/Samples.h"
 #include "primitives/simd/Power.h"
 
 namespace PK::PK_TARGET {

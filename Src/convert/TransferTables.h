@@ -1,6 +1,6 @@
 #pragma once
 
-// The tables of the transfer function at 8 bits, computed at load. Kernel sources include this header.
+// The tables of the transfer function at 8 bits, which are data. Kernel sources include this header.
 
 #include <cstdint>
 

@@ -11,7 +11,7 @@
 namespace PK {
 namespace {
 
-constexpr int32_t kGroupPixels = 6, kGroupBytes = 16;
+constexpr int32_t kGroupPixels = kV210Unit.pixels, kGroupBytes = kV210Unit.bytes;
 constexpr size_t kPixelBytes = 4; // two words
 
 /// A last group that is not full, completed by black.

@@ -1,8 +1,8 @@
 // V210 and its samples unpacked, one 16-bit word each.
 
 #include "convert/BridgeKernels.h"
-#include "convert/SampleTriples.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/SampleTriples.h"
 
 namespace PK::PK_TARGET {
 namespace {

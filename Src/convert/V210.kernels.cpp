@@ -1,8 +1,8 @@
 // Ten-bit packed 4:2:2: six pixels in four words, three samples a word, in the order of UYVY.
 
-#include "convert/ChromaPairs.h"
 #include "convert/ColourMatrices.h"
 #include "convert/ConversionKernels.h"
+#include "primitives/lanes/ChromaPairs.h"
 
 namespace PK::PK_TARGET {
 namespace {

@@ -1,6 +1,7 @@
 // The bridges from three planes of 10-bit words.
 
 #include "convert/Bridges.h"
+#include "frame/Planes.h"
 #include "primitives/Dispatch.h"
 
 #include <PixelKiln/CodecBridges.h>
@@ -12,25 +13,16 @@
 namespace PK {
 namespace {
 
-constexpr int32_t kGroupPixels = 6, kGroupBytes = 16;
-
-struct Planes {
-    const void* const* first;
-    const int32_t* rowBytes;
-
-    const uint8_t* Row(int32_t plane, int32_t row) const {
-        return static_cast<const uint8_t*>(first[plane]) + ptrdiff_t{row} * rowBytes[plane];
-    }
-};
+constexpr int32_t kGroupPixels = kV210Unit.pixels, kGroupBytes = kV210Unit.bytes;
 
 /// Rows of Y, U and V; those of one row of the picture, or of two.
 struct RowsOfPlanes {
     const uint8_t* rows[6];
 
-    RowsOfPlanes(const Planes& planes, int32_t row, int32_t nextRow)
-        : rows{planes.Row(0, row),     planes.Row(1, row),     planes.Row(2, row),
-               planes.Row(0, nextRow), planes.Row(1, nextRow), planes.Row(2, nextRow)} {}
-    RowsOfPlanes(const Planes& planes, int32_t row) : RowsOfPlanes(planes, row, row) {}
+    RowsOfPlanes(const SourcePlanes& planes, int32_t row, int32_t nextRow)
+        : rows{planes[0].Row(row),     planes[1].Row(row),     planes[2].Row(row),
+               planes[0].Row(nextRow), planes[1].Row(nextRow), planes[2].Row(nextRow)} {}
+    RowsOfPlanes(const SourcePlanes& planes, int32_t row) : RowsOfPlanes(planes, row, row) {}
 };
 
 std::optional<PK_Result> ResultWithoutPlanes(const void* const planes[3], const int32_t planeRowBytes[3],
@@ -72,7 +64,7 @@ PK_Result PK_ConvertW210toV210(const void* const planes[3], const int32_t planeR
     using namespace PK;
     if (const auto result = ResultWithoutPlanes(planes, planeRowBytes, width, height, destination))
         return *result;
-    const Planes source = {planes, planeRowBytes};
+    const SourcePlanes source = PlanesOf<const uint8_t>(planes, planeRowBytes, width, height, Chroma::k422);
     const DestinationRows rows(destination, destinationRowBytes);
     const V210Row v210(width, 1, destinationRowBytes);
     const PlanesRow convert = Best<W210Kernels>().toV210;
@@ -88,7 +80,7 @@ PK_Result PK_TempConvertW210toV210ToReplacePanasonicLTDebayering(const void* con
     using namespace PK;
     if (const auto result = ResultWithoutPlanes(planes, planeRowBytes, width, height, destination))
         return *result;
-    const Planes source = {planes, planeRowBytes};
+    const SourcePlanes source = PlanesOf<const uint8_t>(planes, planeRowBytes, width, height, Chroma::k422);
     const DestinationRows evenRows(destination, ptrdiff_t{2} * destinationRowBytes);
     const DestinationRows oddRows(evenRows.first + destinationRowBytes, evenRows.rowBytes);
     const V210Row v210(width, 1, destinationRowBytes);
@@ -106,7 +98,7 @@ PK_Result PK_QuarterScaleConvertW210toV210(const void* const planes[3], const in
     using namespace PK;
     if (const auto result = ResultWithoutPlanes(planes, planeRowBytes, width, height, destination))
         return *result;
-    const Planes source = {planes, planeRowBytes};
+    const SourcePlanes source = PlanesOf<const uint8_t>(planes, planeRowBytes, width, height, Chroma::k422);
     const DestinationRows rows(destination, destinationRowBytes);
     const V210Row v210(width / 2, 2, destinationRowBytes);
     const PlanesRow convert = Best<W210Kernels>().quarterToV210;
@@ -120,7 +112,7 @@ PK_Result PK_ConvertW210toQuarterResVUYX_8u(const void* const planes[3], const i
     using namespace PK;
     if (const auto result = ResultWithoutPlanes(planes, planeRowBytes, width, height, destination))
         return *result;
-    const Planes source = {planes, planeRowBytes};
+    const SourcePlanes source = PlanesOf<const uint8_t>(planes, planeRowBytes, width, height, Chroma::k422);
     const DestinationRows rows(destination, destinationRowBytes);
     const int32_t firstRow = field == 2 ? 1 : 0;
     const PlanesRow convert = Best<W210Kernels>().quarterToVUYX;

@@ -1,8 +1,8 @@
 // Three planes of 10-bit words, 4:2:2, to V210 and to 8-bit pixels of half the width.
 
 #include "convert/BridgeKernels.h"
-#include "convert/SampleTriples.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/SampleTriples.h"
 
 namespace PK::PK_TARGET {
 namespace {

@@ -1,8 +1,8 @@
 // 8-bit 4:2:2 to 8-bit BGR in one pass: chroma resampling followed by the matrix.
 
-#include "convert/ChromaPairs.h"
 #include "convert/ColourMatrices.h"
 #include "convert/ConversionKernels.h"
+#include "primitives/lanes/ChromaPairs.h"
 
 namespace PK::PK_TARGET {
 namespace {

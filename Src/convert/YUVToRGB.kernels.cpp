@@ -2,8 +2,8 @@
 
 #include "convert/ColourMatrices.h"
 #include "convert/ConversionKernels.h"
-#include "convert/Samples.h"
 #include "primitives/lanes/RowDriver.h"
+#include "primitives/lanes/Samples.h"
 
 namespace PK::PK_TARGET {
 namespace {

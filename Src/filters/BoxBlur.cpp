@@ -47,7 +47,8 @@ public:
     Passes(std::span<const double> radii, int32_t flags, int32_t length)
         : fRadii(radii), fFlags(flags), fLength(length) {}
 
-    /// Calls run(pass) for each pass in order, but for those that change nothing: such are negative radii and NaN.
+    /// Calls run(pass) for each pass in order, but for those whose window is the pixel itself, which change nothing:
+    /// radii that count as 0.
     template <class Run>
     void ForEach(Run run) const {
         for (const double radius : fRadii) {

@@ -27,12 +27,15 @@ inline constexpr uint8_t kAbsent[kBundleStep] = {};
 
 /// Walks a line. Away from its ends the window of pixel x is x - size + 1 to x + size - 1, with edge pixels before
 /// and behind it. Deliberate, and relied on: pixel `size` has no left edge pixel, and the last three pixels of a
-/// line are never whole ones, unless the line is too short for a full window between the ends.
+/// line are never whole ones, unless the windows up to that of pixel `size` reach them.
 template <class Box>
 void Run(const BoxPass& pass, const uint8_t* source, uint8_t* destination) {
     constexpr int64_t kStep = Box::kStep;
     const int64_t length = pass.length, size = pass.size;
-    const int64_t lastWhole = length >= 2 * size + 3 ? length - 4 : length - 1;
+    const int64_t ofLeftEnd = 2 * size - 1; // the last whole pixel of pixel `size`
+    const int64_t lastWhole = length > ofLeftEnd + 3 ? length - 4
+                              : length > ofLeftEnd   ? ofLeftEnd
+                                                     : length - 1;
     const int64_t unit = Box::kHasEdges ? 255 : 1; // what a whole pixel counts
     Box box(pass);
     for (int64_t x = 0; x < size - 1; ++x) box.Enter(source + x * kStep);
@@ -45,17 +48,17 @@ void Run(const BoxPass& pass, const uint8_t* source, uint8_t* destination) {
         const bool hasLeft = x > size;
         const bool hasRight = x + size < length;
         count += enters - leaves;
-        const bool isEmpty = count == 0 && !Box::kHasEdges;
+        const int64_t whole = unit * (pass.renormalise ? count : 2 * size - 1);
+        const int64_t divisor = whole + (Box::kHasEdges ? pass.weight * (hasLeft + hasRight) : 0);
+        const bool staysAsItIs = divisor == 0; // nothing in the window weighs anything
         box.Step({
             here,
             enters ? here + (size - 1) * kStep : kAbsent,
             leaves ? source + (x - size) * kStep : kAbsent,
             hasLeft ? source + (x - size) * kStep : kAbsent,
             hasRight ? here + size * kStep : kAbsent,
-            isEmpty ? 1
-                    : unit * (pass.renormalise ? count : 2 * size - 1) +
-                          (Box::kHasEdges ? pass.weight * (hasLeft + hasRight) : 0),
-            isEmpty ? 0 : pass.bytes,
+            staysAsItIs ? 1 : divisor,
+            staysAsItIs ? 0 : pass.bytes,
             destination + x * kStep,
         });
     }

@@ -20,8 +20,15 @@ struct BoxPass {
 inline constexpr int32_t kBundleLines = 16;
 inline constexpr int32_t kBundleStep = 4 * kBundleLines;
 
-/// The largest size whose numerators, up to 255 x (255 x (2 x size - 1) + 2 x 255) + 128, stay below 2^31.
-inline constexpr int32_t kLargestBundleSize = 16384;
+/// Whether 32 bits with a sign hold what a bundle forms of white pixels: 256 times the sum of a window, on the way to
+/// 255 times, and the numerator with edge pixels of weight 255.
+consteval bool BoxFits32Bits(int64_t size) {
+    const int64_t sum = 255 * (2 * size - 1);
+    return 256 * sum <= INT32_MAX && 255 * (sum + 2 * 255) + 128 <= INT32_MAX;
+}
+
+inline constexpr int32_t kLargestBundleSize = 16448;
+static_assert(BoxFits32Bits(kLargestBundleSize) && !BoxFits32Bits(kLargestBundleSize + 1));
 
 struct BoxBlurKernels {
     using Run = void (*)(const BoxPass& pass, const uint8_t* source, uint8_t* destination);

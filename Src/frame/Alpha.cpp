@@ -1,6 +1,6 @@
 // Alpha of whole images: set, inverted, or replaced in a copy.
 
-#include "frame/PixelFormat.h"
+#include "frame/Arguments.h"
 #include "primitives/Channels.h"
 #include "primitives/Dispatch.h"
 
@@ -22,7 +22,7 @@ constexpr bool HasFourChannels(PK_PixelFormat format) {
 
 /// The place of alpha among the samples of a pixel.
 constexpr int32_t AlphaChannel(PK_PixelFormat format) {
-    return (format & kOrderMask) == kOrderARGB ? 0 : 3;
+    return IsOrderReversed(format) ? 0 : 3;
 }
 
 /// From rows of the source to rows of the destination.
@@ -39,8 +39,6 @@ struct Rows {
 using ChannelRow = decltype(ChannelKernels::replace);
 
 PK_Result RunRows(const Rows& rows, ChannelRow row, const ChannelPattern& pattern) {
-    if (rows.source == nullptr || rows.destination == nullptr) return PK_ErrFailed;
-    if (rows.width > kMaximumWidth) return PK_ErrFailed;
     const auto* source = static_cast<const uint8_t*>(rows.source);
     auto* destination = static_cast<uint8_t*>(rows.destination);
     const auto length = static_cast<size_t>(BytesPerPixel(rows.format) * rows.width);
@@ -59,7 +57,7 @@ int32_t AlphaCode(float alpha, int32_t full) {
 
 std::optional<ChannelPattern> ConstantAlpha(PK_PixelFormat format, float alpha) {
     const int32_t channel = AlphaChannel(format);
-    switch (format & kDepthMask) {
+    switch (DepthOf(format)) {
     case kDepth8u:
         return PatternOfChannel(channel, static_cast<uint8_t>(AlphaCode(alpha, kFull8)));
     case kDepth15u:
@@ -81,7 +79,7 @@ struct Inversion {
 std::optional<Inversion> InversionOf(PK_PixelFormat format) {
     const ChannelKernels& kernels = Best<ChannelKernels>();
     const int32_t channel = AlphaChannel(format);
-    switch (format & kDepthMask) {
+    switch (DepthOf(format)) {
     case kDepth8u:
         return Inversion{kernels.invertInteger, PatternOfChannel(channel, kFull8)};
     case kDepth15u:
@@ -137,9 +135,7 @@ PK_Result PK_SetAlphaChannel(int32_t width, int32_t height, void* buffer, int32_
                              PK_PixelFormat format, bool opaque) noexcept {
     const SetAlpha setAlpha = SetAlphaOf(format);
     if (setAlpha == nullptr) return PK_ErrNotSupported;
-    if (width < 0 || height < 0) return PK_ErrFailed;
-    if (width == 0 || height == 0) return PK_Success;
-    if (buffer == nullptr || width > kMaximumWidth) return PK_ErrFailed;
+    if (const auto result = ResultWithoutWork(width, height, {buffer}, BelowZero::Refused)) return *result;
     const int32_t status = setAlpha(width, height, static_cast<uint8_t*>(buffer), rowBytes, opaque);
     return status == 0 ? PK_Success : PK_ErrFailed;
 }
@@ -149,8 +145,8 @@ PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void* desti
                          int32_t height) noexcept {
     const auto inversion = InversionOf(format);
     if (!HasFourChannels(format) || !inversion) return PK_ErrBadSrcFormat;
-    if (width < 0 || height < 0) return PK_ErrFailed;
-    if (width == 0 || height == 0) return PK_Success;
+    if (const auto result = ResultWithoutWork(width, height, {source, destination}, BelowZero::Refused))
+        return *result;
     return RunRows({source, sourceRowBytes, destination, destinationRowBytes, format, width, height},
                    inversion->row, inversion->pattern);
 }
@@ -160,7 +156,8 @@ PK_Result PK_CopyAndSetAlpha(const void* source, int32_t sourceRowBytes, void* d
                              int32_t height, float alpha) noexcept {
     const auto pattern = ConstantAlpha(format, alpha);
     if (!HasFourChannels(format) || !pattern) return PK_ErrNotSupported;
-    if (width < 1 || height < 1) return PK_Success;
+    if (const auto result = ResultWithoutWork(width, height, {source, destination}, BelowZero::Empty))
+        return *result;
     return RunRows({source, sourceRowBytes, destination, destinationRowBytes, format, width, height},
                    Best<ChannelKernels>().replace, *pattern);
 }

@@ -1,6 +1,6 @@
 // The primitives on arrays of samples, as a host calls them.
 
-#include "frame/PixelFormat.h"
+#include "frame/Arguments.h"
 #include "primitives/ALaw.h"
 #include "primitives/ConvertFloat.h"
 #include "primitives/MultiplyConstant.h"
@@ -22,8 +22,9 @@ using namespace PK;
 PK_Result PK_MultiplyByConstant(int32_t width, int32_t height, const void* source, int32_t sourceRowBytes,
                                 void* destination, int32_t destinationRowBytes, const uint8_t constants[4],
                                 int32_t scaleFactor) noexcept {
-    if ((width == 0 && height >= 0) || (height == 0 && width >= 0)) return PK_Success;
-    if (width > kMaximumWidth) return PK_ErrFailed;
+    if (const auto result =
+            ResultWithoutWork(width, height, {source, destination, constants}, BelowZero::Refused))
+        return *result;
     return ResultOf(MultiplyConstant(static_cast<const uint8_t*>(source), sourceRowBytes, constants,
                                      static_cast<uint8_t*>(destination), destinationRowBytes, width, height,
                                      scaleFactor));

@@ -41,6 +41,11 @@ Block AllocateStaggered(uint64_t bytes) {
     return block;
 }
 
+// The address so many bytes further on, also from a null pointer, on which C++ defines no arithmetic.
+void* Offset(void* base, int64_t bytes) {
+    return reinterpret_cast<void*>(reinterpret_cast<uintptr_t>(base) + static_cast<uintptr_t>(bytes));
+}
+
 void Recycle(void* base, uint64_t allocatedSize) {
     if (base != nullptr) MemoryRecycler::Recycle(base, allocatedSize);
 }
@@ -118,17 +123,14 @@ void PK_FreeTransientMemoryBlock(void* allocationBase, uint64_t allocatedSize) n
 
 PK_Result PK_GetPlanarBuffers(void* block, PK_PixelFormat, int32_t width, int32_t height, void* planes[3],
                               int32_t rowBytes[3]) noexcept {
-    if (!block || !planes || !rowBytes || width < 0 || height < 0) return PK_ErrFailed;
+    if (!planes || !rowBytes || width < 0 || height < 0) return PK_ErrFailed;
     const int32_t rows = WrapRoundUp(height, 32);
     const int32_t lumaRowBytes = WrapRoundUp(width, 128);
     const int32_t chromaRowBytes = WrapRoundUp(width / 2, 128);
 
-    uint8_t* luma = static_cast<uint8_t*>(block);
-    uint8_t* u = luma + WrapMultiply(lumaRowBytes, rows);
-    uint8_t* v = u + WrapMultiply(rows, chromaRowBytes) / 2;
-    planes[0] = luma;
-    planes[1] = u;
-    planes[2] = v;
+    planes[0] = block;
+    planes[1] = Offset(planes[0], WrapMultiply(lumaRowBytes, rows));
+    planes[2] = Offset(planes[1], WrapMultiply(rows, chromaRowBytes) / 2);
     rowBytes[0] = lumaRowBytes;
     rowBytes[1] = chromaRowBytes;
     rowBytes[2] = chromaRowBytes;
@@ -139,7 +141,7 @@ PK_Result PK_ClipBufferToRect(void* buffer, int32_t rowBytes, int32_t, int32_t, 
                               int32_t left, int32_t top, void** clipped) noexcept {
     const int32_t pixelBytes = BytesPerPixel(format);
     if (pixelBytes == 0 || !IsPacked4444(format)) return PK_ErrBadSrcFormat;
-    if (!buffer || !clipped) return PK_ErrFailed;
-    *clipped = static_cast<uint8_t*>(buffer) + int64_t{rowBytes} * top + int64_t{left} * pixelBytes;
+    if (!clipped) return PK_ErrFailed;
+    *clipped = Offset(buffer, int64_t{rowBytes} * top + int64_t{left} * pixelBytes);
     return PK_Success;
 }

@@ -18,9 +18,10 @@ void SwapRows(uint8_t* a, uint8_t* b, uint8_t* scratch, uint64_t bytes) {
 
 PK_Result PK_FlipInPlace(void* buffer, int32_t rowBytes, int32_t width, int32_t height,
                          PK_PixelFormat format) noexcept {
-    if (width < 0 || height < 0) return PK_ErrFailed;
+    if (height <= 1) return PK_Success;
+    if (width < 0) return PK_ErrFailed;
     const int32_t rowLength = PK_PixelFormatPackedRowBytes(format, width);
-    if (height <= 1 || rowLength == 0) return PK_Success;
+    if (rowLength == 0) return PK_Success;
     if (buffer == nullptr || rowLength < 0) return PK_ErrFailed;
 
     const uint64_t bytes = static_cast<uint64_t>(rowLength);

@@ -34,15 +34,8 @@ int32_t PK_PixelFormatRowBytes(PK_PixelFormat format, int32_t width) noexcept {
 }
 
 int32_t PK_PixelFormatPackedRowBytes(PK_PixelFormat format, int32_t width) noexcept {
-    if ((format & kStructureMask) == kStructure444) return WrapMultiply(width, BytesPerPixel(format));
-    switch (format & kDepthMask) {
-    case kDepth8u:
-        return WrapMultiply(WrapAdd(width, 1) / 2, 4);
-    case kDepth10u:
-        return WrapMultiply(WrapAdd(width, 5) / 6, 16);
-    default:
-        return WrapMultiply(WrapAdd(width, 1) / 2, 16);
-    }
+    const RowUnit unit = UnitOfRow(format);
+    return WrapMultiply(WrapAdd(width, unit.pixels - 1) / unit.pixels, unit.bytes);
 }
 
 int64_t PK_PixelFormatSize(PK_PixelFormat format, int32_t width, int32_t height) noexcept {

@@ -8,12 +8,12 @@ namespace PK::Threading {
 
 /// Work in independent parts. A concrete task holds copies of its parameters, is built on the caller's stack for
 /// one call and writes a region of its own in each part; each part takes its own scratch. All failures are
-/// decided before the task runs.
+/// decided before the task runs; where a part may fail, RunInBands (Bands.h) brings its result back.
 class Task {
 public:
     virtual int32_t GetPartCount() const = 0;
 
-    /// Does one part, on any thread, in the floating-point mode which that thread is in.
+    /// Does one part, on any thread, in the floating-point mode of the thread that runs the task.
     /// \param partIndex  0 to the part count less one.
     virtual void RunPart(int32_t partIndex) const = 0;
 

@@ -2,32 +2,17 @@
 
 #include <PixelKiln/Rotate.h>
 
+#include "frame/Arguments.h"
 #include "frame/PixelFormat.h"
-#include "primitives/CapabilityFlags.h"
 #include "primitives/Dispatch.h"
 #include "primitives/TransposeKernels.h"
-
-#include <cstring>
 
 namespace PK {
 namespace {
 
 using TransposeKernel = void (*)(const TransposeArea&);
 
-/// One pixel after the other, where no vectors are used. Tiles of 16 by 16 keep the columns'
-/// cache lines.
-template <int32_t kPixelBytes>
-void TransposePixelwise(const TransposeArea& area) {
-    constexpr int32_t kTile = 16;
-    for (int32_t top = 0; top < area.rows; top += kTile)
-        for (int32_t column = 0; column < area.columns; ++column)
-            for (int32_t row = top; row < top + kTile && row < area.rows; ++row)
-                std::memcpy(area.destination + column * area.destinationStep + int64_t{row} * kPixelBytes,
-                            area.source + row * area.sourceStep + int64_t{column} * kPixelBytes, kPixelBytes);
-}
-
-TransposeKernel VectorKernel(uint8_t pixelBytes) {
-    if (!sCPUHasSSE2) return nullptr;
+TransposeKernel KernelOf(uint8_t pixelBytes) {
     const TransposeKernels& kernels = Best<TransposeKernels>();
     switch (pixelBytes) {
     case 1:
@@ -40,23 +25,6 @@ TransposeKernel VectorKernel(uint8_t pixelBytes) {
         return kernels.pixels8;
     case 16:
         return kernels.pixels16;
-    default:
-        return nullptr;
-    }
-}
-
-TransposeKernel PixelwiseKernel(uint8_t pixelBytes) {
-    switch (pixelBytes) {
-    case 1:
-        return TransposePixelwise<1>;
-    case 2:
-        return TransposePixelwise<2>;
-    case 4:
-        return TransposePixelwise<4>;
-    case 8:
-        return TransposePixelwise<8>;
-    case 16:
-        return TransposePixelwise<16>;
     default:
         return nullptr;
     }
@@ -87,7 +55,7 @@ void TurnHalf(const TransposeArea& area) {
 }
 
 constexpr bool IsPacked8u(PK_PixelFormat format) {
-    return IsPacked4444(format) && (format & kDepthMask) == kDepth8u;
+    return IsPacked4444(format) && DepthOf(format) == kDepth8u;
 }
 
 } // namespace
@@ -97,16 +65,14 @@ using namespace PK;
 
 PK_Result PK_Transpose(const void* source, int32_t sourceRowBytes, void* dest, int32_t destRowBytes,
                        int32_t width, int32_t height, uint8_t pixelBytes) noexcept {
-    const TransposeKernel vector = VectorKernel(pixelBytes);
-    const TransposeKernel kernel = vector ? vector : PixelwiseKernel(pixelBytes);
+    const TransposeKernel kernel = KernelOf(pixelBytes);
     if (!kernel) return PK_ErrBadSrcFormat;
-    if (width < 0 || height < 0) return PK_ErrFailed;
-    if (width == 0 || height == 0) return PK_Success;
-    if (!source || !dest) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Refused)) return *result;
+    if (HasNull({source, dest})) return PK_ErrFailed;
 
-    // Deliberate: only the vector form of pixels from 4 bytes on takes steps that are no multiple of the pixel as
+    // Deliberate: only the vector bodies for pixels from 4 bytes on take steps that are no multiple of the pixel as
     // they are.
-    const int32_t unit = vector && pixelBytes >= 4 ? 1 : pixelBytes;
+    const int32_t unit = BestTarget() != Target::plain && pixelBytes >= 4 ? 1 : pixelBytes;
     kernel({static_cast<const uint8_t*>(source), WholePixels(sourceRowBytes, unit),
             static_cast<uint8_t*>(dest), WholePixels(destRowBytes, unit), height, width});
     return PK_Success;
@@ -116,8 +82,8 @@ PK_Result PK_RotateImage(const void* source, int32_t sourceRowBytes, void* dest,
                          int32_t width, int32_t height, PK_PixelFormat format, int32_t degrees) noexcept {
     if (!IsPacked8u(format)) return PK_ErrBadSrcFormat;
     if (degrees == 0 || degrees % 90 != 0 || degrees < -270 || degrees > 270) return PK_ErrFailed;
-    if (width < 1 || height < 1) return PK_Success;
-    if (!source || !dest) return PK_ErrFailed;
+    if (const auto result = ResultOfSize(width, height, BelowZero::Empty)) return *result;
+    if (HasNull({source, dest})) return PK_ErrFailed;
 
     const TransposeArea area = {static_cast<const uint8_t*>(source),
                                 WholePixels(sourceRowBytes, 4),

@@ -1,5 +1,6 @@
 // PK_WarpAffineQuad: the polygon, its soft rim and the choice of kernels.
 
+#include "frame/Arguments.h"
 #include "geometry/QuadRasterizer.h"
 #include "primitives/Dispatch.h"
 
@@ -158,9 +159,7 @@ PK_Result PK_WarpAffineQuad(const void*, const void*, const void* source, int32_
     if (destination == nullptr) return PK_ErrNullDestination;
     if (source == nullptr) return PK_ErrNullSource;
     if (sourceRowBytes == 0 || destinationRowBytes == 0) return PK_ErrFailed;
-    if (sourceRect == nullptr || sourceQuad == nullptr || destinationRect == nullptr ||
-        destinationQuad == nullptr)
-        return PK_ErrFailed;
+    if (HasNull({sourceRect, sourceQuad, destinationRect, destinationQuad})) return PK_ErrFailed;
     if (IsEmpty(*sourceRect) || IsEmpty(*destinationRect) || !HasRows(field)) return PK_Success;
 
     const bool bilinear = quality > kBestNearestQuality;

@@ -21,7 +21,6 @@ struct WarpSource {
     int32_t lastRow; // the last that bilinear sampling may read: of the field, at or above the bottom
 
     bool offsetsFit; // whether the offset of every pixel, in pixels, fits 32 bits
-    bool hasPairs;   // that, and there are pixels side by side
 };
 
 /// How the pixels are written.

@@ -2,7 +2,7 @@
 
 #include "geometry/WarpSpan.h"
 
-#include "convert/ByteScale.h"
+#include "primitives/lanes/ByteScale.h"
 #include "primitives/simd/Target.h"
 
 namespace PK::PK_TARGET {
@@ -179,11 +179,6 @@ struct BilinearSampling {
 };
 
 // Rules of writing: each gives the new pixels, from the texels and the pixels that stand at the destination.
-
-/// nearest(a x b / 255) of two bytes.
-inline I32 MultiplyBytes(I32 a, I32 b) {
-    return DivideHalvesBy255(MultiplyHalves(a, b));
-}
 
 inline I32 Alpha(I32 pixels) {
     return ShiftRight<24>(pixels);

@@ -6,7 +6,6 @@
 
 namespace PK {
 
-inline constexpr int32_t kStatusSuccess = 0;
 inline constexpr int32_t kStatusOk = 0;
 inline constexpr int32_t kStatusBadSize = -6; // a negative width, height or count
 inline constexpr int32_t kStatusNullPointer = -8;

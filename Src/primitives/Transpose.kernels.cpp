@@ -83,13 +83,15 @@ struct Tile16 {
     }
 };
 
-/// What is too small for a tile.
+/// One pixel after the other. As many rows at a time as keep the columns' cache lines.
 template <int32_t kPixelBytes>
 void TransposePixelwise(const TransposeArea& area) {
-    for (int32_t column = 0; column < area.columns; ++column)
-        for (int32_t row = 0; row < area.rows; ++row)
-            std::memcpy(area.destination + column * area.destinationStep + int64_t{row} * kPixelBytes,
-                        area.source + row * area.sourceStep + int64_t{column} * kPixelBytes, kPixelBytes);
+    constexpr int32_t kRows = 16;
+    for (int32_t top = 0; top < area.rows; top += kRows)
+        for (int32_t column = 0; column < area.columns; ++column)
+            for (int32_t row = top; row < top + kRows && row < area.rows; ++row)
+                std::memcpy(area.destination + column * area.destinationStep + int64_t{row} * kPixelBytes,
+                            area.source + row * area.sourceStep + int64_t{column} * kPixelBytes, kPixelBytes);
 }
 
 inline int32_t Lesser(int32_t a, int32_t b) {
@@ -116,7 +118,9 @@ void TransposeBlock(const TransposeArea& area, int32_t firstRow, int32_t endRow,
 /// rows: few destination rows are written at a time, and each goes on where it was left.
 template <class Tile>
 void Transpose(const TransposeArea& area) {
-    if (area.rows < Tile::kRows || area.columns < Tile::kColumns)
+    // Without vectors, pixels smaller than a lane are not worth gathering in lanes.
+    constexpr bool kAreWorthTiles = Target::PK_TARGET != Target::plain || Tile::kPixelBytes >= 4;
+    if (!kAreWorthTiles || area.rows < Tile::kRows || area.columns < Tile::kColumns)
         return TransposePixelwise<Tile::kPixelBytes>(area);
     // A source row of one cache line is read once.
     const bool areRowsOneLine = area.columns <= 64 / Tile::kPixelBytes;

@@ -2,28 +2,17 @@
 
 #include <PixelKiln/QuarterScale.h>
 
+#include "convert/Image.h"
+#include "frame/Arguments.h"
+#include "frame/Planes.h"
 #include "primitives/Dispatch.h"
 #include "scale/QuarterScaleKernels.h"
-
-#include <cstddef>
 
 namespace PK {
 namespace {
 
 constexpr uint32_t kMaximumSize = INT32_MAX;
-constexpr int32_t kSecondField = 2;
-
-/// The work on one plane: every other sample of every other row.
-struct PlaneReduction {
-    const uint8_t* source;
-    ptrdiff_t sourceRowBytes;
-    uint8_t* destination;
-    ptrdiff_t destinationRowBytes;
-    int32_t samples; // of a row that is written
-    int32_t rows;
-
-    bool IsEmpty() const { return samples == 0 || rows == 0; }
-};
+constexpr int32_t kFirstField = 1, kSecondField = 2;
 
 /// The samples that a row gets of a width. With SSE2 the width counts samples of the destination and goes by
 /// whole groups of 32; it counts samples of the source without SSE2, and for the lone part of a group that a
@@ -33,15 +22,11 @@ int32_t SamplesOfRow(int32_t width) {
     return IsEnabled(Target::sse2) && width >= kGroup ? width / kGroup * kGroup : width / 2;
 }
 
-void Reduce(const PlaneReduction& plane, const QuarterScaleKernels& kernels) {
-    for (ptrdiff_t row = 0; row < plane.rows; ++row) {
-        kernels.evenBytes(plane.source + 2 * row * plane.sourceRowBytes,
-                          plane.destination + row * plane.destinationRowBytes, plane.samples);
-    }
-}
-
-const uint8_t* RowOf(const void* plane, ptrdiff_t rowBytes, ptrdiff_t row) {
-    return static_cast<const uint8_t*>(plane) + row * rowBytes;
+/// Every other sample of every other row.
+void Reduce(const Plane<const uint8_t>& source, const Plane<uint8_t>& destination, int32_t samples,
+            const QuarterScaleKernels& kernels) {
+    for (int32_t row = 0; row < destination.height; ++row)
+        kernels.evenBytes(source.Row(row), destination.Row(row), samples);
 }
 
 } // namespace
@@ -52,31 +37,25 @@ using namespace PK;
 PK_Result PK_QuarterScalePlanar420_8u(const void* const srcPlanes[3], const int32_t srcRowBytes[3],
                                       void* const dstPlanes[3], const int32_t dstRowBytes[3], uint32_t width,
                                       uint32_t height, int32_t field) noexcept {
-    if (field != 1 && field != kSecondField) return PK_ErrBadFieldType;
+    if (field != kFirstField && field != kSecondField) return PK_ErrBadFieldType;
     if (width > kMaximumSize || height > kMaximumSize) return PK_ErrFailed;
     if (width < 2 || height < 2) return PK_Success;
-    if (!srcPlanes || !srcRowBytes || !dstPlanes || !dstRowBytes) return PK_ErrFailed;
+    if (HasNull({srcPlanes, srcRowBytes, dstPlanes, dstRowBytes})) return PK_ErrFailed;
 
-    PlaneReduction planes[3];
-    for (int i = 0; i < 3; ++i) {
-        const bool isLuma = i == 0;
-        const auto planeWidth = static_cast<int32_t>(isLuma ? width : width / 2);
-        const auto rows = static_cast<int32_t>(isLuma ? height / 2 : height / 4);
-        planes[i] = {static_cast<const uint8_t*>(srcPlanes[i]),
-                     srcRowBytes[i],
-                     static_cast<uint8_t*>(dstPlanes[i]),
-                     dstRowBytes[i],
-                     SamplesOfRow(planeWidth),
-                     rows};
-        if (planes[i].IsEmpty()) continue;
-        if (!planes[i].source || !planes[i].destination) return PK_ErrFailed;
-    }
-    // Luma alone follows the field; chroma of either starts at row 0, as callers know it.
-    if (field == kSecondField) planes[0].source += planes[0].sourceRowBytes;
+    const auto columns = static_cast<int32_t>(width), rows = static_cast<int32_t>(height);
+    const auto source = PlanesOf<const uint8_t>(srcPlanes, srcRowBytes, columns, rows, Chroma::k420);
+    const auto destination = PlanesOf<uint8_t>(dstPlanes, dstRowBytes, columns / 2, rows / 2, Chroma::k420);
+    for (size_t i = 0; i < source.size(); ++i)
+        if (!destination[i].IsEmpty() && HasNull({source[i].pixels, destination[i].pixels}))
+            return PK_ErrFailed;
 
     const QuarterScaleKernels& kernels = Best<QuarterScaleKernels>();
-    for (const PlaneReduction& plane : planes)
-        if (!plane.IsEmpty()) Reduce(plane, kernels);
+    for (size_t i = 0; i < source.size(); ++i) {
+        if (destination[i].IsEmpty()) continue;
+        // Luma alone follows the field; chroma of either starts at row 0, as callers know it.
+        const auto rowsOfField = Field(source[i], i == 0 ? field : kFirstField);
+        Reduce(rowsOfField, destination[i], SamplesOfRow(source[i].width), kernels);
+    }
     return PK_Success;
 }
 
@@ -86,22 +65,22 @@ PK_Result PK_QuarterScalePlanar_8uAndConvertTo422_8u(const void* const srcPlanes
                                                      bool yuyvOrder, int32_t field) noexcept {
     if (width > kMaximumSize || height > kMaximumSize) return PK_ErrFailed;
     if (width == 0 || height < 2) return PK_Success;
-    if (!srcPlanes || !srcRowBytes || !dst) return PK_ErrFailed;
-    if (!srcPlanes[0] || !srcPlanes[1] || !srcPlanes[2]) return PK_ErrFailed;
+    if (HasNull({srcPlanes, srcRowBytes, dst})) return PK_ErrFailed;
+    if (HasNull({srcPlanes[0], srcPlanes[1], srcPlanes[2]})) return PK_ErrFailed;
 
+    const auto [y, chroma1, chroma2] = PlanesOf<const uint8_t>(
+        srcPlanes, srcRowBytes, static_cast<int32_t>(width), static_cast<int32_t>(height), Chroma::k420);
+    const auto luma = Field(y, field == kSecondField ? kSecondField : kFirstField);
     const QuarterScaleKernels& kernels = Best<QuarterScaleKernels>();
     const auto interleave = yuyvOrder ? kernels.lumaFirst : kernels.chromaFirst;
-    const auto pairs = static_cast<int32_t>(width / 2);
-    const ptrdiff_t firstLumaRow = field == kSecondField ? 1 : 0;
-    for (ptrdiff_t row = 0; row < height / 2; ++row) {
-        const uint8_t* luma = RowOf(srcPlanes[0], srcRowBytes[0], 2 * row + firstLumaRow);
-        const uint8_t* chroma1 = RowOf(srcPlanes[1], srcRowBytes[1], row);
-        const uint8_t* chroma2 = RowOf(srcPlanes[2], srcRowBytes[2], row);
-        uint8_t* destination = static_cast<uint8_t*>(dst) + row * dstRowBytes;
-        interleave(luma, chroma1, chroma2, destination, pairs);
-        if (width % 2 == 0) continue;
-        const uint8_t lastLuma[2] = {luma[width - 1], 0};
-        interleave(lastLuma, chroma1 + pairs, chroma2 + pairs, destination + 4 * ptrdiff_t{pairs}, 1);
+    const int32_t pairs = y.width / 2;
+    for (int32_t row = 0; row < y.height / 2; ++row) {
+        uint8_t* destination = static_cast<uint8_t*>(dst) + ptrdiff_t{row} * dstRowBytes;
+        interleave(luma.Row(row), chroma1.Row(row), chroma2.Row(row), destination, pairs);
+        if (y.width % 2 == 0) continue;
+        const uint8_t lastLuma[2] = {luma.Row(row)[y.width - 1], 0};
+        interleave(lastLuma, chroma1.Row(row) + pairs, chroma2.Row(row) + pairs,
+                   destination + 4 * ptrdiff_t{pairs}, 1);
     }
     return PK_Success;
 }

@@ -17,11 +17,15 @@ namespace {
 constexpr size_t kHugePage = size_t{2} << 20;
 constexpr PK_PixelFormat kDepthMask = 0x1c0;
 
+size_t PackedRowBytes(const Image& image) {
+    return image.packedBytes / static_cast<size_t>(image.size.height);
+}
+
 template <class Sample>
 double LargestDifferenceOfSamples(const Image& a, const Image& b) {
     double largest = 0;
-    for (int32_t row = 0; row < kHeight; ++row)
-        for (size_t at = 0; at < a.packedBytes / kHeight; at += sizeof(Sample)) {
+    for (int32_t row = 0; row < a.size.height; ++row)
+        for (size_t at = 0; at < PackedRowBytes(a); at += sizeof(Sample)) {
             Sample x, y;
             std::memcpy(&x, a.Row(row) + at, sizeof x);
             std::memcpy(&y, b.Row(row) + at, sizeof y);
@@ -32,8 +36,8 @@ double LargestDifferenceOfSamples(const Image& a, const Image& b) {
 
 double LargestDifferenceOfV210(const Image& a, const Image& b) {
     double largest = 0;
-    for (int32_t row = 0; row < kHeight; ++row)
-        for (size_t at = 0; at < a.packedBytes / kHeight; at += 4) {
+    for (int32_t row = 0; row < a.size.height; ++row)
+        for (size_t at = 0; at < PackedRowBytes(a); at += 4) {
             uint32_t x, y;
             std::memcpy(&x, a.Row(row) + at, sizeof x);
             std::memcpy(&y, b.Row(row) + at, sizeof y);
@@ -68,25 +72,26 @@ Bytes Allocate(size_t count) {
     return Bytes(static_cast<uint8_t*>(block));
 }
 
-Image::Image(PK_PixelFormat theFormat)
-    : format(theFormat), rowBytes(PK_PixelFormatRowBytes(theFormat, kWidth)),
-      packedBytes(static_cast<size_t>(PK_PixelFormatPackedRowBytes(theFormat, kWidth)) * kHeight),
-      bytes(Allocate(static_cast<size_t>(rowBytes) * kHeight)) {}
+Image::Image(PK_PixelFormat theFormat, Size theSize)
+    : format(theFormat), size(theSize), rowBytes(PK_PixelFormatRowBytes(theFormat, size.width)),
+      packedBytes(static_cast<size_t>(PK_PixelFormatPackedRowBytes(theFormat, size.width)) *
+                  static_cast<size_t>(size.height)),
+      bytes(Allocate(static_cast<size_t>(rowBytes) * static_cast<size_t>(size.height))) {}
 
-Image MakePicture(PK_PixelFormat format) {
-    Image straight(PK_PixelFormat_BGRA_4444_8u);
+Image MakePicture(PK_PixelFormat format, Size size) {
+    Image straight(PK_PixelFormat_BGRA_4444_8u, size);
     std::mt19937 random(1);
-    for (int32_t row = 0; row < kHeight; ++row)
-        for (int32_t x = 0; x < kWidth; ++x) FillPixel(random, straight.Row(row) + 4 * x, x, row);
-    Image image(format);
+    for (int32_t row = 0; row < size.height; ++row)
+        for (int32_t x = 0; x < size.width; ++x) FillPixel(random, straight.Row(row) + 4 * x, x, row);
+    Image image(format, size);
     PK_Convert(straight.bytes.get(), straight.rowBytes, straight.format, image.bytes.get(), image.rowBytes,
-               format, kWidth, kHeight, 1);
+               format, size.width, size.height, 1);
     return image;
 }
 
 Rows FromTop(const Image& image) {
     if (PK_IsOriginTopLeft(image.format)) return {image.bytes.get(), image.rowBytes};
-    return {image.Row(kHeight - 1), -image.rowBytes};
+    return {image.Row(image.size.height - 1), -image.rowBytes};
 }
 
 double LargestDifference(const Image& a, const Image& b) {

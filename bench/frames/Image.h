@@ -1,7 +1,7 @@
 #pragma once
 
-// The images that the frame benchmark converts: all of one size, each in memory of its own that is aligned
-// and paged alike, so that no contender is better placed than another.
+// The images that the frame benchmark converts, each in memory of its own that is aligned and paged alike, so that no
+// contender is better placed than another.
 
 #include <PixelKiln/PixelFormat.h>
 
@@ -10,8 +10,11 @@
 
 namespace FrameBench {
 
-inline constexpr int32_t kWidth = 1920;
-inline constexpr int32_t kHeight = 1080;
+struct Size {
+    int32_t width, height;
+};
+inline constexpr Size kHD = {1920, 1080};
+inline constexpr Size kUHD = {3840, 2160};
 
 struct Free {
     void operator()(uint8_t* bytes) const;
@@ -22,9 +25,10 @@ using Bytes = std::unique_ptr<uint8_t, Free>;
 Bytes Allocate(size_t count);
 
 struct Image {
-    explicit Image(PK_PixelFormat theFormat);
+    Image(PK_PixelFormat theFormat, Size theSize);
 
     PK_PixelFormat format;
+    Size size;
     int32_t rowBytes;
     size_t packedBytes; ///< without row padding
     Bytes bytes;
@@ -33,7 +37,7 @@ struct Image {
 };
 
 /// A picture that is valid in its format: colour is at most alpha where it is premultiplied.
-Image MakePicture(PK_PixelFormat format);
+Image MakePicture(PK_PixelFormat format, Size size);
 
 /// A way through the rows of an image.
 struct Rows {

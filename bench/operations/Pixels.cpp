@@ -62,19 +62,20 @@ Run ToInt16(const uint8_t* source, uint8_t* destination) {
     };
 }
 
-template <int32_t kPixelBytes>
+template <int32_t kPixelBytes, int32_t kScale = 1>
 Run Transpose(const uint8_t* source, uint8_t* destination) {
     return [=] {
-        PK_Transpose(source, kPixelBytes * kWidth, destination, kPixelBytes * kHeight, kWidth, kHeight,
-                     kPixelBytes);
+        PK_Transpose(source, kScale * kPixelBytes * kWidth, destination, kScale * kPixelBytes * kHeight,
+                     kScale * kWidth, kScale * kHeight, kPixelBytes);
     };
 }
 
-template <int32_t kDegrees>
+template <int32_t kDegrees, int32_t kScale = 1>
 Run Rotate(const uint8_t* source, uint8_t* destination) {
     return [=] {
-        PK_RotateImage(source, kBGRARowBytes, destination, kDegrees == 180 ? kBGRARowBytes : kTurnedRowBytes,
-                       kWidth, kHeight, PK_PixelFormat_BGRA_4444_8u, kDegrees);
+        PK_RotateImage(source, kScale * kBGRARowBytes, destination,
+                       kScale * (kDegrees == 180 ? kBGRARowBytes : kTurnedRowBytes), kScale * kWidth,
+                       kScale * kHeight, PK_PixelFormat_BGRA_4444_8u, kDegrees);
     };
 }
 
@@ -128,6 +129,8 @@ const AddOperations add = {
     {"Float to 16-bit integer, rounding mode 1", 4 * kCount, 2 * kCount, Samples::Floats, Against::Memcpy,
      0.7, ToInt16<1>},
     {"Transpose BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Transpose<4>},
+    {"Transpose BGRA 8u of 3840 x 2160", 16 * kCount, 16 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Transpose<4, 2>},
     {"Transpose pixels of 1 byte", kCount, kCount, Samples::Bytes, Against::Peer, 0.95, Transpose<1>},
     {"Transpose pixels of 2 bytes", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Peer, 0.95,
      Transpose<2>},
@@ -138,6 +141,8 @@ const AddOperations add = {
     {"Rotate BGRA 8u by 90 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95, Rotate<90>},
     {"Rotate BGRA 8u by 180 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95,
      Rotate<180>},
+    {"Rotate BGRA 8u of 3840 x 2160 by 180 degrees", 16 * kCount, 16 * kCount, Samples::Bytes, Against::Peer,
+     0.95, Rotate<180, 2>},
     {"Rotate BGRA 8u by 270 degrees", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 0.95,
      Rotate<270>},
     {"Box blur of rows, radius 10", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 1, Blur<0>},

@@ -4,6 +4,7 @@
 #include "support/Check.h"
 #include "support/Family.h"
 #include "support/FloatState.h"
+#include "support/ImageMemory.h"
 
 #include <PixelKiln/ColorSpace.h>
 
@@ -174,31 +175,14 @@ std::vector<uint8_t> DrawPixels(ByteStream& stream, size_t count) {
     return pixels;
 }
 
-/// Floats on the heap that end where their memory does, so that the address sanitizer sees the first too far, behind some
-/// that nothing may touch and that take them off the alignment of vectors.
-class FloatMemory {
-public:
+/// Pixels or samples in memory of their own.
+struct FloatMemory : ImageMemory {
     FloatMemory(const std::vector<uint8_t>& content, ByteStream& stream)
-        : fHead(stream.Between(0, 15)), fFloats(static_cast<size_t>(fHead) + content.size() / 4, kPattern) {
-        std::ranges::copy(content, reinterpret_cast<uint8_t*>(Data()));
+        : ImageMemory({content.size(), 1, 0, alignof(float)}, stream) {
+        SetRows(content);
     }
 
-    float* Data() { return fFloats.data() + fHead; }
-
-    std::vector<uint8_t> Bytes() const {
-        const auto* first = reinterpret_cast<const uint8_t*>(fFloats.data() + fHead);
-        return {first, first + (fFloats.size() - static_cast<size_t>(fHead)) * 4};
-    }
-
-    bool IsHeadIntact() const {
-        return std::count(fFloats.begin(), fFloats.begin() + fHead, kPattern) == fHead;
-    }
-
-private:
-    static constexpr float kPattern = -12345;
-
-    int32_t fHead;
-    std::vector<float> fFloats;
+    float* Data() const { return reinterpret_cast<float*>(Pixels()); }
 };
 
 float FloatAt(const std::vector<uint8_t>& bytes, size_t i) {
@@ -211,10 +195,8 @@ uint32_t WordAt(const std::vector<uint8_t>& bytes, size_t i) {
     return std::bit_cast<uint32_t>(FloatAt(bytes, i));
 }
 
-constexpr uint32_t kStickyBits = 0x3f; // those of the processor's exceptions are the caller's to clear
-
 void FuzzColour(ByteStream& stream) {
-    const uint32_t state = DrawFloatState(stream) | kStickyBits;
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const DrawnSpace drawn(stream);
     const Conversion conversion = DrawConversion(stream, drawn);
     const int32_t count = stream.OneIn(8) ? std::min(0, stream.AnyI32()) : stream.Between(0, 41);
@@ -226,11 +208,12 @@ void FuzzColour(ByteStream& stream) {
         destination(content, stream); // some classes leave the destination as it is
     float *from = source.Data(), *to = destination.Data();
     CallIn(state, [&] { conversion.run(from, to, count); });
-    const std::vector<uint8_t> result = destination.Bytes();
-    CheckSame(content, source.Bytes(), "the source stays");
+    const std::vector<uint8_t> result = destination.Rows();
+    CheckSame(content, source.Rows(), "the source stays");
     CallIn(state, [&] { conversion.run(from, from, count); });
-    CheckSame(result, source.Bytes(), "in place is as out of place");
-    Check(source.IsHeadIntact() && destination.IsHeadIntact(), "floats in front of the pixels stay");
+    CheckSame(result, source.Rows(), "in place is as out of place");
+    source.CheckPadding();
+    destination.CheckPadding();
     for (size_t i = 0; i < pixels; ++i) {
         if (conversion.keepsAlpha)
             Check(WordAt(result, 4 * i + 3) == WordAt(content, 4 * i + 3), "alpha is copied");
@@ -242,7 +225,7 @@ void FuzzColour(ByteStream& stream) {
 }
 
 void FuzzCurvesAndMatrices(ByteStream& stream) {
-    const uint32_t state = DrawFloatState(stream) | kStickyBits;
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const DrawnSpace from(stream), to(stream);
     const float value = DrawFloat(stream);
     SetCall("single values and matrices of " + from.name + " and " + to.name);
@@ -267,7 +250,7 @@ void FuzzCurvesAndMatrices(ByteStream& stream) {
 }
 
 void FuzzClamp(ByteStream& stream) {
-    const uint32_t state = DrawFloatState(stream) | kStickyBits;
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const int32_t rows = stream.OneIn(8) ? std::min(0, stream.AnyI32()) : stream.Between(0, 5);
     const int32_t rowBytes =
         stream.OneIn(8) ? std::min(3, stream.AnyI32()) : stream.Between(0, stream.OneIn(4) ? 1200 : 70);
@@ -283,14 +266,15 @@ void FuzzClamp(ByteStream& stream) {
     FloatMemory source(content, stream), destination(content, stream);
     float *from = source.Data(), *to = destination.Data();
     CallIn(state, [&] { ClampFloatPixels(from, to, rows, rowBytes, least, most); });
-    Check(source.IsHeadIntact() && destination.IsHeadIntact(), "floats in front of the rows stay");
+    source.CheckPadding();
+    destination.CheckPadding();
     // The first row is treated twice, which shows in place between limits that are crossed, be it only where denormals
     // count as zero.
     constexpr float kSmallestNormal = std::numeric_limits<float>::min();
     if (!(most - least > 4 * kSmallestNormal)) return;
     CallIn(state, [&] { ClampFloatPixels(from, from, rows, rowBytes, least, most); });
-    CheckSame(destination.Bytes(), source.Bytes(), "in place is as out of place");
-    const std::vector<uint8_t> result = destination.Bytes();
+    CheckSame(destination.Rows(), source.Rows(), "in place is as out of place");
+    const std::vector<uint8_t> result = destination.Rows();
     for (size_t row = 0; row < passes; ++row)
         for (size_t i = 0; i < step / 4; ++i) {
             const float x = FloatAt(result, row * step / 4 + i);

@@ -5,6 +5,7 @@
 #include "support/FloatState.h"
 #include "support/Formats.h"
 #include "support/ImageMemory.h"
+#include "support/Size.h"
 #include "support/Switches.h"
 
 #include "convert/RasterFormats.h"
@@ -14,20 +15,11 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstring>
 #include <string>
 
 namespace {
 
 using namespace PKFuzz;
-
-constexpr int32_t kWidestRow = INT32_MAX / 16; // as documented
-
-struct Size {
-    int32_t width, height;
-
-    bool HasPixels() const { return width > 0 && width <= kWidestRow && height > 0; }
-};
 
 Size DrawSize(ByteStream& stream) {
     if (stream.OneIn(16)) return {stream.AnyI32(), stream.Between(-3, 0)};
@@ -36,35 +28,23 @@ Size DrawSize(ByteStream& stream) {
     return {stream.Between(-1, 120), stream.Between(0, 40)};
 }
 
-std::string SizeWords(Size size) {
-    return std::to_string(size.width) + " x " + std::to_string(size.height);
+RowsLayout DrawRaster(ByteStream& stream, PK_PixelFormat format, Size size) {
+    return DrawLayout(stream, int64_t{PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0))}, size);
 }
 
-RowsLayout DrawRows(ByteStream& stream, int64_t rowLength, Size size) {
-    if (!size.HasPixels()) return {0, 0, stream.AnyI32()};
-    const auto bytes = static_cast<size_t>(std::max<int64_t>(rowLength, 0));
-    const auto rows = static_cast<size_t>(size.height);
-    return {bytes, rows, DrawRowBytes(stream, bytes, rows, 0)};
-}
-
-/// Rows with content, given to a call as they are or, now and then, as null.
+/// An image, given to a call as it is or, now and then, as null.
 struct Input {
     PK_PixelFormat format;
-    ImageMemory memory;
+    SourceImage memory;
     bool isNull;
 
     Input(ByteStream& stream, PK_PixelFormat pixelFormat, const RowsLayout& layout)
-        : format(pixelFormat), memory(layout, stream), isNull(stream.OneIn(64)) {
-        std::vector<uint8_t> content(layout.rowLength * layout.rows);
-        stream.Fill(content.data(), content.size());
-        memory.SetRows(content);
-    }
+        : format(pixelFormat), memory(layout, stream), isNull(stream.OneIn(64)) {}
     Input(ByteStream& stream, PK_PixelFormat pixelFormat, Size size)
-        : Input(stream, pixelFormat,
-                DrawRows(stream, PK_PixelFormatPackedRowBytes(pixelFormat, std::max(size.width, 0)), size)) {}
+        : Input(stream, pixelFormat, DrawRaster(stream, pixelFormat, size)) {}
 
     uint8_t* Pixels() const { return isNull ? nullptr : memory.Pixels(); }
-    int32_t RowBytes() const { return memory.Layout().rowBytes; }
+    int32_t RowBytes() const { return memory.RowBytes(); }
 };
 
 struct MaskCall {
@@ -78,7 +58,7 @@ PK_Result ExpectedResult(const MaskCall& call) {
         return PK_ErrBadDstFormat;
     if (!PK::IsRasterFormat(call.first.format) || !PK::IsRasterFormat(call.second.format))
         return PK_ErrBadSrcFormat;
-    if (call.size.width < 0 || call.size.width > kWidestRow || call.size.height < 0) return PK_ErrFailed;
+    if (!call.size.IsPossible()) return PK_ErrFailed;
     if (!call.size.HasPixels()) return PK_Success;
     const bool hasNull =
         call.first.isNull || call.second.isNull || call.mask.isNull || call.destination.isNull;
@@ -89,8 +69,8 @@ PK_Result ExpectedResult(const MaskCall& call) {
 void CheckPixels(const MaskCall& call) {
     const PK_PixelFormat format = call.destination.format;
     if (call.first.format != format || call.second.format != format || !call.size.HasPixels()) return;
-    const std::vector<uint8_t> ones = call.first.memory.Rows(), zeros = call.second.memory.Rows(),
-                               bits = call.mask.memory.Rows();
+    const std::vector<uint8_t>&ones = call.first.memory.Content(), &zeros = call.second.memory.Content(),
+          &bits = call.mask.memory.Content();
     const size_t maskRow = call.mask.memory.Layout().rowLength;
     const size_t row = call.destination.memory.Layout().rowLength;
     const size_t pixelBytes = row / static_cast<size_t>(call.size.width);
@@ -112,11 +92,11 @@ void FuzzMask(ByteStream& stream, uint32_t state) {
     const Input first(stream, drawOther(), size), second(stream, drawOther(), size);
     const Input destination(stream, format, size);
     const int64_t maskBytes = (static_cast<int64_t>(bit) + size.width + 7) / 8;
-    const Input mask(stream, PK_PixelFormat_Invalid, DrawRows(stream, maskBytes, size));
+    const Input mask(stream, PK_PixelFormat_Invalid, DrawLayout(stream, maskBytes, size));
     SetCall("PK_OneBitMaskComposite of " + Words(first.format) + " and " + Words(second.format) + " to " +
-            Words(format) + ", " + SizeWords(size) + ", bit " + std::to_string(offset));
+            Words(format) + ", " + Words(size) + ", bit " + std::to_string(offset));
 
-    const int32_t quality = stream.OneIn(8) ? stream.AnyI32() : stream.Between(0, 5);
+    const int32_t quality = stream.BetweenOrAny(0, 5, 8);
     const PK_Result result = CallIn(state, [&] {
         return PK_OneBitMaskComposite(first.Pixels(), first.RowBytes(), first.format, second.Pixels(),
                                       second.RowBytes(), second.format, mask.Pixels(), mask.RowBytes(),
@@ -124,16 +104,15 @@ void FuzzMask(ByteStream& stream, uint32_t state) {
                                       size.width, size.height, quality);
     });
     const MaskCall call = {first, second, mask, destination, size, bit};
-    Check(result == ExpectedResult(call), "the arguments decide the result");
-    Check(destination.memory.IsPaddingIntact(), "bytes outside the rows stay");
+    CheckResult(ExpectedResult(call), result);
+    destination.memory.CheckPadding();
+    for (const Input* source : {&first, &second, &mask}) source->memory.CheckStays();
     if (result == PK_Success) CheckPixels(call);
 }
 
 float DrawFraction(ByteStream& stream) {
     if (stream.OneIn(16)) {
-        const uint32_t bits = stream.U32();
-        float any;
-        std::memcpy(&any, &bits, sizeof any);
+        const float any = stream.AnyFloat();
         return std::fpclassify(any) == FP_SUBNORMAL ? 0.0f
                                                     : any; // which MXCSR may say to be 0, whatever its sign
     }
@@ -151,8 +130,7 @@ bool HasInk(PK_PixelFormat format) {
 }
 
 RowsLayout DrawImage(ByteStream& stream, PK_PixelFormat format, Size size) {
-    if (!PK::IsStream(format))
-        return DrawRows(stream, PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0)), size);
+    if (!PK::IsStream(format)) return DrawRaster(stream, format, size);
     const int64_t bytes = size.HasPixels() ? PK_PixelFormatSize(format, size.width, size.height) : 0;
     return {static_cast<size_t>(bytes), bytes > 0 ? size_t{1} : 0, stream.AnyI32()};
 }
@@ -165,11 +143,10 @@ void FuzzNumber(ByteStream& stream, uint32_t state) {
     const int32_t number = stream.AnyI32();
     const bool decimal = stream.Bool();
     const Input image(stream, format, DrawImage(stream, format, size));
-    SetCall("PK_PrintNum of " + std::to_string(number) + " on " + Words(format) + ", " + SizeWords(size) +
+    SetCall("PK_PrintNum of " + std::to_string(number) + " on " + Words(format) + ", " + Words(size) +
             ", size " + std::to_string(fraction) + " at " + std::to_string(position.x) + ", " +
             std::to_string(position.y));
 
-    const std::vector<uint8_t> before = image.memory.Rows();
     const PK_Result result = CallIn(state, [&] {
         return PK_PrintNum(image.Pixels(), image.RowBytes(), format, size.width, size.height, number,
                            fraction, position, decimal);
@@ -185,9 +162,9 @@ void FuzzNumber(ByteStream& stream, uint32_t state) {
         expected = PK_ErrFailed;
     else if (size.HasPixels() && image.isNull)
         expected = PK_ErrFailed;
-    Check(result == expected, "the arguments decide the result");
-    Check(image.memory.IsPaddingIntact(), "bytes outside the rows stay");
-    if (result != PK_Success) CheckSame(before, image.memory.Rows(), "a refusal writes nothing");
+    CheckResult(expected, result);
+    image.memory.CheckPadding();
+    if (result != PK_Success) image.memory.CheckStays("a refused call writes nothing");
 }
 
 void FuzzOverlay(ByteStream& stream) {

@@ -4,6 +4,8 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/ImageMemory.h"
+#include "support/Planes.h"
+#include "support/Size.h"
 #include "support/Switches.h"
 
 #include <PixelKiln/CodecBridges.h>
@@ -14,12 +16,6 @@
 namespace {
 
 using namespace PKFuzz;
-
-constexpr int32_t kWidestRow = 134217727; // as documented
-
-struct Size {
-    int32_t width, height;
-};
 
 /// A bridge as the others are called; those without row bytes ignore them.
 using Call = PK_Result (*)(const void* source, int32_t sourceRowBytes, void* destination,
@@ -82,26 +78,17 @@ bool IsAffordable(Size size) {
     return HasRows(size) || size.width < 1 || size.height < 1 || size.width > kWidestRow;
 }
 
-PK_Result ExpectedResult(Size size, bool hasNull) {
-    if (size.height < 1 || size.width == 0) return PK_Success;
-    return size.width < 0 || size.width > kWidestRow || hasNull ? PK_ErrFailed : PK_Success;
+/// The size in memory: what must be refused or does nothing touches none.
+Size SizeInMemory(Size size) {
+    return HasRows(size) ? size : Size{0, 0};
 }
 
-RowsLayout DrawLayout(ByteStream& stream, size_t rowLength, int32_t rows) {
-    const auto count = static_cast<size_t>(rows);
-    return {rowLength, count, DrawRowBytes(stream, rowLength, count, static_cast<int32_t>(rowLength + 64))};
-}
-
-std::vector<uint8_t> FillImage(ByteStream& stream, ImageMemory& image) {
-    std::vector<uint8_t> content(image.Layout().rows * image.Layout().rowLength);
-    stream.Fill(content.data(), content.size());
-    image.SetRows(content);
-    return content;
+RowsLayout DrawImage(ByteStream& stream, int32_t pixelBytes, Size size) {
+    return DrawLayout(stream, RowLength(pixelBytes, size.width), static_cast<size_t>(size.height));
 }
 
 std::string WordsOfCall(const char* name, Size size, int32_t rowBytes) {
-    return std::string(name) + " of " + std::to_string(size.width) + " x " + std::to_string(size.height) +
-           ", row bytes " + std::to_string(rowBytes);
+    return std::string(name) + " of " + Words(size) + ", row bytes " + std::to_string(rowBytes);
 }
 
 /// Calls twice over different contents of the destination and holds the bytes to be the same, or in
@@ -109,11 +96,11 @@ std::string WordsOfCall(const char* name, Size size, int32_t rowBytes) {
 template <class Function>
 void CheckDestination(ImageMemory& destination, uint32_t state, PK_Result expected, bool mayLeaveBytes,
                       Function call) {
-    const size_t bytes = destination.Layout().rows * destination.Layout().rowLength;
+    const size_t bytes = destination.Layout().Bytes();
     const auto convert = [&](uint8_t before) {
         destination.SetRows(std::vector<uint8_t>(bytes, before));
-        Check(CallIn(state, call) == expected, "the arguments decide the result");
-        Check(destination.IsPaddingIntact(), "bytes outside the rows stay");
+        CheckResult(expected, CallIn(state, call));
+        destination.CheckPadding();
         return destination.Rows();
     };
     const std::vector<uint8_t> once = convert(0x55), again = convert(0xaa);
@@ -131,38 +118,35 @@ bool MayLeaveBytes(const RowsLayout& destination) {
 
 void FuzzBetweenImages(ByteStream& stream, uint32_t state, Size size) {
     const Bridge& bridge = kBridges[stream.Below(std::size(kBridges))];
-    const Size rows = HasRows(size) ? size : Size{0, 0};
+    const Size rows = SizeInMemory(size);
     const bool hasNull = stream.OneIn(32);
     const auto layout = [&](int32_t pixelBytes) {
-        const size_t length = RowLength(pixelBytes, rows.width);
-        return bridge.isOneRun ? RowsLayout{length * static_cast<size_t>(rows.height), 1, 0}
-                               : DrawLayout(stream, length, rows.height);
+        return bridge.isOneRun
+                   ? RowsLayout{RowLength(pixelBytes, rows.width) * static_cast<size_t>(rows.height), 1, 0}
+                   : DrawImage(stream, pixelBytes, rows);
     };
-    ImageMemory source(layout(bridge.sourcePixel), stream);
+    const SourceImage source(layout(bridge.sourcePixel), stream);
     ImageMemory destination(layout(bridge.destinationPixel), stream);
-    const std::vector<uint8_t> content = FillImage(stream, source);
-    SetCall(WordsOfCall(bridge.name, size, destination.Layout().rowBytes));
+    SetCall(WordsOfCall(bridge.name, size, destination.RowBytes()));
 
     const bool reportsNothing = bridge.call == XRGB;
     const bool mayLeaveBytes =
         bridge.leavesBytes || (bridge.destinationPixel == kV210 && MayLeaveBytes(destination.Layout()));
-    CheckDestination(destination, state, reportsNothing ? PK_Success : ExpectedResult(size, hasNull),
+    CheckDestination(destination, state, reportsNothing ? PK_Success : ResultOfRows(size, hasNull),
                      mayLeaveBytes || (reportsNothing && hasNull), [&] {
-                         return bridge.call(hasNull ? nullptr : source.Pixels(), source.Layout().rowBytes,
-                                            destination.Pixels(), destination.Layout().rowBytes, size.width,
+                         return bridge.call(hasNull ? nullptr : source.Pixels(), source.RowBytes(),
+                                            destination.Pixels(), destination.RowBytes(), size.width,
                                             size.height);
                      });
-    CheckSame(content, source.Rows(), "the source stays");
+    source.CheckStays();
 }
 
 void FuzzInPlace(ByteStream& stream, uint32_t state, Size size) {
     const uint32_t which = stream.Below(4);
-    const Size rows = HasRows(size) ? size : Size{0, 0};
     const bool isNull = stream.OneIn(32);
-    ImageMemory image(DrawLayout(stream, RowLength(which == 0 ? 16 : 8, rows.width), rows.height), stream);
-    FillImage(stream, image);
-    SetCall(WordsOfCall("bridge in place", size, image.Layout().rowBytes));
-    const int32_t rowBytes = image.Layout().rowBytes;
+    const SourceImage image(DrawImage(stream, which == 0 ? 16 : 8, SizeInMemory(size)), stream);
+    const int32_t rowBytes = image.RowBytes();
+    SetCall(WordsOfCall("bridge in place", size, rowBytes));
     void* const buffer = isNull ? nullptr : image.Pixels();
     const PK_Result result = CallIn(state, [&] {
         switch (which) {
@@ -174,42 +158,37 @@ void FuzzInPlace(ByteStream& stream, uint32_t state, Size size) {
             return PK_Scale16uBufferTo15uSIMD(buffer, rowBytes, size.width, size.height, which == 2);
         }
     });
-    Check(result == ExpectedResult(size, isNull), "the arguments decide the result");
-    Check(image.IsPaddingIntact(), "bytes outside the rows stay");
+    CheckResult(ResultOfRows(size, isNull), result);
+    image.CheckPadding();
 }
 
 void FuzzPlanes(ByteStream& stream, uint32_t state, Size size) {
     const uint32_t which = stream.Below(4);
     const int32_t field = stream.AnyI32();
-    const Size rows = HasRows(size) ? size : Size{0, 0};
-    const auto plane = [&](int32_t samples) {
-        return DrawLayout(stream, RowLength(2, samples), rows.height);
-    };
-    ImageMemory y(plane(rows.width), stream), u(plane((rows.width + 1) / 2), stream),
-        v(plane((rows.width + 1) / 2), stream);
-    for (ImageMemory* image : {&y, &u, &v}) FillImage(stream, *image);
+    const Size rows = SizeInMemory(size);
+    const RowsLayout luma = {RowLength(2, rows.width), static_cast<size_t>(rows.height)};
+    const RowsLayout chroma = {RowLength(2, (rows.width + 1) / 2), static_cast<size_t>(rows.height)};
+    const Planes source({luma, chroma, chroma}, stream);
     const bool isHalf = which >= 2;
-    const RowsLayout layout =
-        DrawLayout(stream, RowLength(which == 3 ? 4 : kV210, rows.width / (isHalf ? 2 : 1)),
-                   isHalf ? rows.height / 2 : rows.height * (which == 1 ? 2 : 1));
+    const Size written = {rows.width / (isHalf ? 2 : 1),
+                          isHalf ? rows.height / 2 : rows.height * (which == 1 ? 2 : 1)};
+    const RowsLayout layout = DrawImage(stream, which == 3 ? 4 : kV210, written);
     ImageMemory destination(layout, stream);
     SetCall(WordsOfCall("W210 bridge", size, layout.rowBytes));
 
-    const int32_t missing = stream.OneIn(32) ? stream.Between(0, 2) : 3;
-    const void* planes[] = {y.Pixels(), u.Pixels(), v.Pixels(), nullptr};
-    planes[missing] = nullptr;
-    const int32_t rowBytes[] = {y.Layout().rowBytes, u.Layout().rowBytes, v.Layout().rowBytes};
     CheckDestination(
-        destination, state, ExpectedResult(size, missing < 3), which != 3 && MayLeaveBytes(layout), [&] {
+        destination, state, ResultOfRows(size, source.hasNull), which != 3 && MayLeaveBytes(layout), [&] {
             if (which == 3)
-                return PK_ConvertW210toQuarterResVUYX_8u(planes, rowBytes, size.width, size.height,
-                                                         destination.Pixels(), layout.rowBytes, field);
+                return PK_ConvertW210toQuarterResVUYX_8u(source.sources, source.rowBytes, size.width,
+                                                         size.height, destination.Pixels(), layout.rowBytes,
+                                                         field);
             constexpr decltype(&PK_ConvertW210toV210) calls[] = {
                 PK_ConvertW210toV210, PK_TempConvertW210toV210ToReplacePanasonicLTDebayering,
                 PK_QuarterScaleConvertW210toV210};
-            return calls[which](planes, rowBytes, size.width, size.height, destination.Pixels(),
-                                layout.rowBytes);
+            return calls[which](source.sources, source.rowBytes, size.width, size.height,
+                                destination.Pixels(), layout.rowBytes);
         });
+    source.CheckStay();
 }
 
 void FuzzCodecBridges(ByteStream& stream) {

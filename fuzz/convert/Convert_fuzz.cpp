@@ -5,6 +5,7 @@
 #include "support/FloatState.h"
 #include "support/Formats.h"
 #include "support/ImageMemory.h"
+#include "support/Size.h"
 #include "support/Switches.h"
 
 #include "convert/RasterFormats.h"
@@ -20,12 +21,7 @@ namespace {
 
 using namespace PKFuzz;
 
-constexpr int32_t kWidestRow = INT32_MAX / 16; // as documented
 constexpr size_t kLargestImage = size_t{4} << 20;
-
-struct Size {
-    int32_t width, height;
-};
 
 struct Request {
     PK_PixelFormat sourceFormat, destinationFormat;
@@ -62,7 +58,7 @@ Request DrawRequest(ByteStream& stream) {
     request.sourceFormat = DrawFormat(stream);
     request.destinationFormat = stream.OneIn(8) ? request.sourceFormat : DrawFormat(stream);
     request.size = DrawSize(stream);
-    request.quality = stream.OneIn(8) ? stream.AnyI32() : stream.Between(0, 5);
+    request.quality = stream.BetweenOrAny(0, 5, 8);
     request.nullSource = stream.OneIn(64);
     request.nullDestination = stream.OneIn(64);
     return request;
@@ -71,19 +67,15 @@ Request DrawRequest(ByteStream& stream) {
 std::string WordsOfCall(const Request& request, const RowsLayout& source, const RowsLayout& destination) {
     return "PK_Convert of " + Words(request.sourceFormat) + ", row bytes " + std::to_string(source.rowBytes) +
            " to " + Words(request.destinationFormat) + ", row bytes " + std::to_string(destination.rowBytes) +
-           ", " + std::to_string(request.size.width) + " x " + std::to_string(request.size.height) +
-           ", quality " + std::to_string(request.quality) + (request.nullSource ? ", null source" : "") +
+           ", " + Words(request.size) + ", quality " + std::to_string(request.quality) +
+           (request.nullSource ? ", null source" : "") +
            (request.nullDestination ? ", null destination" : "");
 }
 
 /// The bytes that a call may touch of a raster image; none where it must be refused or does nothing.
 RowsLayout DrawRaster(ByteStream& stream, PK_PixelFormat format, Size size) {
-    if (!PK::IsRasterFormat(format) || size.height < 1 || size.width < 1 || size.width > kWidestRow)
-        return {0, 0, stream.AnyI32()};
-    const size_t rowLength = static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, size.width));
-    const size_t rows = static_cast<size_t>(size.height);
-    const int32_t usual = PK_PixelFormatRowBytes(format, size.width);
-    return {rowLength, rows, DrawRowBytes(stream, rowLength, rows, usual)};
+    if (!PK::IsRasterFormat(format)) return {0, 0, stream.AnyI32()};
+    return DrawLayout(stream, int64_t{PK_PixelFormatPackedRowBytes(format, size.width)}, size);
 }
 
 /// A stream that only its row bytes tell the length of: the number says neither DV nor planar 4:2:0.
@@ -101,7 +93,7 @@ RowsLayout DrawStream(ByteStream& stream, PK_PixelFormat format, Size size) {
     return {static_cast<size_t>(std::max<int64_t>(bytes, 0)), 1, stream.AnyI32()};
 }
 
-RowsLayout DrawLayout(ByteStream& stream, PK_PixelFormat format, Size size) {
+RowsLayout DrawImage(ByteStream& stream, PK_PixelFormat format, Size size) {
     return PK::IsStream(format) ? DrawStream(stream, format, size) : DrawRaster(stream, format, size);
 }
 
@@ -112,13 +104,10 @@ bool IsAffordable(const RowsLayout& layout) {
 
 /// The result, where the arguments alone decide it.
 std::optional<PK_Result> ExpectedResult(const Request& request) {
-    const auto [width, height] = request.size;
     if (!IsKnown(request.sourceFormat)) return PK_ErrBadSrcFormat;
     if (!IsKnown(request.destinationFormat)) return PK_ErrBadDstFormat;
     if (PK::IsStream(request.sourceFormat) || PK::IsStream(request.destinationFormat)) return std::nullopt;
-    if (height < 1 || width == 0) return PK_Success;
-    if (width < 0 || width > kWidestRow) return PK_ErrFailed;
-    return request.nullSource || request.nullDestination ? PK_ErrFailed : PK_Success;
+    return ResultOfRows(request.size, request.nullSource || request.nullDestination);
 }
 
 /// Words of 15 bits that come from bytes are deliberately truncated up to the first 16-byte boundary of a row
@@ -136,18 +125,18 @@ struct Outcome {
 Outcome Convert(const Request& request, uint32_t state, const ImageMemory& source, ImageMemory& destination,
                 uint8_t before) {
     const RowsLayout& layout = destination.Layout();
-    const std::vector<uint8_t> untouched(layout.rows * layout.rowLength, before);
+    const std::vector<uint8_t> untouched(layout.Bytes(), before);
     destination.SetRows(untouched);
     const PK_Result result = CallIn(state, [&] {
-        return PK_Convert(request.nullSource ? nullptr : source.Pixels(), source.Layout().rowBytes,
+        return PK_Convert(request.nullSource ? nullptr : source.Pixels(), source.RowBytes(),
                           request.sourceFormat, request.nullDestination ? nullptr : destination.Pixels(),
                           layout.rowBytes, request.destinationFormat, request.size.width, request.size.height,
                           request.quality);
     });
     CheckIsNamed(result);
     const std::optional<PK_Result> expected = ExpectedResult(request);
-    Check(!expected || result == *expected, "the arguments decide the result");
-    Check(destination.IsPaddingIntact(), "bytes outside the rows stay");
+    if (expected) CheckResult(*expected, result);
+    destination.CheckPadding();
     Outcome outcome{result, destination.Rows()};
     if (expected && result != PK_Success) CheckSame(untouched, outcome.rows, "a refused call writes nothing");
     return outcome;
@@ -162,21 +151,18 @@ void FuzzConvert(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
     const uint32_t state = DrawFloatState(stream);
     const Request request = DrawRequest(stream);
-    const RowsLayout sourceLayout = DrawLayout(stream, request.sourceFormat, request.size);
+    const RowsLayout sourceLayout = DrawImage(stream, request.sourceFormat, request.size);
     const auto drawDestination = [&] {
         if (request.sourceFormat == request.destinationFormat && (MustShareLayout(request) || stream.Bool()))
             return sourceLayout;
-        return DrawLayout(stream, request.destinationFormat, request.size);
+        return DrawImage(stream, request.destinationFormat, request.size);
     };
     const RowsLayout firstLayout = drawDestination();
     const RowsLayout secondLayout = drawDestination();
     if (!IsAffordable(sourceLayout) || !IsAffordable(firstLayout) || !IsAffordable(secondLayout)) return;
     SetCall(WordsOfCall(request, sourceLayout, firstLayout));
 
-    ImageMemory source(sourceLayout, stream);
-    std::vector<uint8_t> content(sourceLayout.rows * sourceLayout.rowLength);
-    stream.Fill(content.data(), content.size());
-    source.SetRows(content);
+    const SourceImage source(sourceLayout, stream);
     ImageMemory first(firstLayout, stream);
     ImageMemory second(secondLayout, stream);
     const bool isPlaceFree = !MustShareLayout(request) && !DependsOnPlace(request.destinationFormat);
@@ -186,8 +172,7 @@ void FuzzConvert(ByteStream& stream) {
     Check(once.result == again.result, "the same call has the same result");
     if (once.result == PK_Success)
         CheckSame(once.rows, again.rows, "every byte of the rows is written, and the same wherever they lie");
-    CheckSame(content, source.Rows(), "the source stays");
-    Check(source.IsPaddingIntact(), "what lies between the rows of the source stays");
+    source.CheckStays();
 }
 
 const Family sFamily('c', "convert", FuzzConvert);

@@ -6,6 +6,7 @@
 #include "support/FloatState.h"
 #include "support/Formats.h"
 #include "support/ImageMemory.h"
+#include "support/Size.h"
 #include "support/Switches.h"
 
 #include "convert/RasterFormats.h"
@@ -23,13 +24,12 @@ namespace {
 
 using namespace PKFuzz;
 
-constexpr int32_t kWidestRow = INT32_MAX / 16; // as documented
 constexpr size_t kLargestImage = size_t{8} << 20;
 
 struct Request {
     uint32_t fill; // one of the named ones, or by colour
     PK_PixelFormat format;
-    int32_t width, height;
+    Size size;
     bool isNull;
     PK_PixelFormat pixelFormat;
     uint8_t pixel[16];
@@ -43,8 +43,8 @@ Request DrawRequest(ByteStream& stream) {
     Request request{};
     request.fill = stream.Below(kColour + 2);
     request.format = DrawFormat(stream);
-    request.width = stream.OneIn(16) ? stream.AnyI32() : stream.Between(0, stream.OneIn(8) ? 3000 : 90);
-    request.height = stream.OneIn(16) ? stream.AnyI32() : stream.Between(0, stream.OneIn(8) ? 300 : 5);
+    request.size.width = stream.OneIn(16) ? stream.AnyI32() : stream.Between(0, stream.OneIn(8) ? 3000 : 90);
+    request.size.height = stream.OneIn(16) ? stream.AnyI32() : stream.Between(0, stream.OneIn(8) ? 300 : 5);
     request.isNull = stream.OneIn(32);
     request.pixelFormat = DrawFormat(stream);
     stream.Fill(request.pixel, sizeof request.pixel);
@@ -53,31 +53,31 @@ Request DrawRequest(ByteStream& stream) {
 
 std::string WordsOfCall(const Request& request, int32_t rowBytes) {
     return "fill " + std::to_string(request.fill) + " of " + Words(request.format) + ", row bytes " +
-           std::to_string(rowBytes) + ", " + std::to_string(request.width) + " x " +
-           std::to_string(request.height) + ", pixel of " + Words(request.pixelFormat) +
-           (request.isNull ? ", null buffer" : "");
+           std::to_string(rowBytes) + ", " + Words(request.size) + ", pixel of " +
+           Words(request.pixelFormat) + (request.isNull ? ", null buffer" : "");
 }
 
 /// Memory for as much as a fill may touch; none where it may touch nothing.
-RowsLayout DrawLayout(ByteStream& stream, const Request& request) {
-    if (request.width < 1 || request.width > kWidestRow || request.height < 1) return {0, 0, stream.AnyI32()};
+RowsLayout DrawImage(ByteStream& stream, const Request& request) {
+    if (!request.size.HasPixels()) return {0, 0, stream.AnyI32()};
+    const auto [width, height] = request.size;
     if (PK::Is420Planar(request.format)) {
-        const int64_t bytes = PK_PixelFormatSize(request.format, request.width, request.height);
+        const int64_t bytes = PK_PixelFormatSize(request.format, width, height);
         return {static_cast<size_t>(std::max<int64_t>(bytes, 0)), 1, stream.AnyI32()};
     }
     if (PK::IsStream(request.format)) return {0, 0, stream.AnyI32()};
-    const auto rowLength = static_cast<size_t>(PK_PixelFormatPackedRowBytes(request.format, request.width));
-    const auto rows = static_cast<size_t>(request.height);
+    const auto rowLength = static_cast<size_t>(PK_PixelFormatPackedRowBytes(request.format, width));
+    const auto rows = static_cast<size_t>(height);
     if (rowLength > kLargestImage || rows > kLargestImage) return {kLargestImage + 1, 1, 0};
-    const int32_t usual = PK_PixelFormatRowBytes(request.format, request.width);
-    return {rowLength, rows, DrawRowBytes(stream, rowLength, rows, usual)};
+    return DrawLayout(stream, rowLength, rows);
 }
 
 PK_Result Call(const Request& request, void* buffer, int32_t rowBytes) {
     if (request.fill < kColour)
-        return kNamed[request.fill](buffer, rowBytes, request.width, request.height, request.format);
-    return PK_FillWithColor(buffer, rowBytes, request.width, request.height, request.format, request.pixel,
-                            request.pixelFormat);
+        return kNamed[request.fill](buffer, rowBytes, request.size.width, request.size.height,
+                                    request.format);
+    return PK_FillWithColor(buffer, rowBytes, request.size.width, request.size.height, request.format,
+                            request.pixel, request.pixelFormat);
 }
 
 /// Every unit of a row is the first one; the bytes of an incomplete pair stay.
@@ -86,7 +86,7 @@ void CheckRepeats(const Request& request, const std::vector<uint8_t>& rows, size
     const bool isPair = PK::Is422(request.format);
     const size_t depth = static_cast<size_t>(PK::BytesPerPixel(request.format));
     const size_t unit = isPair ? 2 * depth : depth;
-    const size_t filled = static_cast<size_t>(isPair ? request.width / 2 : request.width) * unit;
+    const size_t filled = static_cast<size_t>(isPair ? request.size.width / 2 : request.size.width) * unit;
     for (size_t row = 0; row < rows.size(); row += rowLength)
         for (size_t i = 0; i < rowLength; ++i)
             Check(rows[row + i] == (i < filled ? rows[i % unit] : before), "a row repeats one unit");
@@ -101,21 +101,20 @@ void FuzzFills(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
     const uint32_t state = DrawFloatState(stream);
     const Request request = DrawRequest(stream);
-    const RowsLayout layout = DrawLayout(stream, request);
+    const RowsLayout layout = DrawImage(stream, request);
     if (layout.rows != 0 && layout.Extent() > kLargestImage) return;
     SetCall(WordsOfCall(request, layout.rowBytes));
 
     ImageMemory image(layout, stream);
     const uint8_t before = stream.Byte();
-    const std::vector<uint8_t> untouched(layout.rows * layout.rowLength, before);
+    const std::vector<uint8_t> untouched(layout.Bytes(), before);
     image.SetRows(untouched);
     const PK_Result result = CallIn(
         state, [&] { return Call(request, request.isNull ? nullptr : image.Pixels(), layout.rowBytes); });
     CheckIsNamed(result);
-    Check(image.IsPaddingIntact(), "bytes outside the rows stay");
+    image.CheckPadding();
     const std::vector<uint8_t> rows = image.Rows();
-    const bool isImpossible = request.width < 0 || request.width > kWidestRow || request.height < 0;
-    if (isImpossible || request.isNull)
+    if (!request.size.IsPossible() || request.isNull)
         CheckSame(untouched, rows, "what is impossible writes nothing");
     else if (result == PK_Success && IsOfUnits(request.format))
         CheckRepeats(request, rows, layout.rowLength, before);

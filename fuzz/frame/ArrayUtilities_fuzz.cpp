@@ -4,6 +4,7 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/ImageMemory.h"
+#include "support/Size.h"
 #include "support/Switches.h"
 
 #include <PixelKiln/Utilities.h>
@@ -30,26 +31,22 @@ size_t Bytes(int32_t count, size_t elementBytes) {
 /// Two arrays of their own, the source filled.
 struct Arrays {
     Arrays(ByteStream& stream, size_t sourceBytes, size_t resultBytes)
-        : source({sourceBytes, 1, 0}, stream), result({resultBytes, 1, 0}, stream), content(sourceBytes) {
-        stream.Fill(content.data(), content.size());
-        source.SetRows(content);
-    }
+        : source({sourceBytes, 1, 0}, stream), result({resultBytes, 1, 0}, stream) {}
 
     void CheckAround(PK_Result outcome, PK_Result expected) const {
-        Check(outcome == expected, "the arguments decide the result");
-        CheckSame(content, source.Rows(), "the source stays");
-        Check(source.IsPaddingIntact() && result.IsPaddingIntact(), "nothing in front is written");
+        CheckResult(expected, outcome);
+        source.CheckStays();
+        result.CheckPadding();
     }
 
-    ImageMemory source, result;
-    std::vector<uint8_t> content;
+    SourceImage source;
+    ImageMemory result;
 };
 
 template <class Integer, class Function>
 void ConvertFloats(ByteStream& stream, uint32_t state, Function convert, const char* name) {
-    const int32_t count = DrawCount(stream),
-                  rounding = stream.OneIn(4) ? stream.AnyI32() : stream.Between(0, 1);
-    const int32_t scale = stream.OneIn(4) ? stream.AnyI32() : stream.Between(-40, 40);
+    const int32_t count = DrawCount(stream), rounding = stream.BetweenOrAny(0, 1, 4);
+    const int32_t scale = stream.BetweenOrAny(-40, 40, 4);
     SetCall(std::string(name) + " of " + std::to_string(count) + ", rounding " + std::to_string(rounding) +
             ", scale " + std::to_string(scale));
     const Arrays arrays(stream, Bytes(count, sizeof(float)), Bytes(count, sizeof(Integer)));
@@ -61,7 +58,7 @@ void ConvertFloats(ByteStream& stream, uint32_t state, Function convert, const c
     for (int32_t i = 0; i < count; ++i) {
         float x;
         Integer integer;
-        std::memcpy(&x, arrays.content.data() + Bytes(i, sizeof x), sizeof x);
+        std::memcpy(&x, arrays.source.Content().data() + Bytes(i, sizeof x), sizeof x);
         std::memcpy(&integer, arrays.result.Pixels() + Bytes(i, sizeof integer), sizeof integer);
         const bool isPositive = !std::isnan(x) && x > 0, isNegative = !std::isnan(x) && x < 0;
         Check((integer <= 0 || isPositive) && (integer >= 0 || isNegative), "the sign stays");
@@ -80,39 +77,30 @@ void DecodeALaw(ByteStream& stream, uint32_t state) {
     for (int32_t i = 0; i < count; ++i) {
         int16_t sample;
         std::memcpy(&sample, arrays.result.Pixels() + Bytes(i, 2), sizeof sample);
-        const uint8_t code = arrays.content[static_cast<size_t>(i)];
+        const uint8_t code = arrays.source.Content()[static_cast<size_t>(i)];
         Check((sample > 0) == ((code & 0x80) != 0) && sample % 8 == 0 && sample != 0, "samples of the law");
     }
 }
 
 void Multiply(ByteStream& stream, uint32_t state) {
-    const int32_t width = DrawCount(stream), height = stream.Between(-1, 4);
-    const int32_t scale = stream.OneIn(4) ? stream.AnyI32() : stream.Between(-9, 18);
+    const Size size = {DrawCount(stream), stream.Between(-1, 4)};
+    const int32_t scale = stream.BetweenOrAny(-9, 18, 4);
     uint8_t constants[4];
     stream.Fill(constants, sizeof constants);
-    SetCall("PK_MultiplyByConstant of " + std::to_string(width) + " x " + std::to_string(height) +
-            ", scale " + std::to_string(scale));
-    const bool isPossible = width >= 0 && height >= 0, isEmpty = width == 0 || height == 0;
-    const size_t rows = isPossible && !isEmpty ? static_cast<size_t>(height) : 0;
-    const auto layout = [&] {
-        const size_t length = rows == 0 ? 0 : Bytes(width, 4);
-        return RowsLayout{length, rows,
-                          DrawRowBytes(stream, length, rows, static_cast<int32_t>(length) + 60)};
-    };
-    ImageMemory source(layout(), stream), result(layout(), stream);
-    std::vector<uint8_t> content(rows * source.Layout().rowLength);
-    stream.Fill(content.data(), content.size());
-    source.SetRows(content);
+    SetCall("PK_MultiplyByConstant of " + Words(size) + ", scale " + std::to_string(scale));
+    const auto layout = [&] { return DrawLayout(stream, int64_t{4} * size.width, size); };
+    const SourceImage source(layout(), stream);
+    ImageMemory result(layout(), stream);
     const PK_Result outcome = CallIn(state, [&] {
-        return PK_MultiplyByConstant(width, height, source.Pixels(), source.Layout().rowBytes,
-                                     result.Pixels(), result.Layout().rowBytes, constants, scale);
+        return PK_MultiplyByConstant(size.width, size.height, source.Pixels(), source.RowBytes(),
+                                     result.Pixels(), result.RowBytes(), constants, scale);
     });
-    Check(outcome == (isPossible ? PK_Success : PK_ErrFailed), "the arguments decide the result");
-    CheckSame(content, source.Rows(), "the source stays");
-    Check(source.IsPaddingIntact() && result.IsPaddingIntact(), "bytes outside the rows stay");
+    CheckResult(size.IsPossible() ? PK_Success : PK_ErrFailed, outcome);
+    source.CheckStays();
+    result.CheckPadding();
     const std::vector<uint8_t> products = result.Rows();
     for (size_t i = 0; i < products.size(); ++i)
-        Check(content[i] * constants[i % 4] != 0 || products[i] == 0, "a product with 0 is 0");
+        Check(source.Content()[i] * constants[i % 4] != 0 || products[i] == 0, "a product with 0 is 0");
 }
 
 void FuzzArrayUtilities(ByteStream& stream) {

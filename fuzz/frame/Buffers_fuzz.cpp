@@ -78,7 +78,7 @@ bool IsWorthAsking(PK_PixelFormat format, int32_t width, int32_t height) {
 
 /// The length of a side: small, or any.
 int32_t DrawSide(ByteStream& stream) {
-    return stream.OneIn(4) ? stream.AnyI32() : stream.Between(0, 400);
+    return stream.BetweenOrAny(0, 400, 4);
 }
 
 std::optional<Held> TakeImage(ByteStream& stream, uint32_t state) {
@@ -129,12 +129,13 @@ void FindPlanes(ByteStream& stream, uint32_t state) {
     const int32_t width = DrawSide(stream);
     const int32_t height = DrawSide(stream);
     SetCall("PK_GetPlanarBuffers of " + std::to_string(width) + " x " + std::to_string(height));
-    uint8_t block = 0;
+    uint8_t byte = 0;
+    uint8_t* const block = stream.OneIn(8) ? nullptr : &byte; // never touched
     void* planes[3] = {nullptr, nullptr, nullptr};
     int32_t rowBytes[3] = {-1, -1, -1};
     const PK_PixelFormat format = DrawFormat(stream);
     const PK_Result result =
-        CallIn(state, [&] { return PK_GetPlanarBuffers(&block, format, width, height, planes, rowBytes); });
+        CallIn(state, [&] { return PK_GetPlanarBuffers(block, format, width, height, planes, rowBytes); });
     Check(result == (width < 0 || height < 0 ? PK_ErrFailed : PK_Success), "only negative sizes fail");
     if (result != PK_Success) {
         Check(!planes[0] && !planes[1] && !planes[2] && rowBytes[0] == -1, "a failure writes nothing");
@@ -144,7 +145,7 @@ void FindPlanes(ByteStream& stream, uint32_t state) {
     if (size > kAffordable) return; // there, offsets wrap
     const auto offset = [&](int plane) {
         return static_cast<int64_t>(reinterpret_cast<uintptr_t>(planes[plane]) -
-                                    reinterpret_cast<uintptr_t>(&block));
+                                    reinterpret_cast<uintptr_t>(block));
     };
     const int64_t rows = (int64_t{height} + 31) / 32 * 32;
     Check(offset(0) == 0 && offset(1) == rowBytes[0] * rows, "U lies behind Y");

@@ -9,7 +9,6 @@
 
 #include <PixelKiln/QuadWarp.h>
 
-#include <bit>
 #include <string>
 #include <vector>
 
@@ -29,9 +28,7 @@ struct Part {
         // What exceeds whole pixels does not count, nor does the sign.
         rowBytes = 4 * stride + stream.Between(0, 3);
         if (stream.Bool()) rowBytes = -rowBytes;
-        std::vector<uint8_t> content(size_t{4} * static_cast<size_t>(width) * static_cast<size_t>(height));
-        stream.Fill(content.data(), content.size());
-        memory.SetRows(content);
+        content = memory.DrawRows(stream);
     }
 
     /// Pixel (0, 0), which need not lie in the memory.
@@ -44,14 +41,15 @@ struct Part {
     PK_Rect rect;
     int32_t width, height, stride, rowBytes = 0;
     ImageMemory memory;
+    std::vector<uint8_t> content;
 };
 
 double DrawCoordinate(ByteStream& stream, int32_t low, int32_t high) {
     switch (stream.Below(32)) {
     case 31:
-        return std::bit_cast<double>(stream.U64());
+        return stream.AnyDouble();
     case 30:
-        return std::bit_cast<float>(stream.U32());
+        return stream.AnyFloat();
     case 29:
         return stream.AnyI32();
     case 28:
@@ -70,8 +68,7 @@ void DrawQuad(ByteStream& stream, const PK_Rect& rect, double quad[8]) {
 
 float DrawFeather(ByteStream& stream) {
     if (stream.Bool()) return 0;
-    return stream.OneIn(8) ? std::bit_cast<float>(stream.U32())
-                           : static_cast<float>(stream.Between(-10, 300)) / 10;
+    return stream.OneIn(8) ? stream.AnyFloat() : static_cast<float>(stream.Between(-10, 300)) / 10;
 }
 
 PK_PixelFormat DrawWarpFormat(ByteStream& stream) {
@@ -81,14 +78,10 @@ PK_PixelFormat DrawWarpFormat(ByteStream& stream) {
 
 struct Request {
     Request(ByteStream& stream, const PK_Rect& source, const PK_Rect& destination)
-        : sourceRect(source), destinationRect(destination),
-          quality(stream.OneIn(8) ? stream.AnyI32() : stream.Between(0, 5)),
-          opacity(stream.Bool()     ? 255
-                  : stream.OneIn(8) ? stream.AnyI32()
-                                    : stream.Between(0, 255)),
-          blend(stream.Bool()), keepSourceAlpha(stream.Bool()), ignoreFields(stream.Bool()),
-          featherOver(stream.OneIn(3)), format(DrawWarpFormat(stream)),
-          field(stream.OneIn(16) ? stream.AnyI32() : stream.Between(0, 2)), feather(DrawFeather(stream)) {
+        : sourceRect(source), destinationRect(destination), quality(stream.BetweenOrAny(0, 5, 8)),
+          opacity(stream.Bool() ? 255 : stream.BetweenOrAny(0, 255, 8)), blend(stream.Bool()),
+          keepSourceAlpha(stream.Bool()), ignoreFields(stream.Bool()), featherOver(stream.OneIn(3)),
+          format(DrawWarpFormat(stream)), field(stream.BetweenOrAny(0, 2, 16)), feather(DrawFeather(stream)) {
         DrawQuad(stream, source, sourceQuad);
         DrawQuad(stream, destination, destinationQuad);
         if (stream.OneIn(32)) sourceRect.right = sourceRect.left - stream.Between(0, 3);
@@ -130,7 +123,7 @@ std::vector<uint8_t> Warp(const Request& request, uint32_t state, const Part& so
                                  request.field, request.ignoreFields, request.featherOver, request.feather);
     });
     Check(result == PK_Success, "every quadrilateral is drawn or left out");
-    Check(destination.memory.IsPaddingIntact(), "bytes outside the rectangle stay");
+    destination.memory.CheckPadding();
     return destination.memory.Rows();
 }
 
@@ -142,15 +135,14 @@ void FuzzWarp(ByteStream& stream) {
     const Request request(stream, source.rect, destination.rect);
     SetCall(WordsOfCall(request));
 
-    const std::vector<uint8_t> content = source.memory.Rows(), before = destination.memory.Rows();
     SetSwitches(switches);
     const std::vector<uint8_t> drawn = Warp(request, state, source, destination);
-    destination.memory.SetRows(before);
+    destination.memory.SetRows(destination.content);
     SetSwitches(Switches{});
     CheckSame(Warp(request, state, source, destination), drawn, "capabilities do not change a pixel");
-    CheckSame(content, source.memory.Rows(), "the source stays");
+    CheckSame(source.content, source.memory.Rows(), "the source stays");
     if (request.field < 0 || request.field > 2)
-        CheckSame(before, drawn, "of a field that there is not no row is written");
+        CheckSame(destination.content, drawn, "of a field that there is not no row is written");
 }
 
 const Family sFamily('w', "warp", FuzzWarp);

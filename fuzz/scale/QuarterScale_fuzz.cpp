@@ -4,6 +4,8 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/ImageMemory.h"
+#include "support/Planes.h"
+#include "support/Size.h"
 #include "support/Switches.h"
 
 #include "frame/Capabilities.h"
@@ -11,94 +13,57 @@
 #include <PixelKiln/Planar.h>
 #include <PixelKiln/QuarterScale.h>
 
-#include <algorithm>
-#include <memory>
 #include <string>
 
 namespace {
 
 using namespace PKFuzz;
 
-/// Three planes and how a call gets them; now and then one of them as null.
-struct Planes {
-    std::unique_ptr<ImageMemory> memory[3];
-    void* pointers[3];
-    const void* sources[3];
-    int32_t rowBytes[3];
-    bool hasNull = false; // where there are samples
-
-    Planes(const RowsLayout (&extents)[3], ByteStream& stream) {
-        for (int i = 0; i < 3; ++i) {
-            RowsLayout layout = extents[i];
-            if (layout.rowLength == 0) layout.rows = 0;
-            layout.rowBytes = DrawRowBytes(stream, layout.rowLength, layout.rows, 0);
-            memory[i] = std::make_unique<ImageMemory>(layout, stream);
-            std::vector<uint8_t> content(layout.rowLength * layout.rows);
-            stream.Fill(content.data(), content.size());
-            memory[i]->SetRows(content);
-            const bool isNull = stream.OneIn(64);
-            hasNull = hasNull || (isNull && layout.rows != 0);
-            sources[i] = pointers[i] = isNull ? nullptr : memory[i]->Pixels();
-            rowBytes[i] = layout.rowBytes;
-        }
-    }
-
-    bool ArePaddingsIntact() const {
-        return std::all_of(memory, memory + 3, [](const auto& plane) { return plane->IsPaddingIntact(); });
-    }
-};
-
-struct Size {
-    uint32_t width, height;
-};
-
 Size DrawSize(ByteStream& stream) {
-    return {stream.Below(stream.OneIn(8) ? 1500 : 140), stream.Below(12)};
+    return {stream.Between(0, stream.OneIn(8) ? 1499 : 139), stream.Between(0, 11)};
 }
 
-std::string Words(const char* call, Size size, int32_t field) {
-    return std::string(call) + " of " + std::to_string(size.width) + " x " + std::to_string(size.height) +
-           ", field " + std::to_string(field);
+std::string WordsOfCall(const char* call, Size size, int32_t field) {
+    return std::string(call) + " of " + Words(size) + ", field " + std::to_string(field);
 }
 
 /// Sizes beyond 32 signed bits are refused without a look at memory.
 void RefuseSizes(ByteStream& stream, uint32_t state) {
-    const Size size = {stream.U32() | 0x80000000u, stream.U32()};
+    const uint32_t most = stream.U32() | 0x80000000u, other = stream.U32();
     const int32_t field = stream.Between(1, 2);
-    SetCall(Words("reductions", size, field));
+    SetCall("reductions of " + std::to_string(most) + " and " + std::to_string(other) + " samples");
     Planes planes({{}, {}, {}}, stream);
     Check(CallIn(state,
                  [&] {
                      return PK_QuarterScalePlanar420_8u(planes.sources, planes.rowBytes, planes.pointers,
-                                                        planes.rowBytes, size.width, size.height, field);
+                                                        planes.rowBytes, most, other, field);
                  }) == PK_ErrFailed,
           "a width beyond 31 bits is refused");
     Check(CallIn(state,
                  [&] {
-                     return PK_QuarterScalePlanar_8uAndConvertTo422_8u(
-                         planes.sources, planes.rowBytes, planes.pointers[0], 0, size.height | 1u, size.width,
-                         true, field);
+                     return PK_QuarterScalePlanar_8uAndConvertTo422_8u(planes.sources, planes.rowBytes,
+                                                                       planes.pointers[0], 0, other | 1u,
+                                                                       most, true, field);
                  }) == PK_ErrFailed,
           "a height beyond 31 bits is refused");
 }
 
 void CopyPlanes(ByteStream& stream, uint32_t state) {
     const Size size = DrawSize(stream);
-    const size_t width = size.width, height = size.height;
-    SetCall(Words("PK_CopyPlanar_8u", size, 0));
+    const auto width = static_cast<size_t>(size.width), height = static_cast<size_t>(size.height);
+    SetCall(WordsOfCall("PK_CopyPlanar_8u", size, 0));
     const RowsLayout extents[3] = {{width, height}, {width / 2, height / 2}, {width / 2, height / 2}};
     const Planes from(extents, stream), to(extents, stream);
     const PK_Result result = CallIn(state, [&] {
-        return PK_CopyPlanar_8u(from.sources, from.rowBytes, to.pointers, to.rowBytes,
-                                static_cast<int32_t>(width), static_cast<int32_t>(height));
+        return PK_CopyPlanar_8u(from.sources, from.rowBytes, to.pointers, to.rowBytes, size.width,
+                                size.height);
     });
-    const bool doesNothing = width == 0 || height == 0;
-    const bool isRefused = !doesNothing && (from.hasNull || to.hasNull);
-    Check(result == (isRefused ? PK_ErrFailed : PK_Success), "only null planes fail");
-    Check(to.ArePaddingsIntact(), "bytes outside the rows stay");
-    if (isRefused) return;
+    CheckResult(ResultOfRows(size, from.hasNull || to.hasNull), result);
+    to.CheckPadding();
+    from.CheckStay();
+    if (result != PK_Success) return;
     for (int i = 0; i < 3; ++i)
-        CheckSame(from.memory[i]->Rows(), to.memory[i]->Rows(), "the copy is the original");
+        CheckSame(from.memory[i].Content(), to.memory[i].Rows(), "the copy is the original");
 }
 
 size_t WrittenSamples(size_t width) {
@@ -107,59 +72,62 @@ size_t WrittenSamples(size_t width) {
 
 void ReducePlanes(ByteStream& stream, uint32_t state) {
     const Size size = DrawSize(stream);
-    const int32_t field = stream.OneIn(8) ? stream.AnyI32() : stream.Between(1, 2);
-    SetCall(Words("PK_QuarterScalePlanar420_8u", size, field));
-    const size_t luma = WrittenSamples(size.width), chroma = WrittenSamples(size.width / 2);
-    const size_t half = size.height / 2, quarter = size.height / 4;
+    const int32_t field = stream.BetweenOrAny(1, 2, 8);
+    SetCall(WordsOfCall("PK_QuarterScalePlanar420_8u", size, field));
+    const auto width = static_cast<size_t>(size.width), height = static_cast<size_t>(size.height);
+    const size_t luma = WrittenSamples(width), chroma = WrittenSamples(width / 2);
+    const size_t half = height / 2, quarter = height / 4;
     const Planes from({{2 * luma, 2 * half}, {2 * chroma, 2 * quarter}, {2 * chroma, 2 * quarter}}, stream);
     const Planes to({{luma, half}, {chroma, quarter}, {chroma, quarter}}, stream);
     const PK_Result result = CallIn(state, [&] {
         return PK_QuarterScalePlanar420_8u(from.sources, from.rowBytes, to.pointers, to.rowBytes, size.width,
                                            size.height, field);
     });
-    Check(to.ArePaddingsIntact(), "bytes outside the rows stay");
+    to.CheckPadding();
+    from.CheckStay();
     if (field != 1 && field != 2) {
         Check(result == PK_ErrBadFieldType, "other fields are refused");
         return;
     }
-    const bool isRefused = from.hasNull || to.hasNull;
-    Check(result == (isRefused ? PK_ErrFailed : PK_Success), "only null planes fail");
-    if (isRefused) return;
+    CheckResult(from.hasNull || to.hasNull ? PK_ErrFailed : PK_Success, result);
+    if (result != PK_Success) return;
     for (int i = 0; i < 3; ++i) {
-        const std::vector<uint8_t> source = from.memory[i]->Rows();
+        const std::vector<uint8_t>& source = from.memory[i].Content();
         const size_t samples = i == 0 ? luma : chroma, firstRow = i == 0 && field == 2 ? 1 : 0;
         std::vector<uint8_t> expected;
         for (size_t row = firstRow; row < 2 * (i == 0 ? half : quarter); row += 2)
             for (size_t k = 0; k < samples; ++k) expected.push_back(source[row * 2 * samples + 2 * k]);
-        CheckSame(expected, to.memory[i]->Rows(), "every other sample of every other row");
+        CheckSame(expected, to.memory[i].Rows(), "every other sample of every other row");
     }
 }
 
 void PackPlanes(ByteStream& stream, uint32_t state) {
     const Size size = DrawSize(stream);
-    const int32_t field = stream.OneIn(8) ? stream.AnyI32() : stream.Between(0, 2);
+    const int32_t field = stream.BetweenOrAny(0, 2, 8);
     const bool yuyv = stream.Bool();
-    SetCall(Words("PK_QuarterScalePlanar_8uAndConvertTo422_8u", size, field));
-    const size_t width = size.width, pairs = (width + 1) / 2, rows = size.height / 2;
+    SetCall(WordsOfCall("PK_QuarterScalePlanar_8uAndConvertTo422_8u", size, field));
+    const auto width = static_cast<size_t>(size.width), rows = static_cast<size_t>(size.height / 2);
+    const size_t pairs = (width + 1) / 2;
     const Planes from({{width, 2 * rows}, {pairs, rows}, {pairs, rows}}, stream);
     const size_t packedRows = width == 0 ? 0 : rows;
-    ImageMemory packed({4 * pairs, packedRows, DrawRowBytes(stream, 4 * pairs, packedRows, 0)}, stream);
+    ImageMemory packed(DrawLayout(stream, 4 * pairs, packedRows), stream);
     const PK_Result result = CallIn(state, [&] {
         return PK_QuarterScalePlanar_8uAndConvertTo422_8u(from.sources, from.rowBytes, packed.Pixels(),
-                                                          packed.Layout().rowBytes, size.width, size.height,
-                                                          yuyv, field);
+                                                          packed.RowBytes(), size.width, size.height, yuyv,
+                                                          field);
     });
-    Check(packed.IsPaddingIntact(), "bytes outside the rows stay");
-    Check(result == (from.hasNull ? PK_ErrFailed : PK_Success), "only null planes fail");
+    packed.CheckPadding();
+    from.CheckStay();
+    CheckResult(from.hasNull ? PK_ErrFailed : PK_Success, result);
     if (from.hasNull) return;
-    const std::vector<uint8_t> luma = from.memory[0]->Rows();
-    const std::vector<uint8_t> chroma[2] = {from.memory[1]->Rows(), from.memory[2]->Rows()};
+    const std::vector<uint8_t>& luma = from.memory[0].Content();
+    const std::vector<uint8_t>* chroma[2] = {&from.memory[1].Content(), &from.memory[2].Content()};
     std::vector<uint8_t> expected;
     for (size_t row = 0; row < packedRows; ++row)
         for (size_t column = 0; column < 2 * pairs; ++column) {
             const size_t lumaRow = 2 * row + (field == 2 ? 1 : 0);
             const uint8_t y = column < width ? luma[lumaRow * width + column] : uint8_t{0};
-            const uint8_t c = chroma[column % 2][row * pairs + column / 2];
+            const uint8_t c = (*chroma[column % 2])[row * pairs + column / 2];
             expected.push_back(yuyv ? y : c);
             expected.push_back(yuyv ? c : y);
         }

@@ -2,6 +2,7 @@
 
 // The input of one run, drawn from its front: everything that a run does follows from these bytes.
 
+#include <bit>
 #include <cstddef>
 #include <cstdint>
 
@@ -30,6 +31,15 @@ public:
 
     /// Any number, half of the time one at a border of its range or next to 0.
     int32_t AnyI32();
+
+    /// A number from \p low to \p high, but any once in \p count.
+    int32_t BetweenOrAny(int32_t low, int32_t high, uint32_t count) {
+        return OneIn(count) ? AnyI32() : Between(low, high);
+    }
+
+    /// Any bits: not a number, infinite, huge and denormal too.
+    float AnyFloat() { return std::bit_cast<float>(U32()); }
+    double AnyDouble() { return std::bit_cast<double>(U64()); }
 
     /// Samples of any depth: one byte all over, noise, noise with edge values of float and 16-bit samples, or
     /// the bytes of the input themselves.

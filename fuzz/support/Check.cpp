@@ -45,10 +45,6 @@ void SetVerbose(bool verbose) {
     sVerbose = verbose;
 }
 
-bool IsVerbose() {
-    return sVerbose;
-}
-
 void SetCall(std::string words) {
     sCall = std::move(words);
     if (sVerbose) std::fprintf(stderr, "%s\n", sCall.c_str());
@@ -66,6 +62,11 @@ void CheckSame(const std::vector<uint8_t>& expected, const std::vector<uint8_t>&
         std::fprintf(stderr, "byte %td of %zu: 0x%02x and 0x%02x\n", left - expected.begin(), expected.size(),
                      *left, *right);
     Check(left == expected.end() && right == actual.end(), rule);
+}
+
+void CheckResult(PK_Result expected, PK_Result actual) {
+    if (expected != actual) std::fprintf(stderr, "result %d, not %d\n", actual, expected);
+    Check(expected == actual, "the arguments decide the result");
 }
 
 void CheckIsNamed(PK_Result result) {

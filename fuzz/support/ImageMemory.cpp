@@ -1,5 +1,7 @@
 #include "support/ImageMemory.h"
 
+#include "support/Check.h"
+
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
@@ -22,24 +24,31 @@ size_t RowsLayout::Extent() const {
     return rows == 0 ? 0 : (rows - 1) * Step(*this) + rowLength;
 }
 
-int32_t DrawRowBytes(ByteStream& stream, size_t rowLength, size_t rows, int32_t usual) {
-    if (rows < 2 && stream.OneIn(4)) return stream.AnyI32();
-    int32_t rowBytes = static_cast<int32_t>(rowLength);
+RowsLayout DrawLayout(ByteStream& stream, size_t rowLength, size_t rows) {
+    if (rows < 2 && stream.OneIn(4)) return {rowLength, rows, stream.AnyI32()};
+    const auto packed = static_cast<int32_t>(rowLength);
+    int32_t padding = 0;
     switch (stream.Below(3)) {
     case 1:
-        rowBytes += stream.Between(0, std::min(70, INT32_MAX - rowBytes));
+        padding = stream.Between(0, 70);
         break;
     case 2:
-        rowBytes = std::max(rowBytes, usual);
+        padding = static_cast<int32_t>(-rowLength % 128);
         break;
     default:
         break;
     }
-    return stream.OneIn(3) ? -rowBytes : rowBytes;
+    const int32_t rowBytes = packed + std::min(padding, INT32_MAX - packed);
+    return {rowLength, rows, stream.OneIn(3) ? -rowBytes : rowBytes};
+}
+
+RowsLayout DrawLayout(ByteStream& stream, int64_t rowLength, Size size) {
+    if (!size.HasPixels()) return {0, 0, stream.AnyI32()};
+    return DrawLayout(stream, static_cast<size_t>(rowLength), static_cast<size_t>(size.height));
 }
 
 ImageMemory::ImageMemory(const RowsLayout& layout, ByteStream& stream)
-    : fLayout(layout), fHead(stream.Bool() ? stream.Below(64) : 0),
+    : fLayout(layout), fHead(stream.Bool() ? stream.Below(64) / layout.alignment * layout.alignment : 0),
       fAllocation(static_cast<uint8_t*>(std::malloc(fHead + layout.Extent()))), fImage(fAllocation + fHead) {
     if (fAllocation == nullptr) throw std::bad_alloc();
     std::memset(fAllocation, kPattern, fHead + fLayout.Extent());
@@ -59,7 +68,7 @@ size_t ImageMemory::OffsetOfRow(size_t row) const {
 }
 
 std::vector<uint8_t> ImageMemory::Rows() const {
-    std::vector<uint8_t> rows(fLayout.rows * fLayout.rowLength);
+    std::vector<uint8_t> rows(fLayout.Bytes());
     for (size_t row = 0; row < fLayout.rows; ++row)
         std::copy_n(fImage + OffsetOfRow(row), fLayout.rowLength, rows.data() + row * fLayout.rowLength);
     return rows;
@@ -68,6 +77,17 @@ std::vector<uint8_t> ImageMemory::Rows() const {
 void ImageMemory::SetRows(const std::vector<uint8_t>& rows) {
     for (size_t row = 0; row < fLayout.rows; ++row)
         std::copy_n(rows.data() + row * fLayout.rowLength, fLayout.rowLength, fImage + OffsetOfRow(row));
+}
+
+std::vector<uint8_t> ImageMemory::DrawRows(ByteStream& stream) {
+    std::vector<uint8_t> rows(fLayout.Bytes());
+    stream.Fill(rows.data(), rows.size());
+    SetRows(rows);
+    return rows;
+}
+
+void ImageMemory::CheckPadding() const {
+    Check(IsPaddingIntact(), "bytes outside the rows stay");
 }
 
 bool ImageMemory::IsPaddingIntact() const {
@@ -96,6 +116,11 @@ void ImageMemory::CloseGaps() const {
 
 void ImageMemory::OpenGaps() const {
     ASAN_UNPOISON_MEMORY_REGION(fAllocation, fHead + fLayout.Extent());
+}
+
+void SourceImage::CheckStays(const char* rule) const {
+    CheckPadding();
+    CheckSame(fContent, Rows(), rule);
 }
 
 } // namespace PKFuzz

@@ -1,83 +1,58 @@
 #include "zebcore/CPUBoundPool.h"
 
 #include <algorithm>
-#include <boost/asio/post.hpp>
 #include <csignal>
+#include <xmmintrin.h>
 
 namespace zebcore::threads {
+namespace {
 
-// Hands out the memory of one helper, so that asking for a thread allocates nothing. A helper has at most one
-// request under way, and its memory is free again before the helper begins.
-template <typename T>
-class CPUBoundPool::RequestMemory {
-public:
-    using value_type = T;
+constexpr uint32_t kFloatExceptions = 0x3f; // the sticky bits of MXCSR
 
-    explicit RequestMemory(Helper& helper) noexcept : fHelper(&helper) {}
-    template <typename U>
-    RequestMemory(const RequestMemory<U>& other) noexcept : fHelper(other.fHelper) {}
+// Each thread that begins a job wakes so many: all are soon awake, and none spends long on waking others.
+constexpr size_t kWokenAtOnce = 2;
 
-    T* allocate(size_t) noexcept {
-        static_assert(sizeof(T) <= Helper::kRequestBytes && alignof(T) <= alignof(std::max_align_t));
-        return reinterpret_cast<T*>(fHelper->request.data());
-    }
-    void deallocate(T*, size_t) noexcept {}
+} // namespace
 
-    template <typename U>
-    bool operator==(const RequestMemory<U>& other) const noexcept {
-        return fHelper == other.fHelper;
-    }
+CPUBoundPool::Job::Job(const Function& theFunction, int32_t theCount) noexcept
+    : function(theFunction), count(theCount), floatMode(_mm_getcsr()) {}
 
-private:
-    template <typename U>
-    friend class RequestMemory;
-    Helper* fHelper;
-};
-
-// What a thread of the pool is asked to do.
-struct CPUBoundPool::Request {
-    using allocator_type = RequestMemory<std::byte>;
-    allocator_type get_allocator() const noexcept { return allocator_type(*helper); }
-
-    void operator()() const noexcept { pool->Help(*helper); }
-
-    CPUBoundPool* pool;
-    Helper* helper;
-};
-
-CPUBoundPool::CPUBoundPool(uint32_t threadCount) : fHelpers(threadCount) {
+CPUBoundPool::CPUBoundPool(uint32_t threadCount) {
     fThreads.reserve(threadCount);
-    // Signals are the program's: its handlers run on its own threads.
-    sigset_t all, previous;
-    sigfillset(&all);
-    pthread_sigmask(SIG_SETMASK, &all, &previous);
+    // Signals are the program's: its handlers run on its own threads. Only faults belong to who commits them.
+    sigset_t blocked, previous;
+    sigfillset(&blocked);
+    for (const int fault : {SIGBUS, SIGFPE, SIGILL, SIGSEGV}) sigdelset(&blocked, fault);
+    pthread_sigmask(SIG_SETMASK, &blocked, &previous);
     StartThreads(threadCount);
     pthread_sigmask(SIG_SETMASK, &previous, nullptr);
-    for (size_t i = 0; i < fThreads.size(); ++i) fIdle.push_back(fHelpers[i]);
 }
 
-// The threads attach themselves, rather than being the pool's own: its constructor does not come back from a
-// thread that cannot be had.
 void CPUBoundPool::StartThreads(uint32_t count) {
     try {
-        while (fThreads.size() < count) fThreads.emplace_back([this] { fPool.attach(); });
+        while (fThreads.size() < count) fThreads.emplace_back([this] { Serve(); });
     } catch (const std::exception&) {
         // The ones that there are must do.
     }
 }
 
 CPUBoundPool::~CPUBoundPool() {
-    fPool.stop();
+    {
+        const std::lock_guard lock(fMutex);
+        fIsStopping = true;
+        fWakes += fThreads.size();
+    }
+    fHasWork.notify_all();
     for (std::thread& thread : fThreads) thread.join();
 }
 
 void CPUBoundPool::Run(const Function& function, int32_t count) {
     Job job(function, count);
-    WokenHelpers woken;
+    size_t woken;
     {
         const std::lock_guard lock(fMutex);
         fJobs.push_back(job);
-        woken = TakeIdleHelpers(job);
+        woken = ClaimSleepers(job);
     }
     Wake(woken);
     RunParts(job);
@@ -86,44 +61,58 @@ void CPUBoundPool::Run(const Function& function, int32_t count) {
         fJobs.erase(fJobs.iterator_to(job)); // from here on nobody enters it
         job.lastHelperLeft.wait(lock, [&job] { return job.helpersInside == 0; });
     }
+    _mm_setcsr(_mm_getcsr() | job.floatExceptions);
     if (job.failure) std::rethrow_exception(job.failure);
 }
 
-// Under the lock. One part of those left is the caller's own.
-CPUBoundPool::WokenHelpers CPUBoundPool::TakeIdleHelpers(const Job& job) noexcept {
-    const int64_t wanted = job.count - job.nextPart.load(std::memory_order_relaxed) - 1;
-    WokenHelpers woken{};
-    for (size_t i = 0; i < woken.size() && static_cast<int64_t>(i) < wanted && !fIdle.empty(); ++i) {
-        woken[i] = &fIdle.front();
-        fIdle.pop_front();
-    }
-    return woken;
-}
-
-void CPUBoundPool::Wake(const WokenHelpers& helpers) noexcept {
-    for (Helper* helper : helpers)
-        if (helper != nullptr) boost::asio::post(fPool, Request{this, helper});
-}
-
-void CPUBoundPool::Help(Helper& helper) noexcept {
+// A thread of the pool: works while there is work, and sleeps until somebody claims it.
+void CPUBoundPool::Serve() noexcept {
     std::unique_lock lock(fMutex);
-    while (Job* job = FindJob()) {
-        ++job->helpersInside;
-        const WokenHelpers woken = TakeIdleHelpers(*job);
-        lock.unlock();
-        Wake(woken);
-        RunParts(*job);
-        lock.lock();
-        // Still under the lock, since the job may be gone as soon as its thread gets it.
-        if (--job->helpersInside == 0) job->lastHelperLeft.notify_one();
+    while (!fIsStopping) {
+        while (Job* job = FindJob()) Help(*job, lock);
+        ++fSleepers;
+        fHasWork.wait(lock, [this] { return fWakes > 0; });
+        --fWakes;
     }
-    fIdle.push_front(helper);
 }
 
 // Under the lock. Of the jobs with parts left the oldest, or null.
 CPUBoundPool::Job* CPUBoundPool::FindJob() noexcept {
-    const auto found = std::ranges::find_if(fJobs, &Job::HasPartsLeft);
+    const auto found = std::ranges::find_if(fJobs, [](const Job& job) { return job.PartsLeft() > 0; });
     return found == fJobs.end() ? nullptr : &*found;
+}
+
+// Works in the floating-point mode of the job's own thread, as if that had taken the parts, and has its own again
+// afterwards.
+void CPUBoundPool::Help(Job& job, std::unique_lock<std::mutex>& lock) noexcept {
+    ++job.helpersInside;
+    const size_t woken = ClaimSleepers(job);
+    lock.unlock();
+    Wake(woken);
+    const uint32_t ownFloatMode = _mm_getcsr();
+    _mm_setcsr(job.floatMode);
+    RunParts(job);
+    const uint32_t raised = _mm_getcsr() & kFloatExceptions;
+    _mm_setcsr(ownFloatMode);
+    lock.lock();
+    job.floatExceptions |= raised;
+    // Still under the lock, since the job may be gone as soon as its thread gets it.
+    if (--job.helpersInside == 0) job.lastHelperLeft.notify_one();
+}
+
+// Under the lock. How many to wake for a job: one part of those left is for who wakes them. One that is on its way
+// already is not claimed again.
+size_t CPUBoundPool::ClaimSleepers(const Job& job) noexcept {
+    const auto wanted = static_cast<size_t>(std::max<int64_t>(job.PartsLeft() - 1, 0));
+    const size_t claimed = std::min({wanted, kWokenAtOnce, fSleepers});
+    fSleepers -= claimed;
+    fWakes += claimed;
+    return claimed;
+}
+
+// Without the lock, which is the first thing that they want.
+void CPUBoundPool::Wake(size_t count) noexcept {
+    for (; count > 0; --count) fHasWork.notify_one();
 }
 
 void CPUBoundPool::RunParts(Job& job) noexcept {

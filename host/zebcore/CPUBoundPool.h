@@ -9,9 +9,7 @@
 
 #include "zebcore/threads.h"
 
-#include <array>
 #include <atomic>
-#include <boost/asio/thread_pool.hpp>
 #include <boost/intrusive/list.hpp>
 #include <condition_variable>
 #include <cstddef>
@@ -41,45 +39,35 @@ public:
 private:
     // A task that has not ended. Lives on the stack of Run.
     struct Job : boost::intrusive::list_base_hook<> {
-        Job(const Function& theFunction, int32_t theCount) : function(theFunction), count(theCount) {}
+        Job(const Function& theFunction, int32_t theCount) noexcept;
 
-        bool HasPartsLeft() const noexcept { return nextPart.load(std::memory_order_relaxed) < count; }
+        int64_t PartsLeft() const noexcept { return count - nextPart.load(std::memory_order_relaxed); }
 
         const Function& function;
         const int64_t count;
+        const uint32_t floatMode;         // MXCSR of the thread that runs the task
         std::atomic<int64_t> nextPart{0}; // passes count by one for each thread that finds no part left
-        int32_t helpersInside = 0;        // these two are guarded by the pool's mutex
+        int32_t helpersInside = 0;        // this and what follows is guarded by the pool's mutex
+        uint32_t floatExceptions = 0;     // what helpers raised
         std::exception_ptr failure;
         std::condition_variable lastHelperLeft;
     };
 
-    // The right to have one thread of the pool at work, with memory to ask for it.
-    struct Helper : boost::intrusive::list_base_hook<> {
-        static constexpr size_t kRequestBytes = 128;
-        alignas(std::max_align_t) std::array<std::byte, kRequestBytes> request;
-    };
-
-    template <typename T>
-    class RequestMemory;
-    struct Request;
-
-    // Each thread that begins a job wakes so many: all are soon awake, and none spends long on waking others.
-    static constexpr size_t kWokenAtOnce = 2;
-    using WokenHelpers = std::array<Helper*, kWokenAtOnce>;
-
     void StartThreads(uint32_t count);
-    WokenHelpers TakeIdleHelpers(const Job& job) noexcept;
-    void Wake(const WokenHelpers& helpers) noexcept;
-    void Help(Helper& helper) noexcept;
+    void Serve() noexcept;
     Job* FindJob() noexcept;
+    void Help(Job& job, std::unique_lock<std::mutex>& lock) noexcept;
+    size_t ClaimSleepers(const Job& job) noexcept;
+    void Wake(size_t count) noexcept;
     void RunParts(Job& job) noexcept;
 
-    std::mutex fMutex;
-    boost::intrusive::list<Job> fJobs; // guarded by fMutex
-    std::vector<Helper> fHelpers;
-    boost::intrusive::list<Helper> fIdle; // guarded by fMutex; as many at most as there are threads
-    boost::asio::thread_pool fPool{0};    // no threads of its own
-    std::vector<std::thread> fThreads;    // attached to fPool
+    std::mutex fMutex; // guards what follows, but for the threads
+    boost::intrusive::list<Job> fJobs;
+    size_t fSleepers = 0; // helpers that sleep and that nobody has claimed
+    size_t fWakes = 0;    // helpers that were claimed and have not woken
+    bool fIsStopping = false;
+    std::condition_variable fHasWork;
+    std::vector<std::thread> fThreads;
 };
 
 } // namespace zebcore::threads

@@ -38,8 +38,9 @@ boost::shared_ptr<AsyncExecutor> CreateCPUBoundExecutor();
 /// An exception that leaves \p function ends the task: indices that nobody has begun are skipped, those that
 /// have begun are waited for, and then the first exception is thrown on the calling thread.
 ///
-/// Each thread stays in the floating-point mode that it is in; that of the pool's threads is the mode of the
-/// thread that started the executor.
+/// Every call runs in the floating-point mode (MXCSR) of the calling thread, and the exception flags that it raises
+/// are the calling thread's afterwards: neither results nor flags tell which thread made the call. Before it takes
+/// up something else, a thread of the executor has its own mode again. The x87 control word is not carried.
 /// \param function  what to call; it is not copied.
 /// \param count     number of calls; 0 and below make none.
 void ExecuteCPUBoundTaskOnAllProcessors(const boost::function<void(int32_t)>& function, int32_t count);

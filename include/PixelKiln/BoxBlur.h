@@ -28,9 +28,11 @@ enum PK_BoxBlurFlags : int32_t {
 ///     (255 x S + f x E + 128) / (255 x c + f x e), truncated, at most 255
 ///
 /// where without PK_BoxBlur_Renormalise 255 x (2 x size - 1) stands for 255 x c. Two things are particular to it.
-/// Pixel x = size has no left edge pixel. And on lines of at least 2 x size + 3 pixels the last three pixels are
-/// never among the whole ones, so that the ends of a line do not mirror each other. A pixel with an empty window
-/// (c = 0 and f = 0) stays as it is. A radius of 0 changes nothing.
+/// Pixel x = size has no left edge pixel. And towards the end of a line no more whole pixels enter: pixel n - 4 is the
+/// last of them, or on lines of fewer than 2 x size + 3 pixels, pixel 2 x size - 1, the last in the window of pixel
+/// x = size. So the ends of a line do not mirror each other. Where nothing in the window weighs anything (c = 0 and
+/// f = 0), a pixel becomes 0, and with PK_BoxBlur_Renormalise, which has nothing to divide by, stays as it is. Radii
+/// below 1/255 count as 0, and change nothing.
 ///
 /// The quotients are exact on every processor and in every floating-point mode; the exception flags of MXCSR are
 /// left as the arithmetic on radii sets them.

@@ -62,19 +62,19 @@ PK_API void PK_FreeTransientMemoryBlock(void* allocationBase, uint64_t allocated
 /// Finds the planes of a 4:2:0 image that lies in one block: Y with rows of width padded to 128 bytes and
 /// height padded to 32 rows, then U and V, each with rows of half the width padded to 128 bytes and half
 /// the padded height. Touches no memory of the block. Offsets are computed in 32 bits and wrap beyond.
-/// \param block     the first byte of the image.
+/// \param block     the first byte of the image; null gives the planes' offsets.
 /// \param format    ignored.
 /// \param width     pixels in a row of Y, not negative.
 /// \param height    rows of Y, not negative.
 /// \param planes    receives the first bytes of Y, U and V.
 /// \param rowBytes  receives the row bytes of Y, U and V.
-/// \return PK_Success; PK_ErrFailed for a null argument or a negative size, with nothing written.
+/// \return PK_Success; PK_ErrFailed for a null output or a negative size, with nothing written.
 PK_API PK_Result PK_GetPlanarBuffers(void* block, PK_PixelFormat format, int32_t width, int32_t height,
                                      void* planes[3], int32_t rowBytes[3]) noexcept;
 
 /// Moves the pointer of an interleaved four-channel image to the corner of a rectangle. Touches no memory
 /// of the image.
-/// \param buffer    first row of the image.
+/// \param buffer    first row of the image; null gives the corner's offset.
 /// \param rowBytes  bytes to the next row, of either sign.
 /// \param width     ignored.
 /// \param height    ignored.
@@ -84,7 +84,7 @@ PK_API PK_Result PK_GetPlanarBuffers(void* block, PK_PixelFormat format, int32_t
 ///                  that is stored bottom-up it counts from the bottom of the picture.
 /// \param clipped   receives the pointer.
 /// \return PK_Success; PK_ErrBadSrcFormat for any other format (4:2:2 and RGB_444_10u among them), with
-///         nothing written; PK_ErrFailed for a null buffer or output.
+///         nothing written; PK_ErrFailed for a null output.
 PK_API PK_Result PK_ClipBufferToRect(void* buffer, int32_t rowBytes, int32_t width, int32_t height,
                                      PK_PixelFormat format, int32_t left, int32_t top,
                                      void** clipped) noexcept;
@@ -103,10 +103,10 @@ PK_API PK_Result PK_CopyMemory(void* destination, const void* source, uint64_t b
 /// that says it is one goes by its other bits.
 /// \param buffer    first row.
 /// \param rowBytes  bytes to the next row, of either sign.
-/// \param width     pixels in a row, not negative.
-/// \param height    rows, not negative; 0 and 1 do nothing.
+/// \param width     pixels in a row, not negative where there are rows to swap.
+/// \param height    rows; below 2 there is nothing to swap, and no memory or other argument is looked at.
 /// \param format    any format.
-/// \return PK_Success; PK_ErrFailed for a null buffer with rows to swap, a negative size or a row too long
+/// \return PK_Success; with rows to swap PK_ErrFailed for a null buffer, a negative width or a row too long
 ///         for 32 bits; PK_ErrOutOfMemory if a row of more than 256 KiB found no scratch; nothing is
 ///         changed then.
 PK_API PK_Result PK_FlipInPlace(void* buffer, int32_t rowBytes, int32_t width, int32_t height,

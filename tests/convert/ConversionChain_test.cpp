@@ -3,13 +3,14 @@
 #include "convert/ConversionChain.h"
 
 #include "convert/KernelTable.h"
+#include "convert/RasterFormats.h"
+#include "convert/WorkingRows.h"
 
 #include <PixelKiln/PixelFormat.h>
 
 #include <gtest/gtest.h>
 
 #include <array>
-#include <cstdlib>
 #include <vector>
 
 namespace PK {
@@ -36,7 +37,7 @@ void AppendDigitRow(const void* source, void* destination, int32_t width) {
 
 ConversionChain ChainOf(std::initializer_list<RowKernel> passes) {
     ConversionChain chain;
-    for (const RowKernel pass : passes) chain.passes[chain.passCount++] = pass;
+    for (const RowKernel pass : passes) chain.passes[chain.passCount++] = {pass, PK_PixelFormat_BGRA_4444_8u};
     chain.count = chain.passCount;
     calls.clear();
     return chain;
@@ -45,7 +46,13 @@ ConversionChain ChainOf(std::initializer_list<RowKernel> passes) {
 uint8_t Convert(const ConversionChain& chain, int32_t width) {
     const std::vector<uint8_t> source(static_cast<size_t>(width), 0);
     std::vector<uint8_t> destination(static_cast<size_t>(width), 0xee);
-    EXPECT_EQ(chain.ConvertRow(source.data(), destination.data(), width), PK_Success);
+    RowMemory memory(width);
+    memory.AddChain(chain);
+    const PK_Result result = memory.With([&](const TemporaryRows& rows) {
+        chain.ConvertRow(source.data(), destination.data(), width, rows.Scratch());
+        return PK_Success;
+    });
+    EXPECT_EQ(result, PK_Success);
     EXPECT_EQ(calls.front().source, source.data());
     EXPECT_EQ(calls.back().destination, destination.data());
     for (const uint8_t value : destination) EXPECT_EQ(value, destination[0]);
@@ -55,9 +62,7 @@ uint8_t Convert(const ConversionChain& chain, int32_t width) {
 TEST(ConversionChain, IsEmptyAtFirst) {
     const ConversionChain chain;
     EXPECT_EQ(chain.count, 0);
-    uint8_t destination = 0xee;
-    EXPECT_EQ(chain.ConvertRow("s", &destination, 1), PK_ErrFailed);
-    EXPECT_EQ(destination, 0xee);
+    EXPECT_EQ(chain.ScratchRows(), 0);
 }
 
 TEST(ConversionChain, OnePassGoesStraightFromSourceToDestination) {
@@ -82,48 +87,63 @@ TEST(ConversionChain, PassesRunInOrderThroughTwoRows) {
     for (const Call& call : calls) EXPECT_EQ(call.width, 33);
 }
 
-TEST(ConversionChain, ScratchRowsHoldSixteenBytesAPixelApart) {
-    constexpr int32_t width = 33;
-    const auto chain = ChainOf({AppendDigitRow<1>, AppendDigitRow<2>, AppendDigitRow<3>});
-    chain.WithScratch(width, [](const ChainScratch& scratch) {
-        for (const uint8_t* row : scratch.rows) EXPECT_EQ(reinterpret_cast<uintptr_t>(row) % 16, 0u);
-        EXPECT_GE(std::abs(scratch.rows[0] - scratch.rows[1]), 16 * width);
-        return PK_Success;
-    });
+TEST(ConversionChain, AsksForAScratchRowBetweenTwoPassesAndForTwoAmongMore) {
+    EXPECT_EQ(ChainOf({AppendDigitRow<1>}).ScratchRows(), 0);
+    EXPECT_EQ(ChainOf({AppendDigitRow<1>, AppendDigitRow<2>}).ScratchRows(), 1);
+    EXPECT_EQ(ChainOf({AppendDigitRow<1>, AppendDigitRow<2>, AppendDigitRow<3>}).ScratchRows(), 2);
+    EXPECT_EQ(
+        ChainOf({AppendDigitRow<1>, AppendDigitRow<2>, AppendDigitRow<3>, AppendDigitRow<4>}).ScratchRows(),
+        2);
 }
 
-/// Far more than the two rows, far less than the way to the heap.
-bool IsNearTheStackTop(const void* pointer) {
-    const auto* here = static_cast<const uint8_t*>(__builtin_frame_address(0));
-    return std::abs(static_cast<const uint8_t*>(pointer) - here) < 1 << 20;
-}
-
-TEST(ConversionChain, RowsUpTo16384PixelsStayOnTheStack) {
-    const auto chain = ChainOf({AppendDigitRow<1>, AppendDigitRow<2>, AppendDigitRow<3>});
-    EXPECT_EQ(Convert(chain, 16384), 123);
-    EXPECT_TRUE(IsNearTheStackTop(calls[0].destination));
-    EXPECT_TRUE(IsNearTheStackTop(calls[1].destination));
-
-    calls.clear();
-    EXPECT_EQ(Convert(chain, 16385), 123);
-    EXPECT_FALSE(IsNearTheStackTop(calls[0].destination));
-    EXPECT_FALSE(IsNearTheStackTop(calls[1].destination));
-}
-
-TEST(ConversionChain, ResultOfTheScratchUserIsHandedOn) {
-    const auto chain = ChainOf({AppendDigitRow<1>, AppendDigitRow<2>, AppendDigitRow<3>});
-    const auto fail = [](const ChainScratch&) -> PK_Result { return PK_ErrSizeMismatch; };
-    EXPECT_EQ(chain.WithScratch(8, fail), PK_ErrSizeMismatch);
+// What the last pass writes is the destination's affair.
+TEST(ConversionChain, ScratchRowsAreAsWideAsTheWidestRowHandedOn) {
+    auto chain = ChainOf({AppendDigitRow<1>, AppendDigitRow<2>, AppendDigitRow<3>});
+    chain.passes[0].next = PK_PixelFormat_BGRA_4444_8u;
+    chain.passes[1].next = PK_PixelFormat_V210_422_10u;
+    chain.passes[2].next = PK_PixelFormat_BGRA_4444_32f;
+    EXPECT_EQ(chain.ScratchBytes(1), 16u); // a group of V210 is more than a pixel
+    EXPECT_EQ(chain.ScratchBytes(6), 24u);
+    EXPECT_EQ(chain.ScratchBytes(0), 0u);
+    chain.passes[0].next = PK_PixelFormat_UYVY_422_32f;
+    EXPECT_EQ(chain.ScratchBytes(7), 64u); // four whole pairs
+    EXPECT_EQ(chain.ScratchBytes(INT32_MAX / 16), 0x40000000u);
+    chain.passCount = 1;
+    EXPECT_EQ(chain.ScratchBytes(7), 0u);
 }
 
 TEST(ConversionChain, BuildTakesBodiesAndFormatsOfEachStep) {
     ConversionChain chain;
-    chain.Build(PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_BGRP_4444_8u, 2);
+    EXPECT_TRUE(chain.Build(PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_BGRP_4444_8u, 2));
     ASSERT_EQ(chain.count, 1);
+    EXPECT_EQ(chain.source, PK_PixelFormat_BGRA_4444_8u);
+    EXPECT_EQ(chain.destination, PK_PixelFormat_BGRP_4444_8u);
+    EXPECT_FALSE(chain.IsCopy());
     EXPECT_EQ(chain.kernels[0], Kernel::PremultiplyRow_BGRA_8u);
     EXPECT_EQ(chain.steps[0], ChooseBody(Kernel::PremultiplyRow_BGRA_8u));
     EXPECT_EQ(chain.formats[0], PK_PixelFormat_BGRP_4444_8u);
     EXPECT_EQ(chain.passCount, 1);
+    EXPECT_EQ(chain.passes[0].run, chain.steps[0]);
+    EXPECT_EQ(chain.passes[0].next, PK_PixelFormat_BGRP_4444_8u);
+}
+
+TEST(ConversionChain, FusedPassesTellTheFormatBehindThem) {
+    ConversionChain chain; // the order is swapped; matrix, premultiplication and downsampling are one pass
+    ASSERT_TRUE(chain.Build(PK_PixelFormat_ARGB_4444_8u, PK_PixelFormat_UYVY_422_8u, 2));
+    ASSERT_EQ(chain.count, 4);
+    ASSERT_EQ(chain.passCount, 2);
+    EXPECT_EQ(chain.passes[0].next, PK_PixelFormat_BGRA_4444_8u);
+    EXPECT_EQ(chain.passes[1].next, PK_PixelFormat_UYVY_422_8u);
+    EXPECT_EQ(chain.ScratchBytes(5), 20u);
+}
+
+TEST(ConversionChain, FromAFormatToItselfIsACopy) {
+    for (const PK_PixelFormat format : kRasterFormats) {
+        ConversionChain chain;
+        ASSERT_TRUE(chain.Build(format, format, 2)) << std::hex << format;
+        EXPECT_TRUE(chain.IsCopy());
+        EXPECT_EQ(chain.count, 1);
+    }
 }
 
 TEST(ConversionChain, BuildForgetsWhatWasThere) {
@@ -142,7 +162,7 @@ TEST(ConversionChain, NothingIsBuiltForStreamsAndUnknownFormats) {
         for (const auto& [source, destination] :
              {std::pair{format, known}, {known, format}, {format, format}}) {
             ConversionChain chain;
-            chain.Build(source, destination, 2);
+            EXPECT_FALSE(chain.Build(source, destination, 2));
             EXPECT_EQ(chain.count, 0) << std::hex << source << " to " << destination;
         }
     }

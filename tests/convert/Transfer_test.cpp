@@ -207,6 +207,13 @@ TEST(Transfer, AlphaIsRoundedToTheNearestCodeAndClamped) {
         ExpectRow(Kernel::LinearFloat32ToGamma8uRow, 1, Floats{0, 0, 0, alpha}, Bytes{0, 0, 0, code});
 }
 
+TEST(TransferTables, AreThePowersToTheLastBit) {
+    for (int code = 0; code < 256; ++code)
+        EXPECT_EQ(kTransferTables.linear[code], static_cast<float>(std::pow(code / 255.0, 2.4))) << code;
+    for (int k = 0; k < 255; ++k)
+        EXPECT_EQ(kTransferTables.thresholds[k], static_cast<float>(std::pow((k + 0.5) / 255, 2.4))) << k;
+}
+
 TEST(TransferTables, ThresholdsAscendWithAtMostOneInACell) {
     for (size_t k = 0; k < 255; ++k) {
         const auto cell = std::bit_cast<uint32_t>(kTransferTables.thresholds[k]) >> 16;

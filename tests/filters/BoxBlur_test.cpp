@@ -1,9 +1,9 @@
-// PK_BoxBlur against a reference that adds up every window anew, in exact integers.
+// PK_BoxBlur by values worked out by hand, and against a reference that adds up every window anew.
 
 #include <PixelKiln/BoxBlur.h>
 #include <PixelKiln/Lifecycle.h>
 
-#include "filters/BoxBlurKernels.h"
+#include "reference/ReferenceBoxBlur.h"
 #include "support/FloatEnvironment.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
@@ -15,51 +15,16 @@
 #include <array>
 #include <cmath>
 #include <limits>
+#include <map>
 #include <vector>
 
 namespace {
 
 using namespace PKTest;
 
-using Pixel = std::array<uint8_t, 4>;
-using PixelLine = std::vector<Pixel>;
+using Pixel = BoxPixel;
 
 constexpr int32_t kAllBytes = 15, kRenormalise = 16, kColumns = 128;
-
-/// One filtered byte of pixel x: the whole pixels first to last of the window, and the edge pixels.
-uint8_t ReferenceByte(const PixelLine& line, int64_t x, int64_t size, int64_t weight, bool renormalise,
-                      size_t byte) {
-    const auto length = static_cast<int64_t>(line.size());
-    const bool isShort =
-        length < size + 1 + 2 + size; // a left end, pixel `size`, the two before the right end
-    const int64_t first = std::max<int64_t>(0, x - size + 1);
-    const int64_t last = std::min(x + size - 1, isShort ? length - 1 : length - 4);
-    int64_t sum = 0, count = 0, edges = 0, edgeCount = 0;
-    for (int64_t i = first; i <= last; ++i, ++count) sum += line[static_cast<size_t>(i)][byte];
-    const auto addEdge = [&](int64_t i) {
-        edges += line[static_cast<size_t>(i)][byte];
-        ++edgeCount;
-    };
-    if (x > size) addEdge(x - size);
-    if (x + size < length) addEdge(x + size);
-    if (count == 0 && weight == 0) return line[static_cast<size_t>(x)][byte];
-    const int64_t divisor = (renormalise ? 255 * count : 510 * size - 255) + weight * edgeCount;
-    return static_cast<uint8_t>(std::min<int64_t>(255, (255 * sum + weight * edges + 128) / divisor));
-}
-
-PixelLine ReferencePass(const PixelLine& line, double radius, int32_t flags) {
-    const double r = radius > 0 ? radius : 0;
-    const double whole = std::trunc(r);
-    const auto weight = static_cast<int64_t>((r - whole) * 255.0);
-    PixelLine result = line;
-    for (size_t x = 0; x < line.size(); ++x)
-        for (size_t byte = 0; byte < 4; ++byte)
-            if (flags >> byte & 1)
-                result[x][byte] =
-                    ReferenceByte(line, static_cast<int64_t>(x), static_cast<int64_t>(whole) + 1, weight,
-                                  (flags & kRenormalise) != 0, byte);
-    return result;
-}
 
 /// An image between guard pages, and scratch of exactly the size that callers give.
 class Frame {
@@ -79,6 +44,12 @@ public:
     void FillRandomly(Random& random) const {
         for (int32_t y = 0; y < fHeight; ++y) random.Fill(At(0, y)->data(), static_cast<size_t>(fWidth) * 4);
     }
+    /// Three lines that follow one another through the image.
+    void FillWithThreeLines(Random& random, int32_t direction) const {
+        FillRandomly(random);
+        for (int32_t y = 0; y < fHeight; ++y)
+            for (int32_t x = 0; x < fWidth; ++x) *At(x, y) = direction != 0 ? *At(x % 3, y) : *At(x, y % 3);
+    }
     void Fill(Pixel pixel) const {
         for (int32_t y = 0; y < fHeight; ++y) std::fill_n(At(0, y), fWidth, pixel);
     }
@@ -95,23 +66,33 @@ public:
         const bool areColumns = (flags & kColumns) != 0;
         const int32_t lines = areColumns ? fWidth : fHeight, length = areColumns ? fHeight : fWidth;
         const double limit = std::min(fWidth, fHeight) - 3;
+        std::map<BoxLine, BoxLine> blurred;
         for (int32_t i = 0; i < lines; ++i) {
-            PixelLine line;
+            BoxLine line;
             for (int32_t x = 0; x < length; ++x) line.push_back(areColumns ? *At(i, x) : *At(x, i));
-            for (const double radius : radii) line = ReferencePass(line, std::min(radius, limit), flags);
+            const auto [place, isNew] = blurred.try_emplace(line, line);
+            BoxLine& result = place->second;
+            for (const double radius : radii)
+                if (isNew) result = ReferenceBoxPass(result, ReferenceBoxOf(std::min(radius, limit)), flags);
             for (int32_t x = 0; x < length; ++x)
-                (areColumns ? *At(i, x) : *At(x, i)) = line[static_cast<size_t>(x)];
+                (areColumns ? *At(i, x) : *At(x, i)) = result[static_cast<size_t>(x)];
         }
         const std::vector<uint8_t> after = Bytes();
         std::copy(before.begin(), before.end(), fMemory.Bytes());
         return after;
     }
 
-    void Check(std::vector<double> radii, int32_t flags) const {
-        const std::vector<uint8_t> expected = Expected(radii, flags);
-        Blur(radii, flags);
-        ASSERT_EQ(Bytes(), expected) << fWidth << " x " << fHeight << ", row bytes " << fRowBytes
-                                     << ", flags " << flags << ", first radius " << radii.front();
+    /// Leaves the image as it was.
+    void Check(const std::vector<double>& radii, int32_t flags) const {
+        const std::vector<uint8_t> before = Bytes(), expected = Expected(radii, flags);
+        AtEveryTarget([&] {
+            std::vector<double> given = radii;
+            Blur(given, flags);
+            const bool isRight = Bytes() == expected;
+            std::copy(before.begin(), before.end(), fMemory.Bytes());
+            ASSERT_TRUE(isRight) << fWidth << " x " << fHeight << ", row bytes " << fRowBytes << ", flags "
+                                 << flags << ", first radius " << radii.front();
+        });
     }
 
 private:
@@ -133,19 +114,46 @@ std::vector<int> BlurredRow(const std::vector<int>& values, double radius, int32
     return blurred;
 }
 
-class BoxBlurBodies : public TargetTest {};
-
-INSTANTIATE_TEST_SUITE_P(Targets, BoxBlurBodies, EveryTarget(), TargetOf);
-
 } // namespace
 
 // Radius 1 on ten pixels: size 2, no edge pixels, Dfull = 3 x 255. Pixel 0 has two pixels in its window, 1 to 5
-// three, 6 and 7 lose one that nothing replaces, 8 has p[7] to p[6] and so nothing.
+// three, 6 and 7 lose one that nothing replaces, 8 has p[7] to p[6] and so nothing: it stays if the divisor follows
+// the window, and is black if not.
 TEST(BoxBlur, RadiusOneByHand) {
     const std::vector<int> line = {30, 60, 90, 120, 150, 180, 210, 240, 6, 9};
     EXPECT_EQ(BlurredRow(line, 1, kAllBytes | kRenormalise),
               (std::vector<int>{45, 60, 90, 120, 150, 180, 195, 210, 6, 9}));
-    EXPECT_EQ(BlurredRow(line, 1, kAllBytes), (std::vector<int>{30, 60, 90, 120, 150, 180, 130, 70, 6, 9}));
+    EXPECT_EQ(BlurredRow(line, 1, kAllBytes), (std::vector<int>{30, 60, 90, 120, 150, 180, 130, 70, 0, 0}));
+}
+
+// Size 3: pixels 0 to 2 have up to two on their left, 5 and later lose one each, and 9
+// has none left.
+TEST(BoxBlur, RadiusTwoByHand) {
+    const std::vector<int> line = {30, 60, 90, 120, 150, 180, 210, 240, 6, 9};
+    EXPECT_EQ(BlurredRow(line, 2, kAllBytes | kRenormalise),
+              (std::vector<int>{60, 75, 90, 120, 150, 165, 180, 195, 210, 9}));
+    EXPECT_EQ(BlurredRow(line, 2, kAllBytes), (std::vector<int>{36, 60, 90, 120, 150, 132, 108, 78, 42, 0}));
+}
+
+TEST(BoxBlur, WithoutRenormalisingLinesFadeToBlackToTheirLastPixel) {
+    const std::vector<int> white(12, 255);
+    for (const double radius : {1.0, 1.0039, 2.0, 2.0039})
+        EXPECT_EQ(BlurredRow(white, radius, kAllBytes)[11], 0);
+    for (const double radius : {1.0, 1.0039}) EXPECT_EQ(BlurredRow(white, radius, kAllBytes)[10], 0);
+    for (const double radius : {0.0, 0.0039}) EXPECT_EQ(BlurredRow(white, radius, kAllBytes), white);
+}
+
+// Size 2. On six pixels the last two never enter: 2 is the last that takes one in, since only the first of the
+// places that x can have counts. On five it is only the last, on four none.
+TEST(BoxBlur, LinesWithoutAMiddleByHand) {
+    EXPECT_EQ(BlurredRow({10, 20, 30, 40, 50, 60}, 1, kAllBytes | kRenormalise),
+              (std::vector<int>{15, 20, 30, 35, 40, 60}));
+    EXPECT_EQ(BlurredRow({10, 20, 30, 40, 50, 60}, 1, kAllBytes), (std::vector<int>{10, 20, 30, 23, 13, 0}));
+    EXPECT_EQ(BlurredRow({10, 20, 30, 40, 50}, 1, kAllBytes | kRenormalise),
+              (std::vector<int>{15, 20, 30, 35, 40}));
+    EXPECT_EQ(BlurredRow({10, 20, 30, 40, 50}, 1, kAllBytes), (std::vector<int>{10, 20, 30, 23, 13}));
+    EXPECT_EQ(BlurredRow({10, 20, 30, 40}, 1, kAllBytes | kRenormalise), (std::vector<int>{15, 20, 30, 35}));
+    EXPECT_EQ(BlurredRow({10, 20, 30, 40}, 1, kAllBytes), (std::vector<int>{10, 20, 30, 23}));
 }
 
 // Radius 1.5: size 2, weight 127. One white pixel, so that each result tells its place in the window:
@@ -228,25 +236,26 @@ TEST(BoxBlur, BytesWithoutAFlagKeepTheirValues) {
         }
 }
 
-TEST_P(BoxBlurBodies, AllRadiiOnAllShortLines) {
+// Every length and every size that it allows, by bodies and directions that share what the reference gives.
+TEST(BoxBlur, EverySizeOnEveryShortLine) {
     Random random(3);
-    const std::array<int32_t, 4> flags = {kAllBytes, kAllBytes | kRenormalise, 7, 9 | kRenormalise};
-    int32_t turn = 0;
     for (int32_t length = 4; length <= 60; ++length)
-        for (double radius = 0; radius <= std::min(50, length - 3); radius += 1.43) {
-            const int32_t other = std::max(length, 4 + turn % 19);
-            const int32_t chosen = flags[static_cast<size_t>(turn++ % 4)];
-            const Frame rows(length, other, length * 4, turn % 2 ? Guard::kAfter : Guard::kBefore);
-            rows.FillRandomly(random);
-            rows.Check({radius}, chosen);
-            const Frame columns(other, length, other * -4 - 8);
-            columns.FillRandomly(random);
-            columns.Check({radius}, chosen | kColumns);
-            if (testing::Test::HasFatalFailure()) FAIL() << "seed " << random.Seed();
+        for (int32_t whole = 0; whole <= length - 3; ++whole) {
+            const int32_t count = whole + 4; // lines, so that they do not limit the radius
+            const Frame rows(length, count, length * 4, whole % 2 ? Guard::kAfter : Guard::kBefore);
+            const Frame columns(count, length, count * -4 - 8);
+            rows.FillWithThreeLines(random, 0);
+            columns.FillWithThreeLines(random, kColumns);
+            for (const double part : {0.0, 0.001, 1.001 / 255, 2 / 255.0, 0.5, 254.5 / 255})
+                for (const int32_t chosen : {kAllBytes, kAllBytes | kRenormalise}) {
+                    rows.Check({whole + part}, chosen);
+                    columns.Check({whole + part}, chosen | kColumns);
+                    if (testing::Test::HasFatalFailure()) FAIL() << "seed " << random.Seed();
+                }
         }
 }
 
-TEST_P(BoxBlurBodies, EveryWholeAndNearlyWholeRadius) {
+TEST(BoxBlur, EveryWholeAndNearlyWholeRadius) {
     Random random(4);
     for (int32_t radius = 0; radius <= 50; ++radius)
         for (const double part : {0.0, 0.004, 0.25, 0.5, 0.999})
@@ -258,7 +267,7 @@ TEST_P(BoxBlurBodies, EveryWholeAndNearlyWholeRadius) {
             }
 }
 
-TEST_P(BoxBlurBodies, SeveralPassesAtAnySize) {
+TEST(BoxBlur, SeveralPassesAtAnySize) {
     Random random(5);
     for (int run = 0; run < 150; ++run) {
         const auto width = static_cast<int32_t>(4 + random.Below(70)),
@@ -276,7 +285,7 @@ TEST_P(BoxBlurBodies, SeveralPassesAtAnySize) {
     }
 }
 
-TEST_P(BoxBlurBodies, WideWindows) {
+TEST(BoxBlur, WideWindows) {
     Random random(6);
     for (const double radius : {126.5, 297.0})
         for (const int32_t flags : {kAllBytes, kAllBytes | kRenormalise}) {
@@ -287,66 +296,16 @@ TEST_P(BoxBlurBodies, WideWindows) {
         }
 }
 
-// Around 7900 the quotient changes its method; the sums of white are the largest there are.
-TEST_P(BoxBlurBodies, QuotientsAtTheBordersOfTheMethods) {
-    const PK::BoxBlurKernels& kernels = PK::KernelsFor<PK::BoxBlurKernels>(GetParam());
-    Random random(7);
-    for (const int32_t size : {1, 14, 15, 16, 17, 3949, 3950, 3951, 4000, 9001, 16384})
-        for (const int32_t weight : {0, 1, 127, 254})
-            for (const bool white : {false, true}) {
-                const int32_t length = size * 2 + 40;
-                std::vector<uint8_t> bundle(static_cast<size_t>(length) * PK::kBundleStep, 255),
-                    blurred(bundle);
-                if (!white) random.Fill(bundle.data(), bundle.size());
-                const PK::BoxPass pass = {length, size, weight, size % 2 == 0, 0xffffffff};
-                kernels.bundle(pass, bundle.data(), blurred.data());
-                for (const size_t offset : {0, 36, 60}) {
-                    std::vector<uint8_t> line(static_cast<size_t>(length) * 4), expected(line), got(line);
-                    for (size_t i = 0; i < line.size(); ++i) {
-                        line[i] = bundle[i / 4 * PK::kBundleStep + offset + i % 4];
-                        got[i] = blurred[i / 4 * PK::kBundleStep + offset + i % 4];
-                    }
-                    kernels.line(pass, line.data(), expected.data());
-                    ASSERT_EQ(got, expected)
-                        << "size " << size << ", weight " << weight << ", seed " << random.Seed();
-                }
-            }
-}
-
-// One line in 64 bits, against the reference where that is quick, and on sums beyond 32 bits by a value.
-TEST_P(BoxBlurBodies, ASingleLine) {
-    const PK::BoxBlurKernels& kernels = PK::KernelsFor<PK::BoxBlurKernels>(GetParam());
-    Random random(8);
-    for (int32_t size = 1; size <= 30; ++size)
-        for (const int32_t weight : {0, 1, 128, 254}) {
-            PixelLine line(size + 2 + random.Below(60)), got(line.size());
-            random.Fill(line[0].data(), line.size() * 4);
-            const bool renormalise = random.Below(2) != 0;
-            kernels.line({static_cast<int32_t>(line.size()), size, weight, renormalise, 0x00ffffff},
-                         line[0].data(), got[0].data());
-            const double radius = size - 1 + (weight + 0.5) / 255;
-            ASSERT_EQ(got,
-                      ReferencePass(line, weight ? radius : size - 1, 7 | (renormalise ? kRenormalise : 0)))
-                << "size " << size << ", weight " << weight << ", seed " << random.Seed();
-        }
-
-    const int32_t size = 200000;
-    PixelLine line(2 * size + 100, {255, 254, 1, 0}), got(line.size());
-    kernels.line({static_cast<int32_t>(line.size()), size, 100, true, 0xffffffff}, line[0].data(),
-                 got[0].data());
-    EXPECT_EQ(got, line);
-}
-
 // The radius is limited by the shorter side, so that sums beyond 32 bits need two long sides: here all rows are the
 // same memory, and a flat row stays flat however often it is filtered.
 TEST(BoxBlur, ARadiusWhoseSumsNeedMoreThan32Bits) {
-    const int32_t side = 16400;
+    const int32_t side = 16470;
     std::vector<Pixel> row(side, {255, 128, 3, 200}), scratch(static_cast<size_t>(side) * 3);
     const std::vector<Pixel> before = row;
     double radius = 1e9;
-    const int32_t rows = 16390; // limits the radius to 16387
+    const int32_t rows = 16460; // limits the radius to 16457
     PK_BoxBlur(1, &radius, 1 | kRenormalise, scratch.data(), row.data(), 0, side, rows);
-    EXPECT_EQ(radius, 16387.0);
+    EXPECT_EQ(radius, 16457.0);
     EXPECT_EQ(row, before);
 }
 

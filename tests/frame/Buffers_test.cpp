@@ -234,11 +234,21 @@ TEST(Buffers, PlaneOffsetsWrapIn32Bits) {
     EXPECT_EQ(static_cast<int64_t>(Address(planes[2]) - Address(&byte)), -1073741824);
 }
 
+TEST(Buffers, PlanesOfNoBlockAreTheirOffsets) {
+    void* planes[3] = {&planes, &planes, &planes};
+    int32_t rowBytes[3] = {};
+    ASSERT_EQ(PK_GetPlanarBuffers(nullptr, 0, 720, 480, planes, rowBytes), PK_Success);
+    EXPECT_EQ(Address(planes[0]), 0u);
+    EXPECT_EQ(Address(planes[1]), 768u * 480);
+    EXPECT_EQ(Address(planes[2]), 768u * 480 + 384 * 240);
+    EXPECT_EQ(rowBytes[0], 768);
+    EXPECT_EQ(rowBytes[1], 384);
+}
+
 TEST(Buffers, PlanesOfImpossibleArgumentsAreRefused) {
     uint8_t byte = 0;
     void* planes[3] = {};
     int32_t rowBytes[3] = {5, 5, 5};
-    EXPECT_EQ(PK_GetPlanarBuffers(nullptr, 0, 16, 16, planes, rowBytes), PK_ErrFailed);
     EXPECT_EQ(PK_GetPlanarBuffers(&byte, 0, 16, 16, nullptr, rowBytes), PK_ErrFailed);
     EXPECT_EQ(PK_GetPlanarBuffers(&byte, 0, 16, 16, planes, nullptr), PK_ErrFailed);
     EXPECT_EQ(PK_GetPlanarBuffers(&byte, 0, -1, 16, planes, rowBytes), PK_ErrFailed);
@@ -281,10 +291,17 @@ TEST(Buffers, ClippingRefusesAllButFourChannels) {
     }
 }
 
-TEST(Buffers, ClippingRefusesNull) {
+TEST(Buffers, ClippingNoBufferGivesTheCornersOffset) {
     uint8_t byte = 0;
     void* clipped = &byte;
-    EXPECT_EQ(PK_ClipBufferToRect(nullptr, 64, 1, 1, 4, 1, 1, &clipped), PK_ErrFailed);
-    EXPECT_EQ(clipped, &byte);
+    ASSERT_EQ(PK_ClipBufferToRect(nullptr, 64, 1, 1, 4, 3, 2, &clipped), PK_Success);
+    EXPECT_EQ(Address(clipped), 2u * 64 + 12);
+    ASSERT_EQ(PK_ClipBufferToRect(nullptr, -64, 1, 1, 4, 3, 2, &clipped), PK_Success);
+    EXPECT_EQ(static_cast<int64_t>(Address(clipped)), -2 * 64 + 12);
+    EXPECT_EQ(PK_ClipBufferToRect(nullptr, 64, 1, 1, 0x811, 3, 2, &clipped), PK_ErrBadSrcFormat);
+}
+
+TEST(Buffers, ClippingRefusesANullOutput) {
+    uint8_t byte = 0;
     EXPECT_EQ(PK_ClipBufferToRect(&byte, 64, 1, 1, 4, 1, 1, nullptr), PK_ErrFailed);
 }

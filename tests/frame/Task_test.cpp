@@ -3,48 +3,24 @@
 
 #include "frame/Task.h"
 
+#include "support/Allocations.h"
 #include "support/CallCounts.h"
 #include "support/ThreadCount.h"
 
 #include <PixelKiln/Lifecycle.h>
 
 #include <algorithm>
-#include <atomic>
 #include <chrono>
-#include <cstdlib>
 #include <gtest/gtest.h>
-#include <new>
 #include <stdexcept>
 #include <thread>
 #include <vector>
 
+using PKTest::AllocationCount;
 using PKTest::CallCounts;
 using PKTest::RestingThreadCount;
 using PKTest::SettledThreadCount;
 using namespace PK::Threading;
-
-namespace {
-
-std::atomic<int> sAllocations = 0;
-
-} // namespace
-
-// Counted in the whole test program. Not inlined: g++ 12 would see a mismatch where it inlines only one of a pair.
-[[gnu::noinline]] void* operator new(size_t size) {
-    ++sAllocations;
-    if (void* memory = std::malloc(size != 0 ? size : 1)) return memory;
-    throw std::bad_alloc();
-}
-[[gnu::noinline]] void* operator new(size_t size, const std::nothrow_t&) noexcept {
-    ++sAllocations;
-    return std::malloc(size != 0 ? size : 1);
-}
-[[gnu::noinline]] void operator delete(void* memory) noexcept {
-    std::free(memory);
-}
-[[gnu::noinline]] void operator delete(void* memory, size_t) noexcept {
-    std::free(memory);
-}
 
 namespace {
 
@@ -133,13 +109,13 @@ TEST_F(TaskTest, LetsAnExceptionThrough) {
 TEST_F(TaskTest, AllocatesNothing) {
     const EmptyTask task;
     RunTaskOnAllProcessors(task);
-    const int before = sAllocations;
+    const int before = AllocationCount();
     for (int i = 0; i < 200; ++i) {
         RunTaskOnAllProcessors(task);
         std::this_thread::sleep_for(
             std::chrono::microseconds(100)); // the pool falls asleep and is woken anew
     }
-    EXPECT_EQ(sAllocations, before);
+    EXPECT_EQ(AllocationCount(), before);
 }
 
 TEST(TaskExecutor, LivesFromTheFirstStartToTheLastStop) {

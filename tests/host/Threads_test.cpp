@@ -1,6 +1,7 @@
 // Tasks on the bundled pool: every part once, nested, from many threads, with exceptions; and the executor's life.
 
 #include "support/CallCounts.h"
+#include "support/FloatEnvironment.h"
 #include "support/ThreadCount.h"
 
 #include "zebcore/CPUBoundPool.h"
@@ -17,14 +18,44 @@
 #include <vector>
 
 using namespace zebcore::threads;
-using PKTest::CallCounts;
 
 namespace {
 
+using namespace PKTest;
+
 class PoolOfThreads : public testing::TestWithParam<uint32_t> {
 protected:
+    /// Runs a task of which every thread takes one part, all at the same time.
+    template <class Part>
+    void RunOnAllThreads(const Part& part) {
+        const auto threads = static_cast<int32_t>(GetParam() + 1);
+        std::barrier everyone(threads);
+        fPool.Run(
+            [&](int32_t index) {
+                everyone.arrive_and_wait();
+                part(index);
+            },
+            threads);
+    }
+
     CPUBoundPool fPool{GetParam()};
 };
+
+// Divides there and then, in the mode of the moment.
+float Divide(float dividend, float divisor) {
+    const volatile float numerator = dividend, denominator = divisor;
+    const volatile float quotient = numerator / denominator;
+    return quotient;
+}
+
+// Notes the floating-point mode in which its thread ends.
+struct ModeAtThreadExit {
+    std::atomic<uint32_t>* mode = nullptr;
+    ~ModeAtThreadExit() {
+        if (mode != nullptr) *mode = _mm_getcsr();
+    }
+};
+thread_local ModeAtThreadExit sModeAtThreadExit;
 
 void RunNested(CPUBoundPool& pool, int depth, std::atomic<int>& calls) {
     pool.Run(
@@ -72,19 +103,94 @@ TEST_P(PoolOfThreads, RunsEveryPartOnce) {
 }
 
 TEST_P(PoolOfThreads, AllWorkTogetherWithTheCaller) {
-    const auto threads = static_cast<int32_t>(GetParam() + 1);
     for (int round = 0; round < 20; ++round) {
-        std::barrier everyone(threads); // a part ends only when all have begun
         std::atomic<int> ofCaller = 0;
         const std::thread::id caller = std::this_thread::get_id();
-        fPool.Run(
-            [&](int32_t) {
-                everyone.arrive_and_wait();
-                ofCaller += std::this_thread::get_id() == caller;
-            },
-            threads);
+        RunOnAllThreads([&](int32_t) { ofCaller += std::this_thread::get_id() == caller; });
         EXPECT_EQ(ofCaller, 1);
     }
+}
+
+TEST_P(PoolOfThreads, WorkInTheFloatingPointModeOfTheCaller) {
+    for (const uint32_t mode : {0u, kRoundDown, kRoundUp, kRoundToZero, kFlushToZero, kDenormalsAreZero,
+                                kRoundUp | kFlushToZero | kExceptionFlags}) {
+        const FloatEnvironment environment(mode);
+        const float third = Divide(1, 3), tiny = Divide(0x1p-126f, 2), denormal = Divide(0x1p-127f, 0x1p-10f);
+        std::atomic<int> equal = 0;
+        RunOnAllThreads([&](int32_t) {
+            const bool isMode = ((_mm_getcsr() ^ (kDefaultMXCSR | mode)) & ~kExceptionFlags) == 0;
+            equal += isMode && Divide(1, 3) == third && Divide(0x1p-126f, 2) == tiny &&
+                     Divide(0x1p-127f, 0x1p-10f) == denormal;
+        });
+        EXPECT_EQ(equal, static_cast<int>(GetParam() + 1)) << std::hex << mode;
+    }
+}
+
+TEST_P(PoolOfThreads, WorkInTheModeOfTheInnermostTask) {
+    const FloatEnvironment environment(kRoundUp);
+    std::atomic<int> wrong = 0;
+    fPool.Run(
+        [&](int32_t outer) {
+            wrong += _mm_getcsr() != (kDefaultMXCSR | kRoundUp);
+            const FloatEnvironment ofPart(outer % 2 == 0 ? kRoundDown : kFlushToZero);
+            const uint32_t mode = _mm_getcsr();
+            fPool.Run([&wrong, mode](int32_t) { wrong += _mm_getcsr() != mode; }, 8);
+        },
+        32);
+    EXPECT_EQ(wrong, 0);
+}
+
+TEST_P(PoolOfThreads, GiveTheExceptionFlagsThatTheyRaiseToTheCaller) {
+    constexpr uint32_t kDivideByZero = 4, kOverflow = 8, kInexact = 32;
+    const auto threads = static_cast<int32_t>(GetParam() + 1);
+    const FloatEnvironment environment(kOverflow);
+    RunOnAllThreads([threads](int32_t part) {
+        if (part == threads - 1) Divide(1, 0);
+        if (part == 0) Divide(1, 3);
+    });
+    EXPECT_EQ(_mm_getcsr(), kDefaultMXCSR | kOverflow | kDivideByZero | kInexact);
+}
+
+TEST_P(PoolOfThreads, ShowNoTaskTheExceptionFlagsOfAnother) {
+    {
+        const FloatEnvironment environment(0);
+        RunOnAllThreads([](int32_t) { Divide(1, 0); });
+    }
+    const FloatEnvironment environment(0);
+    std::atomic<int> clear = 0;
+    RunOnAllThreads([&clear](int32_t) { clear += _mm_getcsr() == kDefaultMXCSR; });
+    EXPECT_EQ(clear, static_cast<int>(GetParam() + 1));
+    EXPECT_TRUE(environment.IsAsGiven());
+}
+
+TEST_P(PoolOfThreads, GiveTheExceptionFlagsOfATaskThatThrows) {
+    const FloatEnvironment environment(0);
+    EXPECT_THROW(RunOnAllThreads([](int32_t) {
+                     Divide(1, 0);
+                     throw std::runtime_error("after the division");
+                 }),
+                 std::runtime_error);
+    EXPECT_EQ(_mm_getcsr(), kDefaultMXCSR | 4);
+}
+
+TEST(CPUBoundPool, HasItsOwnFloatingPointModeAgainAfterATask) {
+    std::atomic<uint32_t> modeOfHelper = 0;
+    {
+        const FloatEnvironment atStart(kRoundDown);
+        CPUBoundPool pool(1);
+        const FloatEnvironment ofTask(kRoundUp | kFlushToZero);
+        std::latch bothBegun(2);
+        const std::thread::id caller = std::this_thread::get_id();
+        pool.Run(
+            [&](int32_t) {
+                bothBegun.arrive_and_wait();
+                if (std::this_thread::get_id() == caller) return;
+                sModeAtThreadExit.mode = &modeOfHelper;
+                Divide(1, 0);
+            },
+            2);
+    }
+    EXPECT_EQ(modeOfHelper, kDefaultMXCSR | kRoundDown);
 }
 
 TEST_P(PoolOfThreads, RunsTasksWithinTasks) {
@@ -198,19 +304,16 @@ TEST(CPUBoundPool, CarriesTheExceptionThatCameFirst) {
     }
 }
 
-TEST(CPUBoundPool, LeavesSignalsToTheProgram) {
-    CPUBoundPool pool(1);
-    std::latch bothBegun(2);
-    std::atomic<int> blocked = 0;
-    pool.Run(
-        [&](int32_t) {
-            bothBegun.arrive_and_wait();
-            sigset_t mask;
-            pthread_sigmask(SIG_SETMASK, nullptr, &mask);
-            blocked += sigismember(&mask, SIGTERM);
-        },
-        2);
-    EXPECT_EQ(blocked, 1); // the helper's
+TEST_P(PoolOfThreads, LeaveSignalsButTheirOwnFaultsToTheProgram) {
+    std::atomic<int> blockSignals = 0, blockFaults = 0;
+    RunOnAllThreads([&](int32_t) {
+        sigset_t mask;
+        pthread_sigmask(SIG_SETMASK, nullptr, &mask);
+        blockSignals += sigismember(&mask, SIGTERM) == 1 && sigismember(&mask, SIGALRM) == 1;
+        for (const int fault : {SIGBUS, SIGFPE, SIGILL, SIGSEGV}) blockFaults += sigismember(&mask, fault);
+    });
+    EXPECT_EQ(blockSignals, static_cast<int>(GetParam())); // all but the caller
+    EXPECT_EQ(blockFaults, 0);
 }
 
 TEST(CPUBoundPool, WorksWithoutTheThreadsThatCannotBeHad) {

@@ -4,8 +4,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/PixelFormat.h>
 
@@ -69,8 +67,7 @@ std::function<bool()> PrepareMemoryBlocks() {
 
 Call Flip(int32_t width, int32_t height, PKTest::Random& random) {
     constexpr PK_PixelFormat kFormat = PK_PixelFormat_BGRA_4444_8u;
-    return {random.Bytes(static_cast<size_t>(PK_PixelFormatSize(kFormat, width, height))),
-            [=](uint8_t* image) {
+    return {RandomImage(kFormat, width, height, random), [=](uint8_t* image) {
                 return PK_FlipInPlace(image, PK_PixelFormatRowBytes(kFormat, width), width, height, kFormat);
             }};
 }

@@ -31,4 +31,9 @@ std::function<bool()> Repeat(const std::vector<Call>& calls) {
     return [repetitions] { return std::ranges::all_of(repetitions, &Repetition::ComesOutRight); };
 }
 
+std::vector<uint8_t> RandomImage(PK_PixelFormat format, int32_t width, int32_t height,
+                                 PKTest::Random& random) {
+    return random.Bytes(static_cast<size_t>(PK_PixelFormatSize(format, width, height)));
+}
+
 } // namespace PKStress

@@ -3,8 +3,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/Convert.h>
 
 namespace {
@@ -26,22 +24,17 @@ constexpr Conversion kConversions[] = {
     {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_V210_422_10u, 17001, 3}, // scratch rows of the recycler
 };
 
-std::vector<uint8_t> RandomImage(PK_PixelFormat format, const Conversion& conversion,
-                                 PKTest::Random& random) {
-    return random.Bytes(static_cast<size_t>(PK_PixelFormatSize(format, conversion.width, conversion.height)));
-}
-
 std::function<bool()> PrepareConvert() {
     PKTest::Random random(11);
     std::vector<Call> calls;
     for (const Conversion& pair : kConversions)
-        calls.push_back({RandomImage(pair.destination, pair, random),
-                         [pair, source = RandomImage(pair.source, pair, random)](uint8_t* image) {
-                             return PK_Convert(source.data(), PK_PixelFormatRowBytes(pair.source, pair.width),
-                                               pair.source, image,
-                                               PK_PixelFormatRowBytes(pair.destination, pair.width),
-                                               pair.destination, pair.width, pair.height, 4);
-                         }});
+        calls.push_back(
+            {RandomImage(pair.destination, pair.width, pair.height, random),
+             [pair, source = RandomImage(pair.source, pair.width, pair.height, random)](uint8_t* image) {
+                 return PK_Convert(source.data(), PK_PixelFormatRowBytes(pair.source, pair.width),
+                                   pair.source, image, PK_PixelFormatRowBytes(pair.destination, pair.width),
+                                   pair.destination, pair.width, pair.height, 4);
+             }});
     return Repeat(calls);
 }
 

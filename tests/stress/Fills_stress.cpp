@@ -3,8 +3,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/Fills.h>
 
 #include <span>
@@ -34,8 +32,7 @@ PK_Result FillWithColor(void* image, int32_t rowBytes, int32_t width, int32_t he
 void AddFills(std::vector<Call>& calls, Fill fill, std::span<const PK_PixelFormat> formats) {
     PKTest::Random random(12);
     for (const PK_PixelFormat format : formats)
-        calls.push_back({random.Bytes(static_cast<size_t>(PK_PixelFormatSize(format, kWidth, kHeight))),
-                         [=](uint8_t* image) {
+        calls.push_back({RandomImage(format, kWidth, kHeight, random), [=](uint8_t* image) {
                              return fill(image, PK_PixelFormatRowBytes(format, kWidth), kWidth, kHeight,
                                          format);
                          }});

@@ -3,8 +3,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/Overlay.h>
 
 namespace {
@@ -24,15 +22,11 @@ constexpr Choice kChoices[] = {
      2}, // scratch rows of the recycler
 };
 
-std::vector<uint8_t> RandomImage(PK_PixelFormat format, const Choice& choice, PKTest::Random& random) {
-    return random.Bytes(static_cast<size_t>(PK_PixelFormatSize(format, choice.width, choice.height)));
-}
-
 Call Choose(const Choice& choice, PKTest::Random& random) {
     const int32_t maskBytes = choice.width / 8 + 2;
-    return {RandomImage(choice.destination, choice, random),
-            [choice, maskBytes, first = RandomImage(choice.first, choice, random),
-             second = RandomImage(choice.second, choice, random),
+    return {RandomImage(choice.destination, choice.width, choice.height, random),
+            [choice, maskBytes, first = RandomImage(choice.first, choice.width, choice.height, random),
+             second = RandomImage(choice.second, choice.width, choice.height, random),
              mask = random.Bytes(static_cast<size_t>(maskBytes * choice.height))](uint8_t* image) {
                 const auto rowBytes = [&](PK_PixelFormat format) {
                     return PK_PixelFormatRowBytes(format, choice.width);
@@ -58,8 +52,7 @@ std::function<bool()> PrepareNumber() {
     for (const PK_PixelFormat format : {PK_PixelFormat_ARGB_4444_8u, PK_PixelFormat_BGRA_4444_32f,
                                         PK_PixelFormat_YUYV_422_8u, PK_PixelFormat_YUV_420_MPEG2_FIELD})
         for (const bool decimal : {false, true})
-            calls.push_back({random.Bytes(static_cast<size_t>(PK_PixelFormatSize(format, kWidth, kHeight))),
-                             [=](uint8_t* image) {
+            calls.push_back({RandomImage(format, kWidth, kHeight, random), [=](uint8_t* image) {
                                  return PK_PrintNum(image, PK_PixelFormatRowBytes(format, kWidth), format,
                                                     kWidth, kHeight, -406, 0.1f, {0.1f, 0.1f}, decimal);
                              }});

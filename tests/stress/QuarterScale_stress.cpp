@@ -3,8 +3,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/Planar.h>
 #include <PixelKiln/QuarterScale.h>
@@ -33,12 +31,12 @@ struct Planes {
     int32_t rowBytes[3];
 };
 
-std::vector<uint8_t> RandomImage(Size size, PKTest::Random& random) {
-    return random.Bytes(static_cast<size_t>(PK_PixelFormatSize(kFormat, size.width, size.height)));
+std::vector<uint8_t> RandomPlanes(Size size, PKTest::Random& random) {
+    return RandomImage(kFormat, size.width, size.height, random);
 }
 
 Call Copy(Size size, PKTest::Random& random) {
-    return {RandomImage(size, random), [size, source = RandomImage(size, random)](uint8_t* image) {
+    return {RandomPlanes(size, random), [size, source = RandomPlanes(size, random)](uint8_t* image) {
                 const Planes from(source, size), to(image, size);
                 return PK_CopyPlanar_8u(from.first, from.rowBytes, to.first, to.rowBytes, size.width,
                                         size.height);
@@ -47,7 +45,7 @@ Call Copy(Size size, PKTest::Random& random) {
 
 Call Reduce(int32_t field, PKTest::Random& random) {
     constexpr Size kSource = {2 * kSize.width, kSize.height}; // the width counts samples that are written
-    return {RandomImage(kSize, random), [field, source = RandomImage(kSource, random)](uint8_t* image) {
+    return {RandomPlanes(kSize, random), [field, source = RandomPlanes(kSource, random)](uint8_t* image) {
                 const Planes from(source, kSource), to(image, kSize);
                 return PK_QuarterScalePlanar420_8u(from.first, from.rowBytes, to.first, to.rowBytes,
                                                    kSize.width, kSize.height, field);
@@ -57,7 +55,7 @@ Call Reduce(int32_t field, PKTest::Random& random) {
 Call ReduceToPacked(bool yuyvOrder, int32_t field, PKTest::Random& random) {
     constexpr int32_t kRowBytes = (kSize.width + 1) / 2 * 4;
     return {random.Bytes(kRowBytes * kSize.height / 2),
-            [yuyvOrder, field, source = RandomImage(kSize, random)](uint8_t* image) {
+            [yuyvOrder, field, source = RandomPlanes(kSize, random)](uint8_t* image) {
                 const Planes from(source, kSize);
                 return PK_QuarterScalePlanar_8uAndConvertTo422_8u(
                     from.first, from.rowBytes, image, kRowBytes, kSize.width, kSize.height, yuyvOrder, field);

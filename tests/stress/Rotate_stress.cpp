@@ -3,8 +3,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/PixelFormat.h>
 #include <PixelKiln/Rotate.h>
 

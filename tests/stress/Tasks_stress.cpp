@@ -1,10 +1,14 @@
-// Tasks, tasks within tasks and tasks that throw.
+// Tasks, tasks within tasks, tasks that throw, bands, and the floating-point mode in which all of them run.
 
 #include "stress/Operation.h"
 
+#include "frame/Bands.h"
 #include "frame/Task.h"
+#include "support/FloatEnvironment.h"
 
+#include <algorithm>
 #include <array>
+#include <atomic>
 #include <cstdint>
 #include <stdexcept>
 
@@ -74,8 +78,43 @@ std::function<bool()> PrepareThrowing() {
     };
 }
 
+/// Rows are counted without atomics, as the parts above. One band fails, and those behind it may be left out.
+bool RunBands(PK::Bands bands, int32_t failingRow) {
+    std::array<int, 100> rows{};
+    const PK_Result result = PK::RunInBands(100, bands, [&](int32_t firstRow, int32_t endRow) {
+        for (int32_t row = firstRow; row < endRow; ++row) ++rows[static_cast<size_t>(row)];
+        return firstRow <= failingRow && failingRow < endRow ? PK_ErrOutOfMemory : PK_Success;
+    });
+    const auto sure = rows.begin() + std::min(failingRow, 100);
+    return result == (failingRow < 100 ? PK_ErrOutOfMemory : PK_Success) &&
+           std::all_of(rows.begin(), sure, [](int count) { return count == 1; }) &&
+           std::all_of(sure, rows.end(), [](int count) { return count <= 1; });
+}
+
+std::function<bool()> PrepareBands() {
+    return [] {
+        return RunBands(PK::Bands::Count(4), 100) && RunBands(PK::Bands::OfRows(3), 100) &&
+               RunBands(PK::Bands::OfRows(3), 40);
+    };
+}
+
+/// Each run has another mode, so that helpers meet tasks of different ones.
+std::function<bool()> PrepareFloatModes() {
+    return [] {
+        static std::atomic<uint32_t> sRuns = 0;
+        const uint32_t rounding = sRuns++ % 4 * PKTest::kRoundDown;
+        const PKTest::FloatEnvironment environment(rounding | PKTest::kExceptionFlags);
+        const PK_Result result = PK::RunInBands(100, PK::Bands::OfRows(3), [&](int32_t, int32_t) {
+            return environment.IsAsGiven() ? PK_Success : PK_ErrFailed;
+        });
+        return result == PK_Success && environment.IsAsGiven();
+    };
+}
+
 const Operation sTasks("tasks", PrepareCounting<Counting>);
 const Operation sNestedTasks("nested-tasks", PrepareCounting<Nesting>);
 const Operation sThrowingTasks("throwing-tasks", PrepareThrowing);
+const Operation sBands("bands", PrepareBands);
+const Operation sFloatModes("float-modes-of-tasks", PrepareFloatModes);
 
 } // namespace

@@ -3,8 +3,6 @@
 #include "stress/Calls.h"
 #include "stress/Operation.h"
 
-#include "support/Random.h"
-
 #include <PixelKiln/Utilities.h>
 
 namespace {
@@ -13,13 +11,9 @@ using namespace PKStress;
 
 constexpr int32_t kWidth = 97, kHeight = 21; // odd: ends of rows take part
 
-size_t ImageBytes(PK_PixelFormat format) {
-    return static_cast<size_t>(PK_PixelFormatSize(format, kWidth, kHeight));
-}
-
 void AddAlphaCalls(std::vector<Call>& calls, PK_PixelFormat format, PKTest::Random& random) {
     const int32_t rowBytes = PK_PixelFormatRowBytes(format, kWidth);
-    const std::vector<uint8_t> source = random.Bytes(ImageBytes(format));
+    const std::vector<uint8_t> source = RandomImage(format, kWidth, kHeight, random);
     for (const bool opaque : {false, true})
         calls.push_back({source, [=](uint8_t* image) {
                              return PK_SetAlphaChannel(kWidth, kHeight, image, rowBytes, format, opaque);
@@ -31,8 +25,8 @@ void AddAlphaCalls(std::vector<Call>& calls, PK_PixelFormat format, PKTest::Rand
 }
 
 Call CopyAndSetAlpha(PK_PixelFormat format, PKTest::Random& random) {
-    return {random.Bytes(ImageBytes(format)),
-            [format, source = random.Bytes(ImageBytes(format))](uint8_t* image) {
+    return {RandomImage(format, kWidth, kHeight, random),
+            [format, source = RandomImage(format, kWidth, kHeight, random)](uint8_t* image) {
                 const int32_t rowBytes = PK_PixelFormatRowBytes(format, kWidth);
                 return PK_CopyAndSetAlpha(source.data(), rowBytes, image, rowBytes, format, kWidth, kHeight,
                                           0.3f);

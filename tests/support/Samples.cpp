@@ -136,8 +136,12 @@ void FillSamples(PK_PixelFormat format, uint8_t* row, size_t bytes, Random& rand
     FillSamples(SamplesOf(format), row, bytes, random);
 }
 
+void FillOrdinarySamples(Samples samples, uint8_t* row, size_t bytes, Random& random) {
+    Fill(samples, row, bytes, random, false);
+}
+
 void FillOrdinarySamples(PK_PixelFormat format, uint8_t* row, size_t bytes, Random& random) {
-    Fill(SamplesOf(format), row, bytes, random, false);
+    FillOrdinarySamples(SamplesOf(format), row, bytes, random);
 }
 
 std::string FirstDifference(Samples samples, size_t bytes, const uint8_t* expected, const uint8_t* actual,

@@ -19,6 +19,7 @@ void FillSamples(PK::Samples samples, uint8_t* row, size_t bytes, Random& random
 
 /// As FillSamples, with values in the format's nominal range only.
 void FillOrdinarySamples(PK_PixelFormat format, uint8_t* row, size_t bytes, Random& random);
+void FillOrdinarySamples(PK::Samples samples, uint8_t* row, size_t bytes, Random& random);
 
 /// Where two rows of a format first differ, in words; empty if they agree. Float samples agree when both are
 /// not-a-number, or when they lie at most `ulps` units in the last place apart.

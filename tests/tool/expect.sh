@@ -38,6 +38,16 @@ is() {
     [ "$2" = "$3" ] || fail "$1: '$2', not '$3'"
 }
 
+# same WHAT FILE FILE: byte by byte
+same() {
+    is "$1" "$(cmp "$2" "$3" && echo equal)" equal
+}
+
+# identical FILE FILE: as pictures
+identical() {
+    expect 0 "identical" compare "$1" "$2" --limit 0
+}
+
 # The bytes of standard input in hexadecimal, on one line.
 hex() {
     od -An -v -tx1 | tr -d '\n' | sed 's/^ //'

@@ -23,10 +23,6 @@ expect 2 "there is no pixel format 'nonsense'; 'pixelkiln formats' lists all" ex
 expect 2 "no pixel format has the number 0x99" explain 0x99 BGRA_4444_8u
 expect 2 "no pixel format has the number 0x4g" explain 0x4g BGRA_4444_8u
 
-expect 0 "Exit codes" --help
-expect 0 "--packed" convert --help
-expect 2 "Subcommands:"
-expect 2 "nosuch" nosuch
 expect 2 "DST is required" explain BGRA_4444_8u
 expect 2 "quality" explain BGRA_4444_8u BGRP_4444_8u --quality 6
 

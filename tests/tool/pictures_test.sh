@@ -9,7 +9,7 @@ is "pictures of the demonstration" "$(ls -A demo | wc -l)" 16
 for picture in demo/[01]*.png; do
     expect 0 "size                451x300" compare "$media/chelsea.png" "$picture" --limit 255
 done
-expect 0 "identical" compare "$media/chelsea.png" demo/08-BGRA_4444_15u.png --limit 0
+identical "$media/chelsea.png" demo/08-BGRA_4444_15u.png
 expect 0 "size                832x684" compare demo/colour.png demo/colour.png
 expect 0 "size                928x544" compare demo/tone-range.png demo/tone-range.png
 

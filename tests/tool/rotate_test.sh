@@ -17,7 +17,7 @@ is "three quarters the other way" "$(turned -270)" "01 02 03"
 
 expect 0 "451x300, BGRA_4444_8u to BGRA_4444_8u" rotate "$media/chelsea.png" quarter.png --degrees 90
 expect 0 "1 frame 300x451" rotate quarter.png back.png --degrees 270
-expect 0 "identical" compare "$media/chelsea.png" back.png --limit 0
+identical "$media/chelsea.png" back.png
 cat in/column.raw in/column.raw > in/two.raw
 expect 0 "2 frames 1x3, BGRA_4444_8u to VUYA_4444_8u" rotate in/two.raw two.raw "${column[@]}" --degrees 90 --to VUYA_4444_8u
 is "two frames" "$(stat -c %s two.raw)" 24

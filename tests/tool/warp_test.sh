@@ -4,10 +4,10 @@
 mkdir in out
 photo=$media/chelsea.png
 expect 0 "451x300" warp "$photo" same.png --quad 0,0,451,0,451,300,0,300
-expect 0 "identical" compare "$photo" same.png --limit 0
+identical "$photo" same.png
 expect 0 "" warp "$photo" turned.png --quad 451,300,0,300,0,0,451,0 --quality 3
 expect 0 "" rotate "$photo" rotated.png --degrees 180
-expect 0 "identical" compare turned.png rotated.png --limit 0
+identical turned.png rotated.png
 
 # A white picture into the upper left corner of a black one: 4 of 8 columns, 2 of 6 rows.
 expect 0 "" fill in/white.png --size 8x6 --colour white
@@ -22,9 +22,9 @@ is "rows from the top" "$(lines corner.png 32 | xargs)" \
 expect 0 "8x6" warp in/white.png half.png --quad 0,0,10,0,10,4,0,4 --onto in/blue.png --opacity 128
 is "onto another size" "$(lines half.png 40 | cut -c 1-8 | xargs)" "ff8080ff ff8080ff ff8080ff ff8080ff"
 expect 0 "" warp in/white.png none.png --quad 0,0,10,0,10,4,0,4 --onto in/blue.png --opacity 0
-expect 0 "identical" compare none.png in/blue.png --limit 0
+identical none.png in/blue.png
 expect 0 "" warp in/white.png outside.png --quad=-30,0,-20,0,-20,4,-30,4 --onto in/blue.png
-expect 0 "identical" compare outside.png in/blue.png --limit 0
+identical outside.png in/blue.png
 
 # A soft rim is dark at the corner and bright inside.
 expect 0 "" fill in/large.png --size 64x64 --colour white

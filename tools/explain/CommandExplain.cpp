@@ -1,14 +1,28 @@
 // pixelkiln explain: the chain of kernels between two formats.
 
 #include "Chains.h"
-#include "Commands.h"
+#include "Command.h"
 #include "Failure.h"
 #include "Formats.h"
+#include "SharedWords.h"
 #include "Terminal.h"
 
 namespace tool {
+namespace {
 
-void RunExplain(const ExplainOptions& options) {
+struct Options {
+    std::string source;
+    std::string destination;
+    int32_t quality = kDefaultQuality;
+};
+
+void Declare(Words& words, Options& options) {
+    words.Take("SRC", options.source, "Format to start from").Required();
+    words.Take("DST", options.destination, "Format to end in").Required();
+    AddQuality(words, options.quality);
+}
+
+void Run(const Options& options) {
     const PK_PixelFormat source = ParseFormat(options.source);
     const PK_PixelFormat destination = ParseFormat(options.destination);
     for (const PK_PixelFormat format : {source, destination})
@@ -33,4 +47,8 @@ void RunExplain(const ExplainOptions& options) {
           (passes == 1 ? " pass" : " passes") + " over the row\n" + table.Aligned());
 }
 
+const Command sExplain(Group::Listings, "explain", "Show the chain of kernels between two formats", Declare,
+                       Run);
+
+} // namespace
 } // namespace tool

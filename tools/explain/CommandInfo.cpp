@@ -1,6 +1,6 @@
 // pixelkiln info: the machine as the library sees it.
 
-#include "Commands.h"
+#include "Command.h"
 #include "Terminal.h"
 #include "explain/TargetNames.h"
 #include "frame/Capabilities.h"
@@ -49,9 +49,7 @@ std::string CacheText(int name) {
     return bytes > 0 ? std::to_string(bytes / 1024) + " KiB" : "unknown";
 }
 
-} // namespace
-
-void RunInfo() {
+void Run() {
     Print("PixelKiln   " PIXELKILN_VERSION "\n"
           "processor   " +
           ProcessorName() + "\n" + "threads     " + std::to_string(std::thread::hardware_concurrency()) +
@@ -60,4 +58,7 @@ void RunInfo() {
           "\n" + "L3          " + CacheText(_SC_LEVEL3_CACHE_SIZE) + "\n");
 }
 
+const Command sInfo(Group::Listings, "info", "Show version, processor, flags and caches", Run);
+
+} // namespace
 } // namespace tool

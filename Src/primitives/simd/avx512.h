@@ -88,10 +88,10 @@ inline void PairHalves(F32 a, F32 b, F32& lower, F32& upper) {
     upper = JoinHalves(UpperHalf(a), UpperHalf(b));
 }
 
-/// In halves: the estimate of 512 bits is another, more precise one.
 inline F32 SquareRoot(F32 a) {
     return {_mm512_sqrt_ps(a.v)};
 }
+/// In halves: the estimate of 512 bits is another, more precise one.
 inline F32 ReciprocalEstimate(F32 a) {
     return JoinHalves(_mm256_rcp_ps(LowerHalf(a)), _mm256_rcp_ps(UpperHalf(a)));
 }

@@ -11,8 +11,8 @@ Run Decode(const Image& source, const Image&) {
 }
 
 template <AVPixelFormat kFormat>
-Run Encode(const Image&, const Image&) {
-    return [encoder = std::make_shared<V210Encoder>(kFormat)] { encoder->Encode(); };
+Run Encode(const Image& source, const Image&) {
+    return [encoder = std::make_shared<V210Encoder>(kFormat, source.size)] { encoder->Encode(); };
 }
 
 const AddPeers add = {

@@ -15,28 +15,32 @@ template <Function function>
 Run Interleaved(const Image& source, const Image& destination) {
     const Rows from = FromTop(source);
     const Rows to = FromTop(destination);
-    return [=] { function(from.first, from.rowBytes, to.first, to.rowBytes, kWidth, kHeight); };
+    return [=, size = source.size] {
+        function(from.first, from.rowBytes, to.first, to.rowBytes, size.width, size.height);
+    };
 }
 
 Run SwapPairs(const Image& source, const Image& destination) {
-    return [from = FromTop(source), to = FromTop(destination)] {
-        libyuv::SwapUVPlane(from.first, from.rowBytes, to.first, to.rowBytes, kWidth, kHeight);
+    return [from = FromTop(source), to = FromTop(destination), size = source.size] {
+        libyuv::SwapUVPlane(from.first, from.rowBytes, to.first, to.rowBytes, size.width, size.height);
     };
 }
 
 Run ToPlanar(const Image& source, const Image&) {
-    return [from = FromTop(source), to = std::make_shared<Planes>(3, kWidth)] {
-        libyuv::ARGBToI444(from.first, from.rowBytes, to->Plane(0), kWidth, to->Plane(1), kWidth,
-                           to->Plane(2), kWidth, kWidth, kHeight);
+    const int32_t width = source.size.width, height = source.size.height;
+    return [=, from = FromTop(source), to = std::make_shared<Planes>(3, width, height)] {
+        libyuv::ARGBToI444(from.first, from.rowBytes, to->Plane(0), width, to->Plane(1), width, to->Plane(2),
+                           width, width, height);
     };
 }
 
 Run FromPlanar(const Image&, const Image& destination) {
-    const auto from = std::make_shared<Planes>(4, kWidth);
-    from->Fill<uint8_t>(kWidth, 16, 236);
-    return [from, to = FromTop(destination)] {
-        libyuv::I444AlphaToARGB(from->Plane(0), kWidth, from->Plane(1), kWidth, from->Plane(2), kWidth,
-                                from->Plane(3), kWidth, to.first, to.rowBytes, kWidth, kHeight, 0);
+    const int32_t width = destination.size.width, height = destination.size.height;
+    const auto from = std::make_shared<Planes>(4, width, height);
+    from->Fill<uint8_t>(width, 16, 236);
+    return [=, to = FromTop(destination)] {
+        libyuv::I444AlphaToARGB(from->Plane(0), width, from->Plane(1), width, from->Plane(2), width,
+                                from->Plane(3), width, to.first, to.rowBytes, width, height, 0);
     };
 }
 

@@ -18,23 +18,25 @@ int RowSamples(const AVFrame& frame, int plane) {
 }
 
 Run ToBGRA(const Image& source, const Image& destination) {
-    return [decoder = std::make_shared<V210Decoder>(source), to = FromTop(destination)] {
+    return [decoder = std::make_shared<V210Decoder>(source), to = FromTop(destination), size = source.size] {
         const AVFrame& frame = decoder->Decode();
         libyuv::I210ToARGB(Samples(frame, 0), RowSamples(frame, 0), Samples(frame, 1), RowSamples(frame, 1),
-                           Samples(frame, 2), RowSamples(frame, 2), to.first, to.rowBytes, kWidth, kHeight);
+                           Samples(frame, 2), RowSamples(frame, 2), to.first, to.rowBytes, size.width,
+                           size.height);
     };
 }
 
 // By way of 8-bit planes, for there is no shorter one.
 Run ToUYVY(const Image& source, const Image& destination) {
-    return [decoder = std::make_shared<V210Decoder>(source), planes = std::make_shared<Planes>(3, kWidth),
-            to = FromTop(destination)] {
+    const int32_t width = source.size.width, height = source.size.height;
+    return [=, decoder = std::make_shared<V210Decoder>(source),
+            planes = std::make_shared<Planes>(3, width, height), to = FromTop(destination)] {
         const AVFrame& frame = decoder->Decode();
         libyuv::I210ToI422(Samples(frame, 0), RowSamples(frame, 0), Samples(frame, 1), RowSamples(frame, 1),
-                           Samples(frame, 2), RowSamples(frame, 2), planes->Plane(0), kWidth,
-                           planes->Plane(1), kWidth, planes->Plane(2), kWidth, kWidth, kHeight);
-        libyuv::I422ToUYVY(planes->Plane(0), kWidth, planes->Plane(1), kWidth, planes->Plane(2), kWidth,
-                           to.first, to.rowBytes, kWidth, kHeight);
+                           Samples(frame, 2), RowSamples(frame, 2), planes->Plane(0), width, planes->Plane(1),
+                           width, planes->Plane(2), width, width, height);
+        libyuv::I422ToUYVY(planes->Plane(0), width, planes->Plane(1), width, planes->Plane(2), width,
+                           to.first, to.rowBytes, width, height);
     };
 }
 

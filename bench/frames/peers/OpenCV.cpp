@@ -12,7 +12,8 @@ namespace {
 
 template <int kType>
 cv::Mat Wrap(const Image& image) {
-    return {kHeight, kWidth, kType, image.bytes.get(), static_cast<size_t>(image.rowBytes)};
+    return {image.size.height, image.size.width, kType, image.bytes.get(),
+            static_cast<size_t>(image.rowBytes)};
 }
 
 template <int kType>

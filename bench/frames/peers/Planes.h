@@ -10,11 +10,11 @@
 
 namespace FrameBench {
 
-/// Planes of the frame's height, of samples that are 0 until they are filled.
+/// Planes of samples that are 0 until they are filled.
 class Planes {
 public:
-    Planes(int count, int32_t rowBytes) {
-        for (int i = 0; i < count; ++i) fPlanes.push_back(Allocate(static_cast<size_t>(rowBytes) * kHeight));
+    Planes(int count, int32_t rowBytes, int32_t height) : fHeight(static_cast<size_t>(height)) {
+        for (int i = 0; i < count; ++i) fPlanes.push_back(Allocate(static_cast<size_t>(rowBytes) * fHeight));
     }
 
     uint8_t* Plane(int index) const { return fPlanes[static_cast<size_t>(index)].get(); }
@@ -25,10 +25,11 @@ public:
         std::mt19937 random(1);
         for (const Bytes& plane : fPlanes)
             FillRandom(random, reinterpret_cast<Sample*>(plane.get()),
-                       static_cast<size_t>(samplesInRow) * kHeight, low, high);
+                       static_cast<size_t>(samplesInRow) * fHeight, low, high);
     }
 
 private:
+    size_t fHeight;
     std::vector<Bytes> fPlanes;
 };
 

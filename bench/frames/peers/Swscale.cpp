@@ -14,28 +14,31 @@ namespace FrameBench {
 namespace {
 
 struct Picture {
+    Size size;
     std::array<uint8_t*, 4> planes;
     std::array<int, 4> rowBytes;
 };
 
 Picture Interleaved(const Image& image) {
     const Rows rows = FromTop(image);
-    return {{rows.first}, {rows.rowBytes}};
+    return {image.size, {rows.first}, {rows.rowBytes}};
 }
 
-Picture Planar(const Planes& planes) {
-    return {{planes.Plane(0), planes.Plane(1), planes.Plane(2), planes.Plane(3)},
-            {kWidth, kWidth, kWidth, kWidth}};
+Picture Planar(const Planes& planes, Size size) {
+    return {size,
+            {planes.Plane(0), planes.Plane(1), planes.Plane(2), planes.Plane(3)},
+            {size.width, size.width, size.width, size.width}};
 }
 
 Run Scale(const Picture& from, AVPixelFormat source, const Picture& to, AVPixelFormat destination) {
-    const std::shared_ptr<SwsContext> context(sws_getContext(kWidth, kHeight, source, kWidth, kHeight,
+    const auto [width, height] = from.size;
+    const std::shared_ptr<SwsContext> context(sws_getContext(width, height, source, width, height,
                                                              destination, SWS_FAST_BILINEAR, nullptr, nullptr,
                                                              nullptr),
                                               sws_freeContext);
     return [=] {
-        sws_scale(context.get(), from.planes.data(), from.rowBytes.data(), 0, kHeight, to.planes.data(),
-                  to.rowBytes.data());
+        sws_scale(context.get(), from.planes.data(), from.rowBytes.data(), 0, from.size.height,
+                  to.planes.data(), to.rowBytes.data());
     };
 }
 
@@ -45,15 +48,18 @@ Run BetweenInterleaved(const Image& source, const Image& destination) {
 }
 
 Run ToPlanar(const Image& source, const Image&) {
-    const auto planes = std::make_shared<Planes>(4, kWidth);
-    const Run run = Scale(Interleaved(source), AV_PIX_FMT_BGRA, Planar(*planes), AV_PIX_FMT_YUVA444P);
+    const Size size = source.size;
+    const auto planes = std::make_shared<Planes>(4, size.width, size.height);
+    const Run run = Scale(Interleaved(source), AV_PIX_FMT_BGRA, Planar(*planes, size), AV_PIX_FMT_YUVA444P);
     return [planes, run] { run(); };
 }
 
 Run FromPlanar(const Image&, const Image& destination) {
-    const auto planes = std::make_shared<Planes>(4, kWidth);
-    planes->Fill<uint8_t>(kWidth, 16, 236);
-    const Run run = Scale(Planar(*planes), AV_PIX_FMT_YUVA444P, Interleaved(destination), AV_PIX_FMT_BGRA);
+    const Size size = destination.size;
+    const auto planes = std::make_shared<Planes>(4, size.width, size.height);
+    planes->Fill<uint8_t>(size.width, 16, 236);
+    const Run run =
+        Scale(Planar(*planes, size), AV_PIX_FMT_YUVA444P, Interleaved(destination), AV_PIX_FMT_BGRA);
     return [planes, run] { run(); };
 }
 

@@ -15,10 +15,10 @@ void Require(bool condition, const char* what) {
     std::exit(1);
 }
 
-CodecContext MakeContext(const AVCodec* codec, AVPixelFormat format, void* owner) {
+CodecContext MakeContext(const AVCodec* codec, AVPixelFormat format, Size size, void* owner) {
     CodecContext context(avcodec_alloc_context3(codec));
-    context->width = kWidth;
-    context->height = kHeight;
+    context->width = size.width;
+    context->height = size.height;
     context->pix_fmt = format;
     context->time_base = {1, 25};
     context->thread_count = 1;
@@ -27,10 +27,10 @@ CodecContext MakeContext(const AVCodec* codec, AVPixelFormat format, void* owner
     return context;
 }
 
-Frame AllocatePicture(AVPixelFormat format) {
+Frame AllocatePicture(AVPixelFormat format, Size size) {
     Frame frame(av_frame_alloc());
-    frame->width = kWidth;
-    frame->height = kHeight;
+    frame->width = size.width;
+    frame->height = size.height;
     frame->format = format;
     Require(av_frame_get_buffer(frame.get(), 64) == 0, "no picture");
     return frame;
@@ -62,18 +62,19 @@ template <class Sample>
 void FillPlanes(const AVFrame& frame, float low, float high) {
     std::mt19937 random(1);
     for (int i = 0; i < 3; ++i)
-        for (int row = 0; row < kHeight; ++row)
+        for (int row = 0; row < frame.height; ++row)
             FillRandom(
                 random,
                 reinterpret_cast<Sample*>(frame.data[i] + static_cast<ptrdiff_t>(row) * frame.linesize[i]),
-                i == 0 ? kWidth : kWidth / 2, low, high);
+                static_cast<size_t>(i == 0 ? frame.width : frame.width / 2), low, high);
 }
 
 } // namespace
 
 V210Decoder::V210Decoder(const Image& source)
-    : fPicture(AllocatePicture(AV_PIX_FMT_YUV422P10)), fFrame(av_frame_alloc()), fPacket(av_packet_alloc()),
-      fContext(MakeContext(avcodec_find_decoder(AV_CODEC_ID_V210), AV_PIX_FMT_YUV422P10, fPicture.get())) {
+    : fPicture(AllocatePicture(AV_PIX_FMT_YUV422P10, source.size)), fFrame(av_frame_alloc()),
+      fPacket(av_packet_alloc()), fContext(MakeContext(avcodec_find_decoder(AV_CODEC_ID_V210),
+                                                       AV_PIX_FMT_YUV422P10, source.size, fPicture.get())) {
     fContext->get_buffer2 = GetPicture;
     Require(avcodec_open2(fContext.get(), nullptr, nullptr) == 0, "no decoder");
     const size_t bytes = source.packedBytes;
@@ -87,11 +88,10 @@ const AVFrame& V210Decoder::Decode() {
     return *fFrame;
 }
 
-V210Encoder::V210Encoder(AVPixelFormat format)
-    : fBlock(av_packet_alloc()), fPacket(av_packet_alloc()), fFrame(AllocatePicture(format)),
-      fContext(MakeContext(avcodec_find_encoder(AV_CODEC_ID_V210), format, fBlock.get())) {
-    constexpr int kFrameBytes = kWidth / 6 * 16 * kHeight;
-    Require(av_new_packet(fBlock.get(), kFrameBytes) == 0, "no packet");
+V210Encoder::V210Encoder(AVPixelFormat format, Size size)
+    : fBlock(av_packet_alloc()), fPacket(av_packet_alloc()), fFrame(AllocatePicture(format, size)),
+      fContext(MakeContext(avcodec_find_encoder(AV_CODEC_ID_V210), format, size, fBlock.get())) {
+    Require(av_new_packet(fBlock.get(), size.width / 6 * 16 * size.height) == 0, "no packet");
     fContext->get_encode_buffer = GetBlock;
     Require(avcodec_open2(fContext.get(), nullptr, nullptr) == 0, "no encoder");
     if (format == AV_PIX_FMT_YUV422P)

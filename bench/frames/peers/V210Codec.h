@@ -42,7 +42,7 @@ private:
 /// Encodes random planes in video range.
 class V210Encoder {
 public:
-    explicit V210Encoder(AVPixelFormat format);
+    V210Encoder(AVPixelFormat format, Size size);
 
     void Encode();
 

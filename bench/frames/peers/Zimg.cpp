@@ -18,15 +18,16 @@ Buffer BufferOf(const Image& image) {
 
 template <zimg_pixel_type_e kSource, zimg_pixel_type_e kDestination>
 Run ChangeDepth(const Image& source, const Image& destination) {
-    const auto graph =
-        std::make_shared<Graph>(OfSize(4 * kWidth, kSource), OfSize(4 * kWidth, kDestination), false);
+    const auto [width, height] = source.size;
+    const auto graph = std::make_shared<Graph>(OfSize(4 * width, height, kSource),
+                                               OfSize(4 * width, height, kDestination), false);
     return [graph, from = BufferOf<zimg_image_buffer_const>(source),
             to = BufferOf<zimg_image_buffer>(destination)] { graph->Process(from, to); };
 }
 
-zimg_image_format Colour(zimg_pixel_type_e type, zimg_transfer_characteristics_e transfer,
+zimg_image_format Colour(Size size, zimg_pixel_type_e type, zimg_transfer_characteristics_e transfer,
                          zimg_matrix_coefficients_e matrix) {
-    zimg_image_format format = OfSize(kWidth, type);
+    zimg_image_format format = OfSize(size.width, size.height, type);
     format.color_family = matrix == ZIMG_MATRIX_RGB ? ZIMG_COLOR_RGB : ZIMG_COLOR_YUV;
     format.matrix_coefficients = matrix;
     format.transfer_characteristics = transfer;
@@ -34,19 +35,20 @@ zimg_image_format Colour(zimg_pixel_type_e type, zimg_transfer_characteristics_e
     return format;
 }
 
-constexpr int32_t RowBytes(zimg_pixel_type_e type) {
-    return type == ZIMG_PIXEL_BYTE ? kWidth : 4 * kWidth;
+int32_t RowBytes(const zimg_image_format& format) {
+    return static_cast<int32_t>(format.pixel_type == ZIMG_PIXEL_BYTE ? format.width : 4 * format.width);
 }
 
 Run BetweenPlanes(const zimg_image_format& source, const zimg_image_format& destination, bool approximate) {
-    const int32_t fromBytes = RowBytes(source.pixel_type);
-    const int32_t toBytes = RowBytes(destination.pixel_type);
-    const auto from = std::make_shared<Planes>(3, fromBytes);
-    const auto to = std::make_shared<Planes>(3, toBytes);
+    const auto width = static_cast<int32_t>(source.width), height = static_cast<int32_t>(source.height);
+    const int32_t fromBytes = RowBytes(source);
+    const int32_t toBytes = RowBytes(destination);
+    const auto from = std::make_shared<Planes>(3, fromBytes, height);
+    const auto to = std::make_shared<Planes>(3, toBytes, height);
     if (source.pixel_type == ZIMG_PIXEL_BYTE)
-        from->Fill<uint8_t>(kWidth, 0, 256);
+        from->Fill<uint8_t>(width, 0, 256);
     else
-        from->Fill<float>(kWidth, 0, 1);
+        from->Fill<float>(width, 0, 1);
     const auto graph = std::make_shared<Graph>(source, destination, approximate);
     return [=] {
         graph->Process(BufferOf<zimg_image_buffer_const>(*from, fromBytes),
@@ -55,21 +57,22 @@ Run BetweenPlanes(const zimg_image_format& source, const zimg_image_format& dest
 }
 
 template <zimg_pixel_type_e kGammaType, bool kApproximate>
-Run ToLinear(const Image&, const Image&) {
-    return BetweenPlanes(Colour(kGammaType, ZIMG_TRANSFER_BT709, ZIMG_MATRIX_RGB),
-                         Colour(ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_LINEAR, ZIMG_MATRIX_RGB), kApproximate);
+Run ToLinear(const Image& source, const Image&) {
+    return BetweenPlanes(Colour(source.size, kGammaType, ZIMG_TRANSFER_BT709, ZIMG_MATRIX_RGB),
+                         Colour(source.size, ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_LINEAR, ZIMG_MATRIX_RGB),
+                         kApproximate);
 }
 
 template <zimg_pixel_type_e kGammaType, bool kApproximate>
-Run ToGamma(const Image&, const Image&) {
-    return BetweenPlanes(Colour(ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_LINEAR, ZIMG_MATRIX_RGB),
-                         Colour(kGammaType, ZIMG_TRANSFER_BT709, ZIMG_MATRIX_RGB), kApproximate);
+Run ToGamma(const Image& source, const Image&) {
+    return BetweenPlanes(Colour(source.size, ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_LINEAR, ZIMG_MATRIX_RGB),
+                         Colour(source.size, kGammaType, ZIMG_TRANSFER_BT709, ZIMG_MATRIX_RGB), kApproximate);
 }
 
 template <zimg_matrix_coefficients_e kSource, zimg_matrix_coefficients_e kDestination>
-Run ChangeMatrix(const Image&, const Image&) {
-    return BetweenPlanes(Colour(ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_BT709, kSource),
-                         Colour(ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_BT709, kDestination), false);
+Run ChangeMatrix(const Image& source, const Image&) {
+    return BetweenPlanes(Colour(source.size, ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_BT709, kSource),
+                         Colour(source.size, ZIMG_PIXEL_FLOAT, ZIMG_TRANSFER_BT709, kDestination), false);
 }
 
 constexpr PK_PixelFormat kBGRA8 = PK_PixelFormat_BGRA_4444_8u;

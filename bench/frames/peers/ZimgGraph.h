@@ -61,12 +61,12 @@ Buffer BufferOf(const Planes& planes, int32_t rowBytes) {
     return buffer;
 }
 
-/// A picture of the frame's height; depth and range go with the type.
-inline zimg_image_format OfSize(uint32_t width, zimg_pixel_type_e type) {
+/// Depth and range go with the type.
+inline zimg_image_format OfSize(int32_t width, int32_t height, zimg_pixel_type_e type) {
     zimg_image_format format;
     zimg_image_format_default(&format, ZIMG_API_VERSION);
-    format.width = width;
-    format.height = kHeight;
+    format.width = static_cast<unsigned>(width);
+    format.height = static_cast<unsigned>(height);
     format.pixel_type = type;
     format.depth = type == ZIMG_PIXEL_BYTE ? 8 : type == ZIMG_PIXEL_WORD ? 15 : 32;
     format.pixel_range = ZIMG_RANGE_FULL;

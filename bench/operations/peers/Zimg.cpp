@@ -19,7 +19,7 @@ constexpr Colour kPQ = {ZIMG_PRIMARIES_BT2020, ZIMG_TRANSFER_ST2084};
 constexpr Colour kHLG = {ZIMG_PRIMARIES_BT2020, ZIMG_TRANSFER_ARIB_B67};
 
 zimg_image_format FormatOf(const Colour& colour) {
-    zimg_image_format format = FrameBench::OfSize(kWidth, ZIMG_PIXEL_FLOAT);
+    zimg_image_format format = FrameBench::OfSize(kWidth, kHeight, ZIMG_PIXEL_FLOAT);
     format.color_family = ZIMG_COLOR_RGB;
     format.matrix_coefficients = ZIMG_MATRIX_RGB;
     format.color_primaries = colour.primaries;
@@ -30,8 +30,8 @@ zimg_image_format FormatOf(const Colour& colour) {
 template <const Colour& kFrom, const Colour& kTo, bool kApproximate>
 Run Convert(const uint8_t*, uint8_t*) {
     constexpr int32_t kRowBytes = 4 * kWidth;
-    const auto from = std::make_shared<FrameBench::Planes>(3, kRowBytes);
-    const auto to = std::make_shared<FrameBench::Planes>(3, kRowBytes);
+    const auto from = std::make_shared<FrameBench::Planes>(3, kRowBytes, kHeight);
+    const auto to = std::make_shared<FrameBench::Planes>(3, kRowBytes, kHeight);
     from->Fill<float>(kWidth, 0, 1);
     const auto graph = std::make_shared<FrameBench::Graph>(FormatOf(kFrom), FormatOf(kTo), kApproximate);
     return [=] {

@@ -1,0 +1,139 @@
+// Copies and reductions of planar images.
+
+#include "results/Lines.h"
+#include "results/OddCalls.h"
+#include "results/PlaneImages.h"
+
+#include <PixelKiln/Planar.h>
+#include <PixelKiln/QuarterScale.h>
+
+namespace {
+
+using namespace PKResults;
+
+struct Shape {
+    int32_t width, height;
+    Walk from, to;
+};
+
+constexpr Shape kShapes[] = {
+    {1, 1, kTight, kTight},       {2, 2, kTight, kTight},   {3, 5, kSpread, kTight},
+    {30, 8, kTight, kUpwards},    {32, 7, kTight, kTight},  {63, 9, kSpread, kSpread},
+    {64, 4, kUpwards, kSpread},   {65, 6, kTight, kTight},  {131, 22, kUpwards, kTight},
+    {258, 11, kSpread, kUpwards}, {640, 12, kTight, kTight}};
+
+/// Planes of 4:2:0 with rows so many times as long.
+PlaneImages Planes(int32_t width, int32_t height, const Walk& walk, Random& random, int32_t times = 1) {
+    return {static_cast<size_t>(times * width),
+            height,
+            static_cast<size_t>(times * (width / 2)),
+            height / 2,
+            walk,
+            random};
+}
+
+std::string NameOf(const Shape& shape) {
+    return std::to_string(shape.width) + "x" + std::to_string(shape.height);
+}
+
+void Copy(Line& line, const Shape& shape) {
+    PlaneImages source = Planes(shape.width, shape.height, shape.from, line.random);
+    PlaneImages destination = Planes(shape.width, shape.height, shape.to, line.random);
+    line.results.Add(PK_CopyPlanar_8u(source.Sources().data(), source.Steps().data(),
+                                      destination.Destinations().data(), destination.Steps().data(),
+                                      shape.width, shape.height));
+    destination.AddTo(line.results);
+}
+
+void Reduce(Line& line, const Shape& shape, int32_t field) {
+    PlaneImages source = Planes(shape.width, shape.height, shape.from, line.random, 2);
+    PlaneImages destination = Planes(shape.width, shape.height, shape.to, line.random);
+    line.results.Add(PK_QuarterScalePlanar420_8u(
+        source.Sources().data(), source.Steps().data(), destination.Destinations().data(),
+        destination.Steps().data(), static_cast<uint32_t>(shape.width), static_cast<uint32_t>(shape.height),
+        field));
+    destination.AddTo(line.results);
+}
+
+void Pack(Line& line, const Shape& shape, bool yuyvOrder, int32_t field) {
+    const size_t pairs = static_cast<size_t>(shape.width + 1) / 2;
+    PlaneImages source(static_cast<size_t>(shape.width), shape.height, pairs, shape.height / 2, shape.from,
+                       line.random);
+    Image destination(4 * pairs, shape.height / 2, shape.to, line.random);
+    line.results.Add(PK_QuarterScalePlanar_8uAndConvertTo422_8u(
+        source.Sources().data(), source.Steps().data(), destination.First(), destination.Step(),
+        static_cast<uint32_t>(shape.width), static_cast<uint32_t>(shape.height), yuyvOrder, field));
+    destination.AddTo(line.results);
+}
+
+void AddShapes(Lines& lines) {
+    for (const Shape& shape : kShapes) {
+        lines.Add("copy/" + NameOf(shape), [&](Line& line) { Copy(line, shape); });
+        for (const int32_t field : {-1, 0, 1, 2, 3}) {
+            const std::string name = NameOf(shape) + "/" + std::to_string(field);
+            lines.Add("reduce/" + name, [&](Line& line) { Reduce(line, shape, field); });
+            lines.Add("pack-uyvy/" + name, [&](Line& line) { Pack(line, shape, false, field); });
+            lines.Add("pack-yuyv/" + name, [&](Line& line) { Pack(line, shape, true, field); });
+        }
+    }
+    lines.Add("copy/1024x512", [](Line& line) { Copy(line, {1024, 512, kTight, kTight}); }); // past the cache
+}
+
+/// The calls that have nulls among their pointers: the arrays first, then what is in them.
+struct Given {
+    Given(PlaneImages& source, PlaneImages& destination, Nulls nulls)
+        : from(source.Sources()), to(destination.Destinations()) {
+        for (size_t i = 0; i < 3; ++i) {
+            from[i] = nulls(static_cast<int>(4 + i), from[i]);
+            to[i] = nulls(static_cast<int>(7 + i), to[i]);
+        }
+    }
+
+    std::array<const void*, 3> from;
+    std::array<void*, 3> to;
+};
+
+template <class Call>
+void AddOdd(Lines& lines, const std::string& name, Call call) {
+    AddOddCalls(lines, name, 10, [&](Line& line, Nulls nulls, int32_t width, int32_t height) {
+        PlaneImages source = Planes(kOddWidth, kOddHeight, kTight, line.random, 2);
+        PlaneImages destination = Planes(kOddWidth, kOddHeight, kTight, line.random);
+        Given given(source, destination, nulls);
+        const auto sourceSteps = source.Steps(), destinationSteps = destination.Steps();
+        line.results.Add(call(nulls(0, given.from.data()), nulls(1, sourceSteps.data()),
+                              nulls(2, given.to.data()), nulls(3, destinationSteps.data()), width, height));
+        destination.AddTo(line.results);
+    });
+}
+
+using Sources = const void* const*;
+using Destinations = void* const*;
+using Steps = const int32_t*;
+
+void AddAllOdd(Lines& lines) {
+    AddOdd(lines, "copy",
+           [](Sources from, Steps fromSteps, Destinations to, Steps toSteps, int32_t width, int32_t height) {
+               return PK_CopyPlanar_8u(from, fromSteps, to, toSteps, width, height);
+           });
+    AddOdd(lines, "reduce",
+           [](Sources from, Steps fromSteps, Destinations to, Steps toSteps, int32_t width, int32_t height) {
+               return PK_QuarterScalePlanar420_8u(from, fromSteps, to, toSteps, static_cast<uint32_t>(width),
+                                                  static_cast<uint32_t>(height), 1);
+           });
+    // Packed rows go to the first plane, which has room for them.
+    AddOdd(lines, "pack",
+           [](Sources from, Steps fromSteps, Destinations to, Steps, int32_t width, int32_t height) {
+               return PK_QuarterScalePlanar_8uAndConvertTo422_8u(
+                   from, fromSteps, to == nullptr ? nullptr : to[0], 12, static_cast<uint32_t>(width),
+                   static_cast<uint32_t>(height), false, 1);
+           });
+}
+
+void AddPlanar(Lines& lines) {
+    AddShapes(lines);
+    AddAllOdd(lines);
+}
+
+const Family sPlanar("planar", AddPlanar);
+
+} // namespace

@@ -1,0 +1,51 @@
+#include "SharedWords.h"
+
+namespace tool {
+namespace {
+
+constexpr const char* kNotes =
+    R"(Files are named and read as by 'pixelkiln convert'. The work is done in the format of --from; a PNG
+without it is BGRA, with 16 bits a sample as float. Directions and places are those of the picture as
+one sees it, from its top left corner.
+)";
+
+} // namespace
+
+void AddQuality(Words& words, int32_t& quality) {
+    words.Take("--quality,-q", quality, "Render quality, 0 to 5; above 1, chroma is interpolated")
+        .Between(0, 5)
+        .ShowDefault();
+}
+
+void AddListing(Words& words, ListOptions& options) {
+    words.Flag("--csv", options.csv, "Comma-separated values");
+}
+
+void AddOutput(Words& words, PipeOptions& options) {
+    words.Take("OUT", options.output, "PNG file, raw frames, or -").Required();
+    words.Take("--png-depth", options.pngDepth, "Bits a sample of an output PNG, 8 or 16")
+        .OneOf({8, 16})
+        .ShowDefault();
+    words.Flag("--quiet", options.quiet, "No summary");
+}
+
+void AddFrames(Words& words, PipeOptions& options) {
+    words.Take("IN", options.input, "PNG file, raw frames, or -").Required();
+    AddOutput(words, options);
+    words.Take("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
+    words.Flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+}
+
+void AddPipe(Words& words, PipeOptions& options) {
+    AddFrames(words, options);
+    AddQuality(words, options.quality);
+    words.Take("--from", options.from, "Format to start from; needed for raw frames");
+}
+
+void AddOperation(Words& words, PipeOptions& options) {
+    AddPipe(words, options);
+    words.Take("--to", options.to, "Format to end in; without it, raw frames keep that of --from");
+    words.Notes(kNotes);
+}
+
+} // namespace tool

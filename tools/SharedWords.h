@@ -1,0 +1,29 @@
+#pragma once
+
+// What several commands are told.
+
+#include "FramePipe.h"
+#include "Words.h"
+
+namespace tool {
+
+void AddQuality(Words& words, int32_t& quality);
+
+struct ListOptions {
+    bool csv = false;
+};
+void AddListing(Words& words, ListOptions& options);
+
+/// For commands that write frames.
+void AddOutput(Words& words, PipeOptions& options);
+
+/// For commands from frames to frames.
+void AddFrames(Words& words, PipeOptions& options);
+
+/// The same where they have a format of choice.
+void AddPipe(Words& words, PipeOptions& options);
+
+/// For commands that do something to the picture: AddPipe, --to as they take it, and notes.
+void AddOperation(Words& words, PipeOptions& options);
+
+} // namespace tool

@@ -1,0 +1,38 @@
+// pixelkiln convert: PNG files and raw frames from one format to another.
+
+#include "Command.h"
+#include "SharedWords.h"
+
+namespace tool {
+namespace {
+
+constexpr const char* kNotes =
+    R"(A name that ends in .png is a PNG file; all others hold raw frames, and - stands for standard input or
+output. Raw frames follow each other with nothing between. Their rows are padded as in memory, or have
+no padding with --packed, and the first row in the file is the first in memory: for a format that
+'pixelkiln formats' lists with first row 'bottom', the bottom row of the picture.
+A PNG is taken in BGRA, with 16 bits a sample as float, and --from takes it on to that format first. On
+the way to a PNG the picture goes through the format of --to, so that its losses show. Profiles and
+gamma notes of a PNG are not applied.
+
+Examples:
+  pixelkiln convert photo.png photo.v210 --to V210_422_10u
+  pixelkiln convert photo.v210 photo.png --from V210_422_10u --size 512x512
+  pixelkiln convert clip.yuv frame-%04d.png --from UYVY_422_8u --size 720x576 --packed
+)";
+
+void Declare(Words& words, PipeOptions& options) {
+    AddPipe(words, options);
+    words.Take("--to", options.to, "Format to end in; needed for raw frames");
+    words.Notes(kNotes);
+}
+
+void Run(const PipeOptions& options) {
+    PipeFrames(options, nullptr);
+}
+
+const Command sConvert(Group::Frames, "convert", "Convert a PNG or raw frames to another format", Declare,
+                       Run);
+
+} // namespace
+} // namespace tool
