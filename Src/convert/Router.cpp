@@ -4,10 +4,10 @@
 #include "convert/Router.h"
 
 #include "convert/KernelMembers.h"
+#include "convert/KernelTable.h"
 #include "convert/RasterFormats.h"
 #include "convert/RouterTable.h"
 #include "frame/PixelFormat.h"
-#include "primitives/CapabilityFlags.h"
 
 #include <optional>
 
@@ -47,12 +47,15 @@ constexpr bool Alike(const Question& q) {
 
 // Rules that need no table: what differs is one field.
 
+/// Only where the direct kernel has a body, which is from SSE2 up.
 MaybeAnswer DirectToBGR8u(const Question& q) {
-    if (!sCPUHasSSE2) return kDoesNotApply;
     if (q.D != PK_PixelFormat_BGRA_4444_8u && q.D != PK_PixelFormat_BGRX_4444_8u) return kDoesNotApply;
-    if (q.S == PK_PixelFormat_VUYX_4444_8u) return Answer{VUYX8uToBGR8uRow_601, q.D};
-    if (q.S == PK_PixelFormat_VUYX_4444_8u_709) return Answer{VUYX8uToBGR8uRow_709, q.D};
-    return kDoesNotApply;
+    const Kernel direct = q.S == PK_PixelFormat_VUYX_4444_8u       ? VUYX8uToBGR8uRow_601
+                          : q.S == PK_PixelFormat_VUYX_4444_8u_709 ? VUYX8uToBGR8uRow_709
+                                                                   : None;
+    Target target;
+    if (!ChooseTarget(direct, target)) return kDoesNotApply;
+    return Answer{direct, q.D};
 }
 
 MaybeAnswer Copy(const Question& q) {

@@ -21,7 +21,7 @@ struct ConversionStep {
 /// \return PK_Success; PK_ErrBadSrcFormat or PK_ErrBadDstFormat for a format that is no raster format of
 ///         the catalogue, or at which the rules end; PK_ErrFailed where no kernel serves.
 ///
-/// Reads the SSE2 capability flag: one direct kernel is on offer only with it.
+/// Reads the capability flags: one direct kernel has bodies only from SSE2 up.
 PK_Result ChooseConversionStep(PK_PixelFormat current, PK_PixelFormat destination, int32_t quality,
                                ConversionStep& step);
 

@@ -8,8 +8,9 @@
 //   Sources        Rows<...>, an operand for each row that is read
 //   Group(const uint8_t* source..., uint8_t* destination)
 //
-// of which Groups<...> gives the first three. A formula may have constants, and may carry what it knows of one group to
-// the next. Kernel sources keep their formulas in an unnamed namespace, so that two sources may use the same name.
+// of which Groups<...> gives the first three. A formula may have constants, and one without neighbours may carry what it
+// knows of one group to the next. Kernel sources keep their formulas in an unnamed namespace, so that two sources may
+// use the same name.
 //
 // Where a row ends within a group, or within what a group looks at beside itself, the group goes through the same Group
 // on scratch copies: all elements of a row have the same arithmetic, and no byte outside the row is read or written.
@@ -136,6 +137,10 @@ private:
 template <class Operand>
 using RowOf = const uint8_t*;
 
+constexpr int64_t Greater(int64_t a, int64_t b) {
+    return a > b ? a : b;
+}
+
 /// A group at an end of its rows. Apart from the loop, and the formula by value, so that its constants stay in registers
 /// there.
 template <class Formula, class... Operands>
@@ -160,21 +165,23 @@ template <class Formula, class... Operands>
     static_assert(kElements % Formula::Destination::kUnit == 0);
     static_assert(((kGroupBytes<Operands, Formula> >= Operands::kBytesBefore) && ...),
                   "only the first group lacks what is before");
-    int64_t whole = kElements;
-    ((whole = kElementsOfWholeGroup<Operands, Formula> > whole ? kElementsOfWholeGroup<Operands, Formula>
-                                                               : whole),
-     ...);
+    int64_t whole = kElements; // what must be left for a group that has room
+    ((whole = Greater(whole, kElementsOfWholeGroup<Operands, Formula>)), ...);
     const auto advance = [&] {
-        elements -= kElements;
         destination += kGroupBytes<typename Formula::Destination, Formula>;
         ((sources += kGroupBytes<Operands, Formula>), ...);
     };
     if (kLooksBack && elements > 0) {
         EndGroup(formula, {true, elements, kElements}, operands, destination, sources...);
+        elements -= kElements;
         advance();
     }
-    for (; elements >= whole; advance()) formula.Group(sources..., destination);
-    for (; elements > 0; advance())
+    // The end is known beforehand, so that the compiler needs one counter for the loop and all its pointers.
+    const int64_t groups = elements < whole ? 0 : (elements - whole) / kElements + 1;
+    elements -= groups * kElements;
+    const uint8_t* const end = destination + groups * kGroupBytes<typename Formula::Destination, Formula>;
+    for (; destination != end; advance()) formula.Group(sources..., destination);
+    for (; elements > 0; elements -= kElements, advance())
         EndGroup(formula, {false, elements, kElements}, operands, destination, sources...);
 }
 

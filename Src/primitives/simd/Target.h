@@ -15,7 +15,7 @@
 //                            NaN give INT32_MIN
 //   Select(mask, a, b)       a where the mask's bits are set, else b
 //   ...Pixel...              work on each block of four lanes, that is on each interleaved pixel
-//   LoadBytes, StoreBytes    kLanes bytes to and from lanes; stores saturate
+//   LoadBytes                kLanes bytes to lanes
 //   ...Blocks, ...Threes, ...Sixes       work on blocks of four lanes, a wider vector's part each, that have
 //                            places of their own in memory
 //   LoadChannels, ...        kLanes four-channel pixels to and from four vectors, one a channel

@@ -88,10 +88,6 @@ inline I32 LoadWords(const void* source) {
 inline I32 LoadSignedWords(const void* source) {
     return {_mm256_cvtepi16_epi32(_mm_loadu_si128(static_cast<const __m128i*>(source)))};
 }
-inline void StoreBytes(void* destination, I32 a) {
-    const __m128i words = _mm_packs_epi32(_mm256_castsi256_si128(a.v), _mm256_extracti128_si256(a.v, 1));
-    _mm_storel_epi64(static_cast<__m128i*>(destination), _mm_packus_epi16(words, words));
-}
 /// The low 16 bits of each lane, unsaturated.
 inline void StoreWords(void* destination, I32 a) {
     const __m256i low = _mm256_and_si256(a.v, _mm256_set1_epi32(0xffff)); // makes the saturating pack exact

@@ -198,9 +198,6 @@ inline I32 LoadWords(const void* source) {
 inline I32 LoadSignedWords(const void* source) {
     return {_mm512_cvtepi16_epi32(_mm256_loadu_si256(static_cast<const __m256i*>(source)))};
 }
-inline void StoreBytes(void* destination, I32 a) {
-    _mm_storeu_si128(static_cast<__m128i*>(destination), _mm512_cvtusepi32_epi8(Max(a, Ints(0)).v));
-}
 /// The low 16 bits of each lane, unsaturated.
 inline void StoreWords(void* destination, I32 a) {
     _mm256_storeu_si256(static_cast<__m256i*>(destination), _mm512_cvtepi32_epi16(a.v));

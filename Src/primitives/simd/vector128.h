@@ -200,11 +200,6 @@ inline I32 LoadSignedWords(const void* source) {
     const __m128i words = _mm_loadl_epi64(static_cast<const __m128i*>(source));
     return {_mm_srai_epi32(_mm_unpacklo_epi16(words, words), 16)};
 }
-inline void StoreBytes(void* destination, I32 a) {
-    const __m128i words = _mm_packs_epi32(a.v, a.v);
-    const int32_t bytes = _mm_cvtsi128_si32(_mm_packus_epi16(words, words));
-    std::memcpy(destination, &bytes, sizeof bytes);
-}
 /// The low 16 bits of each lane, unsaturated.
 inline void StoreWords(void* destination, I32 a) {
     // Sign-extending the low half first makes the saturating pack exact.
