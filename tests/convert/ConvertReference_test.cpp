@@ -10,6 +10,7 @@
 #include "reference/ReferenceRouter.h"
 #include "support/FlagScope.h"
 #include "support/Photograph.h"
+#include "support/RowBuffer.h"
 #include "support/Samples.h"
 
 #include <gtest/gtest.h>
@@ -62,14 +63,14 @@ std::string CompareRows(PK_PixelFormat format, size_t bytes, const uint8_t* expe
 }
 
 /// What the named kernels give, one after the other, for one row.
-void RunReference(const std::vector<reference::Step>& chain, bool vectorMembers, Image& from, Image& to,
-                  int32_t row, int32_t resultRow) {
-    Image scratch[2] = {{from.format, from.width}, {from.format, from.width}};
-    const uint8_t* source = from.Row(row);
-    PK_PixelFormat format = from.format;
+void RunReference(const std::vector<reference::Step>& chain, PK_PixelFormat format, const uint8_t* source,
+                  int32_t width, uint8_t* result) {
+    const PK::FloatMode mode;
+    const bool vectorMembers = PK::sCPUHasSSSE3 != 0;
+    Image scratch[2] = {{format, width}, {format, width}};
     for (size_t i = 0; i < chain.size(); ++i) {
-        uint8_t* destination = i + 1 == chain.size() ? to.Row(resultRow) : scratch[i % 2].Row(0);
-        reference::Run(chain[i].kernel, format, chain[i].next, vectorMembers, source, destination, from.width,
+        uint8_t* destination = i + 1 == chain.size() ? result : scratch[i % 2].Row(0);
+        reference::Run(chain[i].kernel, format, chain[i].next, vectorMembers, source, destination, width,
                        chain[i].interpolated ? kQuality : 0);
         source = destination;
         format = chain[i].next;
@@ -100,10 +101,7 @@ protected:
             const bool flipped = PK_IsOriginTopLeft(source.format) != PK_IsOriginTopLeft(format);
             for (int32_t row = 0; row < kRows; ++row) {
                 const int32_t resultRow = flipped ? kRows - 1 - row : row;
-                {
-                    const PK::FloatMode mode;
-                    RunReference(chain, PK::sCPUHasSSSE3 != 0, source, expected, row, resultRow);
-                }
+                RunReference(chain, source.format, source.Row(row), source.width, expected.Row(resultRow));
                 ASSERT_EQ("", CompareRows(format, actual.PackedBytes(), expected.Row(resultRow),
                                           actual.Row(resultRow), HasPower(chain)))
                     << "row " << row;
@@ -140,6 +138,33 @@ TEST_P(ConvertReference, EveryPairOnRandomRows) {
                 FillOrdinarySamples(format, source.Row(row), source.PackedBytes(), random);
             ASSERT_NO_FATAL_FAILURE(ExpectAllFrom(source));
         }
+}
+
+/// One row of exactly its bytes, before a guard page and after one.
+TEST_P(ConvertReference, EveryPairUpToTheGuardPages) {
+    for (const PK_PixelFormat from : PK::kRasterFormats)
+        for (const PK_PixelFormat to : PK::kRasterFormats)
+            for (const int32_t width : {1, 2, 7, 18})
+                for (const auto place : {Placement::kBeforeGuard, Placement::kAfterGuard}) {
+                    Random random(from * 31 + to);
+                    SCOPED_TRACE(testing::Message() << std::hex << from << " to " << to << std::dec
+                                                    << ", width " << width << ", seed " << random.Seed());
+                    const auto bytes = static_cast<size_t>(PK_PixelFormatPackedRowBytes(to, width));
+                    const RowBuffer source(static_cast<size_t>(PK_PixelFormatPackedRowBytes(from, width)),
+                                           {place});
+                    const RowBuffer actual(bytes, {place});
+                    FillOrdinarySamples(from, source.Data(), source.Size(), random);
+                    ASSERT_EQ(PK_Success,
+                              PK_Convert(source.Data(), 0, from, actual.Data(), 0, to, width, 1, kQuality));
+                    ASSERT_TRUE(actual.MarginsIntact());
+
+                    // At the same distance from a boundary, which one kernel counts from.
+                    const auto offset = static_cast<int>(reinterpret_cast<uintptr_t>(actual.Data()) % 16);
+                    const RowBuffer expected(bytes, {Placement::kAtOffset, offset});
+                    const auto chain = reference::Chain(from, to, kQuality, PK::sCPUHasSSE2 != 0);
+                    RunReference(chain, from, source.Data(), width, expected.Data());
+                    ASSERT_EQ("", CompareRows(to, bytes, expected.Data(), actual.Data(), HasPower(chain)));
+                }
 }
 
 INSTANTIATE_TEST_SUITE_P(Bodies, ConvertReference,

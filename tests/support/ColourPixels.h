@@ -77,11 +77,8 @@ std::string FirstDifference(const ColourPixels& source, const ColourPixels& expe
 /// alignment of vectors: all must give the same bits, and leave the source and what is around both.
 template <class Convert>
 ColourPixels Converted(const ColourPixels& pixels, Convert convert) {
-    constexpr Placement kPlaces[] = {{Placement::kBeforeGuard},
-                                     {Placement::kAfterGuard},
-                                     {Placement::kAtOffset, 4},
-                                     {Placement::kAtOffset, 16},
-                                     {Placement::kAtOffset, 36}};
+    constexpr Placement kPlaces[] = {
+        {Placement::kBeforeGuard}, {Placement::kAfterGuard}, {Placement::kAtOffset, 4}};
     const auto count = static_cast<int32_t>(pixels.size());
     const size_t bytes = sizeof(ColourPixel) * pixels.size();
     ColourPixels result(pixels.size());
