@@ -157,8 +157,8 @@ template <class Formula, class... Operands>
 }
 
 template <class Formula, class... Operands>
-[[gnu::flatten]] void RunGroups(Formula formula, int64_t elements, Rows<Operands...> operands,
-                                uint8_t* destination, RowOf<Operands>... sources) {
+PK_FLATTEN void RunGroups(Formula formula, int64_t elements, Rows<Operands...> operands, uint8_t* destination,
+                          RowOf<Operands>... sources) {
     constexpr int32_t kElements = Formula::kElements;
     constexpr bool kLooksBack = ((Operands::kBytesBefore > 0) || ...);
     static_assert(((kElements % Operands::kUnit == 0) && ...));

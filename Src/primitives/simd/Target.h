@@ -18,6 +18,7 @@
 //   LoadBytes                kLanes bytes to lanes
 //   ...Blocks, ...Threes, ...Sixes       work on blocks of four lanes, a wider vector's part each, that have
 //                            places of their own in memory
+//   PK_FLATTEN               an attribute of loops over groups
 //   LoadChannels, ...        kLanes four-channel pixels to and from four vectors, one a channel
 
 #include "primitives/simd/Targets.h"

@@ -14,6 +14,9 @@
 #include <immintrin.h>
 #pragma GCC diagnostic pop
 
+/// Before a loop over groups: the formula of a group is compiled into it, however long.
+#define PK_FLATTEN [[gnu::flatten]]
+
 namespace PK::avx512 {
 
 inline constexpr int kLanes = 16;

@@ -7,6 +7,10 @@
 #include <cstring>
 #include <immintrin.h> // conversions by the current rounding mode and the reciprocal estimate, one lane at a time
 
+/// Left to the compiler here: sanitizers make a branch of each operation on each lane, and a whole formula of these in
+/// one loop would take minutes to compile.
+#define PK_FLATTEN
+
 namespace PK::plain {
 
 inline constexpr int kLanes = 4;

@@ -6,6 +6,9 @@
 #include <cstring>
 #include <immintrin.h>
 
+/// Before a loop over groups: the formula of a group is compiled into it, however long.
+#define PK_FLATTEN [[gnu::flatten]]
+
 namespace PK::PK_TARGET {
 
 inline constexpr int kLanes = 8;
