@@ -24,9 +24,14 @@ constexpr Kernel kFromFloats[] = {RGBToYUV601Float32Row, RGBToYUV709Float32Row, 
                                   RGB32fToYUV709_8uRow,  YUV601ToRGBFloat32Row, YUV709ToRGBFloat32Row,
                                   YUV601To709Float32Row, YUV709To601Float32Row};
 
-TEST(Matrices, AllCodes) {
-    for (const Kernel kernel : kFromCodes) ASSERT_NO_FATAL_FAILURE(ExpectReferenceForAllCodes(kernel));
+/// A test each, since all codes through all bodies take some seconds under the sanitizers.
+class MatricesFromCodes : public testing::TestWithParam<Kernel> {};
+
+TEST_P(MatricesFromCodes, AllCodes) {
+    ExpectReferenceForAllCodes(GetParam());
 }
+
+INSTANTIATE_TEST_SUITE_P(Kernels, MatricesFromCodes, testing::ValuesIn(kFromCodes));
 
 // Rounding follows the mode that the caller has set, in the sums as well as in the conversion to codes.
 TEST(Matrices, AllRoundingModes) {
