@@ -4,6 +4,7 @@ import json
 import os
 import pathlib
 import re
+import resource
 import shutil
 import signal
 import subprocess
@@ -13,11 +14,14 @@ import time
 from mutation.sources import digest
 
 PROCESSORS = os.cpu_count() or 1
+MOST_WRITTEN = 4 << 30  # bytes of a file: a mutated program may tell its failure for ever
 
 
 def set_up_child():
-    """A session of its own, which can be ended as a whole, and the first to go where memory is short."""
+    """A session of its own, which can be ended as a whole; bounded, and the first to go where memory is short."""
     os.setsid()
+    resource.setrlimit(resource.RLIMIT_CORE, (0, 0))
+    resource.setrlimit(resource.RLIMIT_FSIZE, (MOST_WRITTEN, MOST_WRITTEN))
     pathlib.Path("/proc/self/oom_score_adj").write_text("1000")
 
 
