@@ -2,8 +2,10 @@
 
 #include "zebcore/debug.h"
 
+#include <algorithm>
 #include <atomic>
 #include <cstdio>
+#include <cstdlib>
 #include <fcntl.h>
 #include <string_view>
 #include <unistd.h>
@@ -26,6 +28,19 @@ TraceLevels& Levels() {
 }
 
 } // namespace
+
+// A piece without "=" is no setting.
+DebugDatabase::DebugDatabase() {
+    const char* list = secure_getenv("PIXELKILN_SETTINGS");
+    std::string_view rest = list != nullptr ? list : "";
+    while (!rest.empty()) {
+        const std::string_view piece = rest.substr(0, rest.find(','));
+        rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
+        const size_t equals = piece.find('=');
+        if (equals != std::string_view::npos)
+            fEntries.emplace(piece.substr(0, equals), piece.substr(equals + 1));
+    }
+}
 
 DebugDatabase& DebugDatabase::Instance() {
     static DebugDatabase database;
