@@ -4,6 +4,7 @@
 
 #include <PixelKiln/PixelKiln.h>
 
+#include <cstdlib>
 #include <cstring>
 
 namespace {
@@ -29,13 +30,21 @@ PK_Result StartConvertAndStop(uint8_t* pixel) {
     return PK_Terminate() == PK_Success ? result : PK_ErrFailed;
 }
 
+PK_Result StartWithSettings(uint8_t* pixel) {
+    setenv("PIXELKILN_SETTINGS", "PK.disableAVX2=true,PK.highestTarget=SSE2,a.setting.of.a.longer.name=1", 1);
+    return StartConvertAndStop(pixel);
+}
+
 void AddLifecycle(Calls& calls) {
+    const std::vector<uint8_t> pixel(4);
     calls.push_back({{"PK_Initialize", "PK_Terminate"},
                      TakesOrDoesWithout("the pool of threads"),
-                     std::vector<uint8_t>(4),
+                     pixel,
                      StartConvertAndStop,
                      PK_Success,
                      true});
+    calls.push_back(
+        {{"PK_Initialize"}, TakesOrDoesWithout("settings"), pixel, StartWithSettings, PK_Success, true});
     // Switch 10 tells itself by the origin of a format.
     calls.push_back({{"PK_SetDebugFlag", "PK_IsOriginTopLeft", "PK_IsOriginBottomLeft"},
                      kFlags,
