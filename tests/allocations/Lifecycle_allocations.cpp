@@ -31,7 +31,7 @@ PK_Result StartConvertAndStop(uint8_t* pixel) {
 }
 
 PK_Result StartWithSettings(uint8_t* pixel) {
-    setenv("PIXELKILN_SETTINGS", "PK.disableAVX2=true,PK.highestTarget=SSE2,a.setting.of.a.longer.name=1", 1);
+    setenv("PIXELKILN_SETTINGS", "PK.disableAVX2=true,PK.highestTarget=sse2,a.setting.of.a.longer.name=1", 1);
     return StartConvertAndStop(pixel);
 }
 
