@@ -7,7 +7,6 @@
 
 #include <cstdint>
 #include <map>
-#include <mutex>
 #include <string>
 
 namespace zebcore::debug {
@@ -27,7 +26,6 @@ public:
     void RemoveEntry(const std::string& name);
 
 private:
-    mutable std::mutex fMutex;
     std::map<std::string, std::string> fEntries;
 };
 

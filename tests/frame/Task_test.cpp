@@ -17,6 +17,7 @@
 #include <vector>
 
 using PKTest::AllocationCount;
+using PKTest::AllocationLimit;
 using PKTest::CallCounts;
 using PKTest::RestingThreadCount;
 using PKTest::SettledThreadCount;
@@ -150,6 +151,25 @@ TEST(TaskExecutor, IsNotTouchedByAStopTooMany) {
     const CountingTask task(64);
     RunTaskOnAllProcessors(task); // on the calling thread
     EXPECT_TRUE(task.EachPartRan(1));
+}
+
+// One allocation for the pool, one for the list of its threads and one for each thread; all may be refused.
+TEST(TaskExecutor, IsDoneWithoutAsFarAsThereIsNoMemoryForIt) {
+    const size_t before = RestingThreadCount();
+    const auto needed = static_cast<int>(2 + kThreadsOfExecutor);
+    for (int granted = 0; granted <= needed; ++granted) {
+        {
+            const AllocationLimit limit(granted);
+            ASSERT_EQ(PK_Initialize(), PK_Success);
+        }
+        const size_t threads = before + static_cast<size_t>(std::max(granted - 2, 0));
+        EXPECT_EQ(SettledThreadCount(threads), threads) << granted;
+        const CountingTask task(64);
+        RunTaskOnAllProcessors(task);
+        EXPECT_TRUE(task.EachPartRan(1)) << granted;
+        ASSERT_EQ(PK_Terminate(), PK_Success);
+        EXPECT_EQ(SettledThreadCount(before), before) << granted;
+    }
 }
 
 TEST(TaskExecutor, IsCreatedAnewWhereThereWasOne) {
