@@ -2,8 +2,10 @@
 
 #include "zebcore/debug.h"
 
+#include <algorithm>
 #include <atomic>
 #include <cstdio>
+#include <cstdlib>
 #include <fcntl.h>
 #include <mutex>
 #include <pthread.h>
@@ -17,11 +19,11 @@ namespace {
 std::atomic<uint32_t> sTraceChanges{1};
 std::atomic<TraceSink> sTraceSink{nullptr};
 
-// Guards what follows. Both are made as the library is loaded, ahead of those who fill them: a fork would leave the child
-// with what another thread of the parent was just making at its first use.
+// Guards what follows, and the settings. Both tables are made as the library is loaded, ahead of those who fill them: a
+// fork would leave the child with one that another thread of the parent was just making at its first use.
 constinit std::mutex sMutex;
 [[gnu::init_priority(101)]] std::map<std::string, int32_t, std::less<>> sHighestLevels;
-[[gnu::init_priority(101)]] DebugDatabase sDatabase;
+bool sHasReadEnvironment = false;
 
 [[gnu::constructor(101)]] void FollowForks() {
     constexpr auto goOn = [] { sMutex.unlock(); };
@@ -30,8 +32,26 @@ constinit std::mutex sMutex;
 
 } // namespace
 
+[[gnu::init_priority(101)]] DebugDatabase DebugDatabase::sInstance;
+
+// A piece without "=" is no setting.
+void DebugDatabase::ReadEnvironment() {
+    const char* list = secure_getenv("PIXELKILN_SETTINGS");
+    std::string_view rest = list != nullptr ? list : "";
+    while (!rest.empty()) {
+        const std::string_view piece = rest.substr(0, rest.find(','));
+        rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
+        const size_t equals = piece.find('=');
+        if (equals != std::string_view::npos)
+            fEntries.emplace(piece.substr(0, equals), piece.substr(equals + 1));
+    }
+}
+
 DebugDatabase& DebugDatabase::Instance() {
-    return sDatabase;
+    const std::lock_guard lock(sMutex);
+    if (!sHasReadEnvironment) sInstance.ReadEnvironment();
+    sHasReadEnvironment = true;
+    return sInstance;
 }
 
 std::string DebugDatabase::GetEntry(const std::string& name, const std::string& defaultText) const {
