@@ -5,6 +5,7 @@
 #include "support/Random.h"
 
 #include "zebcore/debug.h"
+#include "zebcore/threads.h"
 
 #include <PixelKiln/PixelKiln.h>
 
@@ -13,7 +14,8 @@
 #include <cstdlib>
 #include <functional>
 #include <gtest/gtest.h>
-#include <iterator>
+#include <ostream>
+#include <span>
 #include <string>
 #include <thread>
 #include <vector>
@@ -90,14 +92,24 @@ bool UsesColourSpaces() {
     return std::equal(p3.LuminanceCoeffs(), p3.LuminanceCoeffs() + 3, copy.LuminanceCoeffs());
 }
 
+bool CopiesColourSpaces() {
+    const PK::SRGBColorSpace space;
+    for (int i = 0; i < 1000; ++i) {
+        const PK::SRGBColorSpace copy(space);
+        if (copy.LuminanceCoeffs()[1] != space.LuminanceCoeffs()[1]) return false;
+    }
+    return true;
+}
+
 bool AsksTheHost() {
     using namespace zebcore::debug;
-    DebugDatabase::Instance().SetEntry("Test.fork", "busy");
-    SetTraceLevel("Test.fork", 3);
-    const bool isRight = TraceEnabled("Test.fork", 3, false) &&
-                         DebugDatabase::Instance().GetEntry("Test.fork", "default") == "busy";
-    ClearTraceLevel("Test.fork");
-    DebugDatabase::Instance().RemoveEntry("Test.fork");
+    const std::string name = "Test." + std::to_string(zebcore::threads::GetCurrentThreadID());
+    DebugDatabase::Instance().SetEntry(name, "busy");
+    SetTraceLevel(name.c_str(), 3);
+    const bool isRight =
+        TraceEnabled(name.c_str(), 3, false) && DebugDatabase::Instance().GetEntry(name, "default") == "busy";
+    ClearTraceLevel(name.c_str());
+    DebugDatabase::Instance().RemoveEntry(name);
     return isRight;
 }
 
@@ -117,7 +129,7 @@ bool StopsAllAndStartsAgain() {
 
 bool DoesEverything() {
     return Converts() && ConvertsInBands() && RunsTasksWithinTasks() && AllocatesAndRecycles() &&
-           UsesColourSpaces() && AsksTheHost() && StartsAndStops();
+           UsesColourSpaces() && CopiesColourSpaces() && AsksTheHost() && StartsAndStops();
 }
 
 bool Exits() {
@@ -143,29 +155,45 @@ constexpr Deed kDeedsOfParent[] = {
     {"RunsTasksWithinTasks", RunsTasksWithinTasks},
     {"AllocatesAndRecycles", AllocatesAndRecycles},
     {"UsesColourSpaces", UsesColourSpaces},
+    {"CopiesColourSpaces", CopiesColourSpaces},
     {"AsksTheHost", AsksTheHost},
     {"StartsAndStops", StartsAndStops},
 };
 
-/// What the child does, while the parent's threads do each of theirs over and over.
-class ForkOfABusyProcess : public testing::TestWithParam<Deed> {
-protected:
-    ForkOfABusyProcess() {
-        PK_Initialize();
-        for (const Deed& deed : kDeedsOfParent) {
-            deed.isDone(); // what is expected is known before
-            fThreads.emplace_back([this, &deed] {
+constexpr Deed kDeedsOfChild[] = {
+    {"DoesEverything", DoesEverything},
+    {"StopsAllAndStartsAgain", StopsAllAndStartsAgain},
+    {"Exits", Exits},
+    {"WorksAndExits", WorksAndExits},
+    {"ForksAChild", ForksAChild},
+};
+
+void PrintTo(const Deed& deed, std::ostream* stream) {
+    *stream << deed.name;
+}
+
+std::string NameOfDeed(const testing::TestParamInfo<Deed>& info) {
+    return info.param.name;
+}
+
+/// Threads of the parent that do the same things over and over.
+class BusyThreads {
+public:
+    explicit BusyThreads(std::span<const Deed> deeds) {
+        for (const Deed& deed : deeds) deed.isDone(); // what is expected is known before
+        for (const Deed& deed : deeds)
+            fThreads.emplace_back([this, isDone = deed.isDone] {
                 while (!fIsOver)
-                    if (!deed.isDone()) ++fFailures;
+                    if (!isDone()) ++fFailures;
             });
-        }
     }
-    ~ForkOfABusyProcess() override {
+    ~BusyThreads() {
         fIsOver = true;
         for (std::thread& thread : fThreads) thread.join();
         EXPECT_EQ(fFailures, 0);
-        PK_Terminate();
     }
+    BusyThreads(const BusyThreads&) = delete;
+    BusyThreads& operator=(const BusyThreads&) = delete;
 
 private:
     std::atomic<bool> fIsOver = false;
@@ -173,22 +201,32 @@ private:
     std::vector<std::thread> fThreads;
 };
 
+void ExpectOfChildren(int count, const Deed& deed) {
+    for (int i = 0; i < count; ++i)
+        ASSERT_EQ(EndOfChild([&deed] { return deed.isDone() ? 0 : 1; }), 0) << "child " << i;
+}
+
+/// What the child does.
+class Fork : public testing::TestWithParam<Deed> {};
+class ForkOfABusyProcess : public testing::TestWithParam<Deed> {};
+
 } // namespace
 
-INSTANTIATE_TEST_SUITE_P(Child, ForkOfABusyProcess,
-                         testing::Values(Deed{"Converts", Converts}, Deed{"ConvertsInBands", ConvertsInBands},
-                                         Deed{"RunsTasksWithinTasks", RunsTasksWithinTasks},
-                                         Deed{"AllocatesAndRecycles", AllocatesAndRecycles},
-                                         Deed{"UsesColourSpaces", UsesColourSpaces},
-                                         Deed{"AsksTheHost", AsksTheHost},
-                                         Deed{"StartsAndStops", StartsAndStops},
-                                         Deed{"StopsAllAndStartsAgain", StopsAllAndStartsAgain},
-                                         Deed{"Exits", Exits}, Deed{"WorksAndExits", WorksAndExits},
-                                         Deed{"ForksAChild", ForksAChild}),
-                         [](const auto& deed) { return deed.param.name; });
+INSTANTIATE_TEST_SUITE_P(Child, Fork, testing::ValuesIn(kDeedsOfParent), NameOfDeed);
+INSTANTIATE_TEST_SUITE_P(Child, ForkOfABusyProcess, testing::ValuesIn(kDeedsOfChild), NameOfDeed);
+
+// Nothing else is going on, so that the lock which they have in common is nearly always taken.
+TEST_P(Fork, LetsTheChildDoWhatOtherThreadsOfItsParentAreDoing) {
+    const Deed deeds[] = {GetParam(), GetParam()};
+    const BusyThreads threads(deeds);
+    ExpectOfChildren(40, GetParam());
+}
 
 TEST_P(ForkOfABusyProcess, LeavesTheChildAllItNeeds) {
-    constexpr int kChildren = 20;
-    for (int i = 0; i < kChildren; ++i)
-        ASSERT_EQ(EndOfChild([] { return GetParam().isDone() ? 0 : 1; }), 0) << "child " << i;
+    PK_Initialize();
+    {
+        const BusyThreads threads(kDeedsOfParent);
+        ExpectOfChildren(15, GetParam());
+    }
+    PK_Terminate();
 }
