@@ -3,7 +3,8 @@
 /// \file
 /// The host's settings, its trace, and what it does about a violated contract.
 ///
-/// Everything here is safe from all threads.
+/// Everything here is safe from all threads, and in the child of a fork, whatever other threads of the parent were doing
+/// here: see threads.h. Settings and levels are those of the parent.
 
 #include <cstdint>
 #include <map>

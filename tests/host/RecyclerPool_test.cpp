@@ -115,10 +115,10 @@ TEST(RecyclerPool, TakesAClassThatServesAsBusy) {
     pool.Give(first, kMegabyte);
     pool.Give(second, kMegabyte);
     pool.Give(quiet, 2 * kMegabyte);
-    EXPECT_EQ(pool.Take(kMegabyte), second); // the last thing done with that class
+    ASSERT_EQ(pool.Take(kMegabyte), second); // the last thing done with that class
     pool.Give(pool.Take(kMegabyte + kMegabyte / 2), kMegabyte + kMegabyte / 2); // 4.5 MB in all
-    EXPECT_EQ(pool.KeptBytes(), 2 * kMegabyte + kMegabyte / 2);
-    EXPECT_EQ(pool.Take(kMegabyte), first);
+    ASSERT_EQ(pool.KeptBytes(), 2 * kMegabyte + kMegabyte / 2);
+    ASSERT_EQ(pool.Take(kMegabyte), first);
     pool.Give(first, kMegabyte);
     pool.Give(second, kMegabyte);
 }
@@ -130,8 +130,8 @@ TEST(RecyclerPool, TakesAClassThatGetsABlockBackAsBusy) {
     pool.Give(quiet, 2 * kMegabyte);
     pool.Give(busy, kMegabyte);
     pool.Give(pool.Take(kMegabyte + kMegabyte / 2), kMegabyte + kMegabyte / 2); // 4.5 MB in all
-    EXPECT_EQ(pool.KeptBytes(), 2 * kMegabyte + kMegabyte / 2);
-    EXPECT_EQ(pool.Take(kMegabyte), busy);
+    ASSERT_EQ(pool.KeptBytes(), 2 * kMegabyte + kMegabyte / 2);
+    ASSERT_EQ(pool.Take(kMegabyte), busy);
     pool.Give(busy, kMegabyte);
 }
 
