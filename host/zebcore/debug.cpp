@@ -19,10 +19,11 @@ namespace {
 std::atomic<uint32_t> sTraceChanges{1};
 std::atomic<TraceSink> sTraceSink{nullptr};
 
-// Guards what follows, and the settings. Both tables are made as the library is loaded, ahead of those who fill them: a
+// Guards what follows. Both tables are made as the library is loaded, ahead of those who fill them: a
 // fork would leave the child with one that another thread of the parent was just making at its first use.
 constinit std::mutex sMutex;
 [[gnu::init_priority(101)]] std::map<std::string, int32_t, std::less<>> sHighestLevels;
+[[gnu::init_priority(101)]] DebugDatabase sDatabase;
 bool sHasReadEnvironment = false;
 
 [[gnu::constructor(101)]] void FollowForks() {
@@ -30,12 +31,8 @@ bool sHasReadEnvironment = false;
     pthread_atfork([] { sMutex.lock(); }, goOn, goOn);
 }
 
-} // namespace
-
-[[gnu::init_priority(101)]] DebugDatabase DebugDatabase::sInstance;
-
 // A piece without "=" is no setting.
-void DebugDatabase::ReadEnvironment() {
+void ReadEnvironment(std::map<std::string, std::string>& settings) {
     const char* list = secure_getenv("PIXELKILN_SETTINGS");
     std::string_view rest = list != nullptr ? list : "";
     while (!rest.empty()) {
@@ -43,15 +40,18 @@ void DebugDatabase::ReadEnvironment() {
         rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
         const size_t equals = piece.find('=');
         if (equals != std::string_view::npos)
-            fEntries.emplace(piece.substr(0, equals), piece.substr(equals + 1));
+            settings.insert_or_assign(std::string(piece.substr(0, equals)),
+                                      std::string(piece.substr(equals + 1)));
     }
 }
 
+} // namespace
+
 DebugDatabase& DebugDatabase::Instance() {
     const std::lock_guard lock(sMutex);
-    if (!sHasReadEnvironment) sInstance.ReadEnvironment();
+    if (!sHasReadEnvironment) ReadEnvironment(sDatabase.fEntries);
     sHasReadEnvironment = true;
-    return sInstance;
+    return sDatabase;
 }
 
 std::string DebugDatabase::GetEntry(const std::string& name, const std::string& defaultText) const {

@@ -28,11 +28,6 @@ public:
     void RemoveEntry(const std::string& name);
 
 private:
-    DebugDatabase() = default;
-    void ReadEnvironment();
-
-    static DebugDatabase sInstance;
-
     std::map<std::string, std::string> fEntries;
 };
 

@@ -9,6 +9,10 @@
 
 #include <gtest/gtest.h>
 
+#include <latch>
+#include <thread>
+#include <vector>
+
 using PK::sCPUHasSSE;
 using PKTest::FlagScope;
 using zebcore::debug::DebugDatabase;
@@ -73,6 +77,25 @@ TEST(Lifecycle, AStartDetectsASwitchedOffCapabilityAnew) {
     ASSERT_EQ(PK_Initialize(), PK_Success);
     EXPECT_EQ(sCPUHasSSE, 1);
     ASSERT_EQ(PK_Terminate(), PK_Success);
+}
+
+TEST(Lifecycle, ThreadsThatKnowNothingOfEachOtherStartAndStop) {
+    const FlagScope flags;
+    std::vector<std::thread> plugIns;
+    std::latch begin(4);
+    for (int i = 0; i < 4; ++i)
+        plugIns.emplace_back([&begin] {
+            begin.arrive_and_wait();
+            for (int round = 0; round < 200; ++round) {
+                PK_Initialize();
+                PK_Initialize();
+                PK_Terminate();
+                PK_Terminate();
+            }
+        });
+    for (std::thread& plugIn : plugIns) plugIn.join();
+    EXPECT_TRUE(InitialiseStarts()) << "a start or a stop was lost";
+    EXPECT_EQ(PK_Terminate(), PK_Success);
 }
 
 TEST(Lifecycle, ReadsTheSettingsAtAStart) {
