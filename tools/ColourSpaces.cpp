@@ -1,11 +1,11 @@
 #include "ColourSpaces.h"
 
 #include "Failure.h"
+#include "Numbers.h"
 #include "Terminal.h"
 
 #include <algorithm>
 #include <cctype>
-#include <charconv>
 #include <cmath>
 #include <functional>
 
@@ -13,6 +13,17 @@ namespace tool {
 namespace {
 
 using Shared = std::shared_ptr<const PK::ColorSpace>;
+
+/// The destructors of the library's classes are not virtual; what is shared is of a class that nobody derives from.
+template <class Conversion>
+struct Owned final : Conversion {
+    using Conversion::Conversion;
+};
+
+template <class Conversion, class... Arguments>
+Shared Make(Arguments... arguments) {
+    return std::make_shared<Owned<Conversion>>(arguments...);
+}
 
 Space WithSRGBPrimaries(Shared conversion) {
     return {{}, std::move(conversion), true, true, true, ToneRangeOutput::Encoded};
@@ -23,7 +34,7 @@ Space Hub(Shared conversion) {
 }
 
 Space PowerLaw(float gamma) {
-    return {{}, std::make_shared<PK::GammaColorSpace>(gamma), true, false, false, ToneRangeOutput::None};
+    return {{}, Make<PK::GammaColorSpace>(gamma), true, false, false, ToneRangeOutput::None};
 }
 
 Space WideGamut(Shared conversion) {
@@ -31,16 +42,15 @@ Space WideGamut(Shared conversion) {
 }
 
 Space P3(PK::PK_Illuminant white) {
-    return WideGamut(std::make_shared<PK::DCIP3ColorSpace>(white));
+    return WideGamut(Make<PK::DCIP3ColorSpace>(white));
 }
 
 Space PQ(bool useP3, bool normalised) {
-    const auto conversion = std::make_shared<PK::PQColorSpace>(useP3, normalised);
-    return {{}, conversion, false, false, true, ToneRangeOutput::None};
+    return {{}, Make<PK::PQColorSpace>(useP3, normalised), false, false, true, ToneRangeOutput::None};
 }
 
 Space HLG() {
-    return {{}, std::make_shared<PK::HLGColorSpace>(), false, false, false, ToneRangeOutput::None};
+    return {{}, Make<PK::HLGColorSpace>(), false, false, false, ToneRangeOutput::None};
 }
 
 struct NamedSpace {
@@ -50,9 +60,9 @@ struct NamedSpace {
 
 const std::vector<NamedSpace>& NamedSpaces() {
     static const std::vector<NamedSpace> spaces = {
-        {"srgb", [] { return WithSRGBPrimaries(std::make_shared<PK::SRGBColorSpace>()); }},
-        {"rec709", [] { return Hub(std::make_shared<PK::Rec709ColorSpace>()); }},
-        {"rec2020", [] { return WideGamut(std::make_shared<PK::Rec2020ColorSpace>()); }},
+        {"srgb", [] { return WithSRGBPrimaries(Make<PK::SRGBColorSpace>()); }},
+        {"rec709", [] { return Hub(Make<PK::Rec709ColorSpace>()); }},
+        {"rec2020", [] { return WideGamut(Make<PK::Rec2020ColorSpace>()); }},
         {"p3", [] { return P3(PK::kIlluminantD65); }},
         {"p3-d60", [] { return P3(PK::kIlluminantD60); }},
         {"p3-dci", [] { return P3(PK::kIlluminantDCI); }},
@@ -74,10 +84,9 @@ std::string LowerCase(std::string text) {
 }
 
 float ParseGamma(const std::string& name, const std::string& text) {
-    float gamma = 0;
-    const char* end = text.data() + text.size();
-    const auto [stop, error] = std::from_chars(text.data(), end, gamma);
-    if (error == std::errc() && stop == end && std::isfinite(gamma) && gamma > 0) return gamma;
+    const char* next = text.c_str();
+    const auto gamma = static_cast<float>(ParseNumber(next));
+    if (*next == '\0' && std::isfinite(gamma) && gamma > 0) return gamma;
     throw Failure(kExitUsage,
                   "'" + name + "' needs an exponent above 0 from linear to encoded, such as gamma:0.45");
 }
