@@ -6,8 +6,8 @@
 
 namespace PK {
 
-int32_t sLargestCacheLevel = 0;
-uint64_t sLargestCacheBytes = 0;
+constinit Relaxed<int32_t> sLargestCacheLevel;
+constinit Relaxed<uint64_t> sLargestCacheBytes;
 
 namespace {
 

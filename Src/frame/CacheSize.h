@@ -2,12 +2,14 @@
 
 // The largest unified cache of the processor. No algorithm asks for it yet.
 
+#include "primitives/Relaxed.h"
+
 #include <cstdint>
 
 namespace PK {
 
-extern int32_t sLargestCacheLevel;
-extern uint64_t sLargestCacheBytes;
+extern Relaxed<int32_t> sLargestCacheLevel;
+extern Relaxed<uint64_t> sLargestCacheBytes;
 
 /// Bytes of the largest unified cache, as the last start of the library found it.
 uint64_t LargestCacheBytes() noexcept;

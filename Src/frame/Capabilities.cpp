@@ -1,10 +1,12 @@
 #include "frame/Capabilities.h"
 
 #include "frame/CacheSize.h"
+#include "primitives/Dispatch.h"
 
 #include "zebcore/debug.h"
 
 #include <cpuid.h>
+#include <string_view>
 #include <unistd.h>
 
 namespace PK {
@@ -48,17 +50,38 @@ uint32_t ReadXCR0() {
     return low;
 }
 
-void SetIf(uint8_t& flag, bool condition) {
+void SetIf(Flag& flag, bool condition) {
     if (condition) flag = 1;
 }
 
 // A host without the memory to answer leaves the default.
-bool SettingIsTrue(const char* name) noexcept {
+template <class Use>
+void WithSetting(const char* name, const char* defaultText, Use use) noexcept {
     try {
-        return zebcore::debug::DebugDatabase::Instance().GetEntry(name, "false") == "true";
+        use(zebcore::debug::DebugDatabase::Instance().GetEntry(name, defaultText));
     } catch (...) {
-        return false;
+        return;
     }
+}
+
+void ClearIfTrue(const char* setting, Flag& flag) noexcept {
+    WithSetting(setting, "false", [&flag](std::string_view text) {
+        if (text == "true") flag = 0;
+    });
+}
+
+// The report without what stands above a target. SSE stays: it has no bodies of its own.
+ProcessorReport UpTo(Target highest, ProcessorReport report) {
+    if (highest < Target::avx512) report.leaf7EBX &= ~kLeaf7EBX_AVX512;
+    if (highest < Target::avx2) report.leaf7EBX &= ~kLeaf7EBX_AVX2;
+    if (highest < Target::avx) report.leaf1ECX &= ~kLeaf1ECX_AVX;
+    if (highest < Target::sse41) report.leaf1ECX &= ~(kLeaf1ECX_SSE41 | kLeaf1ECX_SSE42);
+    if (highest < Target::ssse3) report.leaf1ECX &= ~kLeaf1ECX_SSSE3;
+    if (highest < Target::sse2) {
+        report.leaf1ECX &= ~kLeaf1ECX_SSE3;
+        report.leaf1EDX &= ~kLeaf1EDX_SSE2;
+    }
+    return report;
 }
 
 } // namespace
@@ -74,7 +97,7 @@ ProcessorReport ReadProcessor() noexcept {
         uint32_t edx = 0;
         __cpuid_count(7, 0, eax, report.leaf7EBX, ecx, edx);
     }
-    return report;
+    return UpTo(HighestTarget(), report);
 }
 
 void SetCapabilities(const ProcessorReport& report) noexcept {
@@ -91,12 +114,19 @@ void SetCapabilities(const ProcessorReport& report) noexcept {
     SetIf(sCPUHasAVX512, HasAll(report.leaf7EBX, kLeaf7EBX_AVX512) && HasAll(report.xcr0, kXCR0_AVX512));
 }
 
+void ApplyTargetSetting() noexcept {
+    WithSetting("PK.highestTarget", "", [](std::string_view word) {
+        if (const auto target = TargetOfWord(word)) HoldTo(*target);
+    });
+}
+
 void ApplyCapabilitySettings() noexcept {
-    if (SettingIsTrue("PK.disableAVX")) sCPUHasAVX = 0;
-    if (SettingIsTrue("PK.disableAVX2")) sCPUHasAVX2 = 0;
+    ClearIfTrue("PK.disableAVX", sCPUHasAVX);
+    ClearIfTrue("PK.disableAVX2", sCPUHasAVX2);
 }
 
 void DetectProcessor() noexcept {
+    ApplyTargetSetting();
     SetCapabilities(ReadProcessor());
     DetectCache(sysconf);
     ApplyCapabilitySettings(); // after the cache, which goes by the flags as the processor gave them

@@ -17,16 +17,20 @@ struct ProcessorReport {
     uint32_t xcr0;     ///< State that the operating system saves; 0 if not asked.
 };
 
-/// Asks the processor.
+/// Asks the processor; what stands above the highest target (Dispatch.h) counts as missing.
 ProcessorReport ReadProcessor() noexcept;
 
 /// Sets the flags that the report carries and clears none.
 void SetCapabilities(const ProcessorReport& report) noexcept;
 
+/// Holds the library to the target that the host's setting "PK.highestTarget" names by its word; if there is none, it
+/// stays held as it is.
+void ApplyTargetSetting() noexcept;
+
 /// Clears AVX and AVX2 where the host's settings ask for it.
 void ApplyCapabilitySettings() noexcept;
 
-/// The whole of processor detection, in its order: capabilities, cache, settings.
+/// The whole of processor detection, in its order: highest target, capabilities, cache, settings.
 void DetectProcessor() noexcept;
 
 } // namespace PK

@@ -2,21 +2,19 @@
 
 #include "frame/DebugSwitches.h"
 
-#include "primitives/CapabilityFlags.h"
-
 #include <PixelKiln/Lifecycle.h>
 
 #include <iterator>
 
 namespace PK {
 
-uint8_t sMotionBlurLinear = 0;
-uint8_t sAllOriginsTopLeft = 0;
+constinit Flag sMotionBlurLinear;
+constinit Flag sAllOriginsTopLeft;
 
 namespace {
 
 // By number; a switch without a flag is accepted and does nothing.
-constexpr uint8_t* kSwitches[] = {
+constexpr Flag* kSwitches[] = {
     &sMotionBlurLinear, nullptr,       &sCPUHasSSE, &sCPUHasSSE2, &sCPUHasSSE3,        &sCPUHasSSSE3,
     &sCPUHasSSE4,       &sCPUHasSSE42, &sCPUHasAVX, &sCPUHasAVX2, &sAllOriginsTopLeft,
 };

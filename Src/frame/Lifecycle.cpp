@@ -7,10 +7,15 @@
 
 #include <PixelKiln/Lifecycle.h>
 
+#include <mutex>
+
 namespace PK {
 namespace {
 
-// Calls of PK_Initialize not yet matched by PK_Terminate; below 0 after a stop too many.
+// Parts of a program that know nothing of each other start and stop the library whenever they like.
+constinit std::mutex sMutex;
+
+// Calls of PK_Initialize not yet matched by PK_Terminate; below 0 after a stop too many. Guarded by sMutex.
 int32_t sNestingCount = 0;
 
 } // namespace
@@ -18,6 +23,7 @@ int32_t sNestingCount = 0;
 
 PK_Result PK_Initialize(void) noexcept {
     using namespace PK;
+    const std::scoped_lock lock(sMutex);
     sNestingCount = WrapAdd(sNestingCount, 1);
     if (sNestingCount != 1) return PK_Success;
     DetectProcessor();
@@ -28,6 +34,7 @@ PK_Result PK_Initialize(void) noexcept {
 
 PK_Result PK_Terminate(void) noexcept {
     using namespace PK;
+    const std::scoped_lock lock(sMutex);
     sNestingCount = WrapAdd(sNestingCount, -1);
     if (sNestingCount == 0) Threading::ReleaseTaskExecutor();
     return PK_Success;

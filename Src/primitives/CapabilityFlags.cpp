@@ -2,14 +2,14 @@
 
 namespace PK {
 
-uint8_t sCPUHasSSE = 0;
-uint8_t sCPUHasSSE2 = 0;
-uint8_t sCPUHasSSE3 = 0;
-uint8_t sCPUHasSSSE3 = 0;
-uint8_t sCPUHasSSE4 = 0;
-uint8_t sCPUHasSSE42 = 0;
-uint8_t sCPUHasAVX = 0;
-uint8_t sCPUHasAVX2 = 0;
-uint8_t sCPUHasAVX512 = 0;
+constinit Flag sCPUHasSSE;
+constinit Flag sCPUHasSSE2;
+constinit Flag sCPUHasSSE3;
+constinit Flag sCPUHasSSSE3;
+constinit Flag sCPUHasSSE4;
+constinit Flag sCPUHasSSE42;
+constinit Flag sCPUHasAVX;
+constinit Flag sCPUHasAVX2;
+constinit Flag sCPUHasAVX512;
 
 } // namespace PK

@@ -3,8 +3,12 @@
 #include "primitives/CapabilityFlags.h"
 #include "primitives/CpuFeatures.h"
 
+#include <algorithm>
+
 namespace PK {
 namespace {
+
+constinit Relaxed<Target> sHighestTarget{Target::avx512};
 
 bool FlagsAllow(Target target) {
     const uint8_t flags[] = {1, sCPUHasSSE2, sCPUHasSSSE3, sCPUHasSSE4, sCPUHasAVX2, sCPUHasAVX512};
@@ -20,6 +24,22 @@ const char* TargetName(Target target) noexcept {
     constexpr const char* names[kTargetCount] = {"plain", "SSE2", "SSSE3",        "SSE4.1",
                                                  "AVX",   "AVX2", "AVX2 and FMA", "AVX-512"};
     return names[static_cast<std::size_t>(target)];
+}
+
+std::optional<Target> TargetOfWord(std::string_view word) noexcept {
+    constexpr std::string_view words[kTargetCount] = {"plain", "sse2", "ssse3",   "sse41",
+                                                      "avx",   "avx2", "avx2fma", "avx512"};
+    const auto found = std::ranges::find(words, word);
+    if (found == std::end(words)) return std::nullopt;
+    return static_cast<Target>(found - words);
+}
+
+Target HighestTarget() noexcept {
+    return sHighestTarget;
+}
+
+void HoldTo(Target highest) noexcept {
+    sHighestTarget = highest;
 }
 
 bool Runs(const CpuFlags& processor, Target target) noexcept {
@@ -45,7 +65,8 @@ bool Runs(const CpuFlags& processor, Target target) noexcept {
 }
 
 bool IsEnabled(Target target, Offer offer) noexcept {
-    return offer == Offer::flags ? FlagsAllow(target) : Runs(CpuFeatures::Flags(), target);
+    if (offer == Offer::flags) return FlagsAllow(target); // detection has left out what is above the highest
+    return target <= HighestTarget() && Runs(CpuFeatures::Flags(), target);
 }
 
 Target BestTarget(Offer offer) noexcept {

@@ -7,7 +7,9 @@
 #include "primitives/simd/Targets.h"
 
 #include <cstddef>
+#include <optional>
 #include <span>
+#include <string_view>
 #include <utility>
 
 namespace PK {
@@ -26,6 +28,17 @@ constexpr std::span<const Target> TargetsOf(Offer offer) {
 }
 
 const char* TargetName(Target target) noexcept;
+
+/// The target that a setting names as Targets.h spells it ("sse41"), if there is one.
+std::optional<Target> TargetOfWord(std::string_view word) noexcept;
+
+/// Every target above this one counts as missing in this process, whatever the processor has: AVX-512, unless HoldTo was
+/// called. So any machine runs the bodies of all that are older.
+Target HighestTarget() noexcept;
+
+/// What was detected or chosen before is left as it is: call it before the library starts and before a colour space
+/// converts for the first time.
+void HoldTo(Target highest) noexcept;
 
 /// Whether a processor of this record runs the bodies of a target.
 bool Runs(const CpuFlags& processor, Target target) noexcept;

@@ -1,5 +1,6 @@
 #include "support/Switches.h"
 
+#include "primitives/Dispatch.h"
 #include "support/Check.h"
 
 #include <PixelKiln/Lifecycle.h>
@@ -8,17 +9,18 @@ namespace PKFuzz {
 
 namespace {
 
-// Asked of the compiler's own detection, not of the library's.
+// Asked of the compiler's own detection, not of the library's; what the library is held below counts as missing.
 Switches Capabilities() {
+    const PK::Target highest = PK::HighestTarget();
     Switches has{};
     has[2] = __builtin_cpu_supports("sse");
-    has[3] = __builtin_cpu_supports("sse2");
-    has[4] = __builtin_cpu_supports("sse3");
-    has[5] = __builtin_cpu_supports("ssse3");
-    has[kSwitchSSE4] = __builtin_cpu_supports("sse4.1");
-    has[7] = __builtin_cpu_supports("sse4.2");
-    has[kSwitchAVX] = __builtin_cpu_supports("avx");
-    has[kSwitchAVX2] = __builtin_cpu_supports("avx2");
+    has[3] = __builtin_cpu_supports("sse2") && highest >= PK::Target::sse2;
+    has[4] = __builtin_cpu_supports("sse3") && highest >= PK::Target::sse2;
+    has[5] = __builtin_cpu_supports("ssse3") && highest >= PK::Target::ssse3;
+    has[kSwitchSSE4] = __builtin_cpu_supports("sse4.1") && highest >= PK::Target::sse41;
+    has[7] = __builtin_cpu_supports("sse4.2") && highest >= PK::Target::sse41;
+    has[kSwitchAVX] = __builtin_cpu_supports("avx") && highest >= PK::Target::avx;
+    has[kSwitchAVX2] = __builtin_cpu_supports("avx2") && highest >= PK::Target::avx2;
     return has;
 }
 

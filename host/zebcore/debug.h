@@ -12,7 +12,8 @@
 
 namespace zebcore::debug {
 
-/// Named settings of the process. The library only reads; the program fills it, before it starts the library.
+/// Named settings of the process. The library only reads; the program fills it, before it starts the library. At first it
+/// has what the environment variable PIXELKILN_SETTINGS tells: "name=text,name=text".
 class DebugDatabase {
 public:
     static DebugDatabase& Instance();

@@ -27,6 +27,10 @@ extern "C" {
 /// pixels. A stream of DV or 4:2:0 ignores its row bytes; one of an unknown kind can only be copied, as a
 /// block of that many bytes. Source and destination must not overlap.
 ///
+/// Cache: where bytes are copied as they are, a block of 524288 bytes and more is written past the cache, as
+/// PK_CopyMemory does it. Another thread may rely on the destination after any locked or fencing operation, as
+/// every mutex performs; a plain or relaxed flag does not suffice.
+///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on
 /// different destinations. PK_Initialize must have been called. During the call MXCSR has the flush-to-zero
 /// and the precision bit set in addition, and rounds as the caller has it; it is restored on return, whatever

@@ -3,8 +3,10 @@
 /// \file
 /// Start and stop of the library, processor capabilities and debug switches.
 ///
-/// PK_Initialize, PK_Terminate and PK_SetDebugFlag take no lock: call them from one thread at a time, and not
-/// while another operation runs. The three queries may be called from any thread.
+/// All may be called from any thread at any time. Parts of a program that know nothing of each other, as two
+/// plug-ins, each start and stop the library for themselves. An operation that runs while PK_Initialize detects
+/// the processor, or while PK_SetDebugFlag writes, may choose some of its kernels by the old flags and some by the
+/// new: where these give different results, rows of its image may differ.
 
 #include <PixelKiln/Types.h>
 
@@ -13,7 +15,9 @@ extern "C" {
 /// Starts the library. Calls nest: only the one that brings the count of open calls to 1 does any work,
 /// which is to detect the processor (this sets capability flags and never clears any), to read the host's
 /// settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), to start the
-/// primitives, and to take the host's pool of threads, on which some operations run parts of their work.
+/// primitives, and to take the host's pool of threads, on which some operations run parts of their work. For
+/// tests, the setting "PK.highestTarget" (plain, sse2, ssse3, sse41, avx, avx2, avx2fma or avx512) lets
+/// everything above it count as missing in the processor, for colour spaces that have not converted yet too.
 /// Every call wants a matching PK_Terminate.
 /// \return always PK_Success.
 PK_API PK_Result PK_Initialize(void) noexcept;

@@ -4,18 +4,19 @@
 #include <PixelKiln/Convert.h>
 
 #include "convert/RasterFormats.h"
-#include "frame/Capabilities.h"
 #include "frame/FloatMode.h"
 #include "reference/ReferenceKernels.h"
 #include "reference/ReferenceRouter.h"
-#include "support/FlagScope.h"
+#include "register/KernelRegister.h"
 #include "support/Photograph.h"
 #include "support/RowBuffer.h"
 #include "support/Samples.h"
+#include "support/Targets.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -62,34 +63,32 @@ std::string CompareRows(PK_PixelFormat format, size_t bytes, const uint8_t* expe
                       : FirstDifference(format, bytes, expected, actual);
 }
 
+/// Whether the body that is chosen for a kernel follows the other of its two rules, if it has two.
+bool TakesOtherRule(std::string_view kernel) {
+    static const std::vector<PK::KernelRow> kernels = PK::KernelRegister();
+    return std::ranges::any_of(kernels, [kernel](const PK::KernelRow& row) {
+        return row.name == kernel && row.agreement.kind == PK::Agreement::Declared &&
+               row.agreement.from <= PK::BestTarget();
+    });
+}
+
 /// What the named kernels give, one after the other, for one row.
 void RunReference(const std::vector<reference::Step>& chain, PK_PixelFormat format, const uint8_t* source,
                   int32_t width, uint8_t* result) {
     const PK::FloatMode mode;
-    const bool vectorMembers = PK::sCPUHasSSSE3 != 0;
     Image scratch[2] = {{format, width}, {format, width}};
     for (size_t i = 0; i < chain.size(); ++i) {
         uint8_t* destination = i + 1 == chain.size() ? result : scratch[i % 2].Row(0);
-        reference::Run(chain[i].kernel, format, chain[i].next, vectorMembers, source, destination, width,
-                       chain[i].interpolated ? kQuality : 0);
+        reference::Run(chain[i].kernel, format, chain[i].next, TakesOtherRule(chain[i].kernel), source,
+                       destination, width, chain[i].interpolated ? kQuality : 0);
         source = destination;
         format = chain[i].next;
     }
 }
 
-struct Bodies {
-    const char* name;
-    bool vector;
-};
-
-class ConvertReference : public testing::TestWithParam<Bodies> {
+class ConvertReference : public TargetTest {
 protected:
-    void SetUp() override {
-        FlagScope::ClearAll();
-        if (GetParam().vector) PK::DetectProcessor();
-    }
-
-    void ExpectAllFrom(Image& source) {
+    static void ExpectAllFrom(Image& source) {
         for (const PK_PixelFormat format : PK::kRasterFormats) {
             if (format == source.format) continue;
             SCOPED_TRACE(testing::Message() << std::hex << source.format << " to " << format);
@@ -108,8 +107,6 @@ protected:
             }
         }
     }
-
-    FlagScope flags;
 };
 
 TEST_P(ConvertReference, EveryPairOnAPhotograph) {
@@ -167,8 +164,6 @@ TEST_P(ConvertReference, EveryPairUpToTheGuardPages) {
                 }
 }
 
-INSTANTIATE_TEST_SUITE_P(Bodies, ConvertReference,
-                         testing::Values(Bodies{"plain", false}, Bodies{"best", true}),
-                         [](const auto& param) { return std::string(param.param.name); });
+INSTANTIATE_TEST_SUITE_P(Targets, ConvertReference, EveryTarget(), TargetOf);
 
 } // namespace

@@ -3,8 +3,11 @@
 #include "frame/Capabilities.h"
 
 #include "support/FlagScope.h"
+#include "support/Targets.h"
 
 #include "zebcore/debug.h"
+
+#include <PixelKiln/Lifecycle.h>
 
 #include <gtest/gtest.h>
 
@@ -34,7 +37,7 @@ private:
 TEST_F(Capabilities, EachBitSetsItsFlagAndNoOther) {
     struct {
         ProcessorReport report;
-        uint8_t* flag;
+        Flag* flag;
     } const cases[] = {
         {{kSignature, 0, 1u << 25, 0, 0}, &sCPUHasSSE},
         {{kSignature, 0, 1u << 26, 0, 0}, &sCPUHasSSE2},
@@ -47,7 +50,7 @@ TEST_F(Capabilities, EachBitSetsItsFlagAndNoOther) {
     for (const auto& single : cases) {
         FlagScope::ClearAll();
         SetCapabilities(single.report);
-        for (const uint8_t* flag : PKTest::AllFlags()) EXPECT_EQ(*flag, flag == single.flag ? 1 : 0);
+        for (const Flag* flag : PKTest::AllFlags()) EXPECT_EQ(*flag, flag == single.flag ? 1 : 0);
     }
 }
 
@@ -94,24 +97,62 @@ TEST_F(Capabilities, AVX512NeedsAllItsPartsAndTheSystem) {
 }
 
 TEST_F(Capabilities, DetectionClearsNothing) {
-    for (uint8_t* flag : PKTest::AllFlags()) *flag = 1;
+    for (Flag* flag : PKTest::AllFlags()) *flag = 1;
     SetCapabilities({});
-    for (const uint8_t* flag : PKTest::AllFlags()) EXPECT_EQ(*flag, 1);
+    for (const Flag* flag : PKTest::AllFlags()) EXPECT_EQ(*flag, 1);
 }
 
 TEST_F(Capabilities, DetectionAgreesWithTheCompiler) {
     DetectProcessor();
+    const auto has = [](Target target, bool processorHas) {
+        return processorHas && target <= HighestTarget();
+    };
     EXPECT_EQ(sCPUHasSSE, 1);
-    EXPECT_EQ(sCPUHasSSE2, 1);
-    EXPECT_EQ(sCPUHasSSE3 != 0, __builtin_cpu_supports("sse3") != 0);
-    EXPECT_EQ(sCPUHasSSSE3 != 0, __builtin_cpu_supports("ssse3") != 0);
-    EXPECT_EQ(sCPUHasSSE4 != 0, __builtin_cpu_supports("sse4.1") != 0);
-    EXPECT_EQ(sCPUHasSSE42 != 0, __builtin_cpu_supports("sse4.2") != 0);
-    EXPECT_EQ(sCPUHasAVX != 0, __builtin_cpu_supports("avx") != 0);
-    EXPECT_EQ(sCPUHasAVX2 != 0, __builtin_cpu_supports("avx2") != 0);
-    EXPECT_EQ(sCPUHasAVX512 != 0, __builtin_cpu_supports("avx512f") && __builtin_cpu_supports("avx512dq") &&
+    EXPECT_EQ(sCPUHasSSE2 != 0, has(Target::sse2, true));
+    EXPECT_EQ(sCPUHasSSE3 != 0, has(Target::sse2, __builtin_cpu_supports("sse3")));
+    EXPECT_EQ(sCPUHasSSSE3 != 0, has(Target::ssse3, __builtin_cpu_supports("ssse3")));
+    EXPECT_EQ(sCPUHasSSE4 != 0, has(Target::sse41, __builtin_cpu_supports("sse4.1")));
+    EXPECT_EQ(sCPUHasSSE42 != 0, has(Target::sse41, __builtin_cpu_supports("sse4.2")));
+    EXPECT_EQ(sCPUHasAVX != 0, has(Target::avx, __builtin_cpu_supports("avx")));
+    EXPECT_EQ(sCPUHasAVX2 != 0, has(Target::avx2, __builtin_cpu_supports("avx2")));
+    EXPECT_EQ(sCPUHasAVX512 != 0,
+              has(Target::avx512, __builtin_cpu_supports("avx512f") && __builtin_cpu_supports("avx512dq") &&
                                       __builtin_cpu_supports("avx512bw") &&
-                                      __builtin_cpu_supports("avx512vl"));
+                                      __builtin_cpu_supports("avx512vl")));
+}
+
+TEST_F(Capabilities, TheHighestTargetHoldsBothOffersDown) {
+    for (const Offer offer : {Offer::flags, Offer::processor}) {
+        for (const Target highest : PKTest::TargetsOfThisProcessor(offer)) {
+            const FlagScope restore;
+            FlagScope::ClearAll();
+            HoldTo(highest);
+            SetCapabilities(ReadProcessor());
+            EXPECT_EQ(BestTarget(offer), highest) << TargetName(highest);
+            for (const Target target : TargetsOf(Offer::flags))
+                EXPECT_TRUE(target <= highest || !IsEnabled(target)) << TargetName(highest);
+        }
+    }
+}
+
+TEST_F(Capabilities, ASettingNamesTheHighestTarget) {
+    DebugDatabase& settings = DebugDatabase::Instance();
+    const std::string before = settings.GetEntry("PK.highestTarget", "");
+    settings.SetEntry("PK.highestTarget", "plain");
+    DetectProcessor();
+    EXPECT_EQ(HighestTarget(), Target::plain);
+    EXPECT_EQ(BestTarget(), Target::plain);
+    EXPECT_FALSE(PK_hasSSE4());
+    for (const char* noTarget : {"", "SSE2", "sse4", "avx-512", "plain "}) {
+        settings.SetEntry("PK.highestTarget", noTarget);
+        ApplyTargetSetting();
+        EXPECT_EQ(HighestTarget(), Target::plain) << noTarget;
+    }
+    settings.SetEntry("PK.highestTarget", "avx2fma");
+    ApplyTargetSetting();
+    EXPECT_EQ(HighestTarget(), Target::avx2fma);
+    settings.RemoveEntry("PK.highestTarget");
+    if (!before.empty()) settings.SetEntry("PK.highestTarget", before);
 }
 
 TEST_F(Capabilities, EachSettingTakesItsFlagOnly) {

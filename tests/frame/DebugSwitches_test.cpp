@@ -14,7 +14,7 @@ namespace {
 
 struct Switch {
     uint32_t number;
-    uint8_t* flag;
+    Flag* flag;
 };
 
 constexpr Switch kSwitches[] = {
@@ -31,7 +31,7 @@ TEST(DebugSwitches, WriteTheirFlagOnly) {
         for (const int32_t on : {1, 2, -1, 256, INT32_MIN}) {
             FlagScope::ClearAll();
             ASSERT_EQ(PK_SetDebugFlag(one.number, on), PK_Success);
-            for (const uint8_t* flag : AllFlags()) EXPECT_EQ(*flag, flag == one.flag ? 1 : 0) << one.number;
+            for (const Flag* flag : AllFlags()) EXPECT_EQ(*flag, flag == one.flag ? 1 : 0) << one.number;
         }
         ASSERT_EQ(PK_SetDebugFlag(one.number, 0), PK_Success);
         EXPECT_EQ(*one.flag, 0);
@@ -43,12 +43,12 @@ TEST(DebugSwitches, OtherNumbersAreIgnored) {
     for (const uint32_t number : {1u, 11u, 12u, 255u, 256u, 0x80000003u, 0xffffffffu}) {
         FlagScope::ClearAll();
         EXPECT_EQ(PK_SetDebugFlag(number, 1), PK_Success);
-        for (uint8_t* flag : AllFlags()) {
+        for (Flag* flag : AllFlags()) {
             EXPECT_EQ(*flag, 0) << number;
             *flag = 1;
         }
         EXPECT_EQ(PK_SetDebugFlag(number, 0), PK_Success);
-        for (const uint8_t* flag : AllFlags()) EXPECT_EQ(*flag, 1) << number;
+        for (const Flag* flag : AllFlags()) EXPECT_EQ(*flag, 1) << number;
     }
 }
 

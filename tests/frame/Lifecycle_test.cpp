@@ -1,5 +1,5 @@
-// Start and stop nest by count. Whether a call does the work of a start shows in the SSE2 flag, which every
-// x86-64 processor has.
+// Start and stop nest by count. Whether a call does the work of a start shows in the SSE flag, which every
+// x86-64 processor has and nothing takes away but a switch.
 
 #include "support/FlagScope.h"
 
@@ -9,16 +9,20 @@
 
 #include <gtest/gtest.h>
 
-using PK::sCPUHasSSE2;
+#include <latch>
+#include <thread>
+#include <vector>
+
+using PK::sCPUHasSSE;
 using PKTest::FlagScope;
 using zebcore::debug::DebugDatabase;
 
 namespace {
 
 bool InitialiseStarts() {
-    sCPUHasSSE2 = 0;
+    sCPUHasSSE = 0;
     EXPECT_EQ(PK_Initialize(), PK_Success);
-    return sCPUHasSSE2 == 1;
+    return sCPUHasSSE == 1;
 }
 
 } // namespace
@@ -57,22 +61,41 @@ TEST(Lifecycle, StopLeavesTheFlags) {
     ASSERT_EQ(PK_Initialize(), PK_Success);
     PK_SetDebugFlag(7, 1);
     ASSERT_EQ(PK_Terminate(), PK_Success);
-    EXPECT_EQ(sCPUHasSSE2, 1);
+    EXPECT_EQ(sCPUHasSSE, 1);
     EXPECT_EQ(PK::sCPUHasSSE42, 1);
 }
 
 TEST(Lifecycle, AStartDetectsASwitchedOffCapabilityAnew) {
     const FlagScope flags;
     ASSERT_EQ(PK_Initialize(), PK_Success);
-    PK_SetDebugFlag(3, 0);
+    PK_SetDebugFlag(2, 0);
     ASSERT_EQ(PK_Initialize(), PK_Success);
-    EXPECT_EQ(sCPUHasSSE2, 0);
+    EXPECT_EQ(sCPUHasSSE, 0);
     ASSERT_EQ(PK_Terminate(), PK_Success);
     ASSERT_EQ(PK_Terminate(), PK_Success);
-    EXPECT_EQ(sCPUHasSSE2, 0);
+    EXPECT_EQ(sCPUHasSSE, 0);
     ASSERT_EQ(PK_Initialize(), PK_Success);
-    EXPECT_EQ(sCPUHasSSE2, 1);
+    EXPECT_EQ(sCPUHasSSE, 1);
     ASSERT_EQ(PK_Terminate(), PK_Success);
+}
+
+TEST(Lifecycle, ThreadsThatKnowNothingOfEachOtherStartAndStop) {
+    const FlagScope flags;
+    std::vector<std::thread> plugIns;
+    std::latch begin(4);
+    for (int i = 0; i < 4; ++i)
+        plugIns.emplace_back([&begin] {
+            begin.arrive_and_wait();
+            for (int round = 0; round < 200; ++round) {
+                PK_Initialize();
+                PK_Initialize();
+                PK_Terminate();
+                PK_Terminate();
+            }
+        });
+    for (std::thread& plugIn : plugIns) plugIn.join();
+    EXPECT_TRUE(InitialiseStarts()) << "a start or a stop was lost";
+    EXPECT_EQ(PK_Terminate(), PK_Success);
 }
 
 TEST(Lifecycle, ReadsTheSettingsAtAStart) {

@@ -116,6 +116,7 @@ TEST(Transpose, TwiceIsTheImageItself) {
 TEST(Transpose, OnlyTheVectorFormKeepsStepsThatAreNoWholePixels) {
     const FlagScope flags;
     PK::DetectProcessor();
+    PK_SetDebugFlag(3, 1); // every processor has SSE2
     std::array<uint8_t, 64> source{}, destination{};
     for (size_t i = 0; i < source.size(); ++i) source[i] = static_cast<uint8_t>(i);
     // Two rows of one pixel, 7 bytes apart.

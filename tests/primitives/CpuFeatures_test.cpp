@@ -181,7 +181,7 @@ TEST(ProcessorTargets, RunWhereTheirInstructionsAre) {
 TEST(ProcessorTargets, TheBestIsTheHighestThatRuns) {
     int best = 0;
     for (const Target target : kProcessorTargets)
-        if (Runs(CpuFeatures::Flags(), target)) best = static_cast<int>(target);
+        if (target <= HighestTarget() && Runs(CpuFeatures::Flags(), target)) best = static_cast<int>(target);
     EXPECT_EQ(static_cast<int>(BestTarget(Offer::processor)), best);
 }
 

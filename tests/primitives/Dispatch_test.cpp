@@ -15,7 +15,7 @@ using namespace PK;
 
 TEST(Dispatch, AVX512NeedsItsOwnFlagAndThatOfAVX2) {
     const PKTest::FlagScope flags;
-    for (uint8_t* flag : PKTest::AllFlags()) *flag = 1;
+    for (Flag* flag : PKTest::AllFlags()) *flag = 1;
     EXPECT_TRUE(IsEnabled(Target::avx512));
     sCPUHasAVX512 = 0;
     EXPECT_FALSE(IsEnabled(Target::avx512));
@@ -28,7 +28,7 @@ TEST(Dispatch, AVX512NeedsItsOwnFlagAndThatOfAVX2) {
 
 TEST(Dispatch, AnOfferEnablesNoTargetThatItHasNot) {
     const PKTest::FlagScope flags;
-    for (uint8_t* flag : PKTest::AllFlags()) *flag = 1;
+    for (Flag* flag : PKTest::AllFlags()) *flag = 1;
     EXPECT_FALSE(IsEnabled(Target::avx));
     EXPECT_FALSE(IsEnabled(Target::avx2fma));
     EXPECT_EQ(Target::avx512, BestTarget());

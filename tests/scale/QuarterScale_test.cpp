@@ -142,6 +142,7 @@ TEST_F(QuarterScale, TheSecondFieldTakesLumaRows1And3AndChromaRow0) {
 }
 
 TEST_F(QuarterScale, AWidthOf720FillsWholeVectorsWithSSE2) {
+    PK::sCPUHasSSE2 = 1;
     CheckReduction(720, 4, 1, true, fRandom);
     EXPECT_EQ(WrittenSamples(720, true), 704u);
     EXPECT_EQ(WrittenSamples(360, true), 352u);

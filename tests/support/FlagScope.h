@@ -1,10 +1,11 @@
 #pragma once
 
-// Puts the capability flags and the debug switches back as they were at the end of the scope.
+// Puts the capability flags, the debug switches and the highest target back as they were at the end of the scope.
 
 #include "frame/CacheSize.h"
 #include "frame/Capabilities.h"
 #include "frame/DebugSwitches.h"
+#include "primitives/Dispatch.h"
 
 #include <array>
 #include <cstddef>
@@ -12,7 +13,7 @@
 namespace PKTest {
 
 /// The flags in the order of their switch numbers, and the one that has no switch; switch 1 has no flag.
-inline std::array<uint8_t*, 11> AllFlags() {
+inline std::array<PK::Flag*, 11> AllFlags() {
     using namespace PK;
     return {&sMotionBlurLinear, &sCPUHasSSE, &sCPUHasSSE2, &sCPUHasSSE3,        &sCPUHasSSSE3, &sCPUHasSSE4,
             &sCPUHasSSE42,      &sCPUHasAVX, &sCPUHasAVX2, &sAllOriginsTopLeft, &sCPUHasAVX512};
@@ -25,6 +26,7 @@ public:
     }
     ~FlagScope() {
         for (std::size_t i = 0; i < fFlags.size(); ++i) *fFlags[i] = fSaved[i];
+        PK::HoldTo(fHighest);
         PK::sLargestCacheLevel = fCacheLevel;
         PK::sLargestCacheBytes = fCacheBytes;
     }
@@ -33,12 +35,13 @@ public:
 
     /// Switches everything off, as it stands before the first start.
     static void ClearAll() {
-        for (uint8_t* flag : AllFlags()) *flag = 0;
+        for (PK::Flag* flag : AllFlags()) *flag = 0;
     }
 
 private:
-    std::array<uint8_t*, 11> fFlags;
+    std::array<PK::Flag*, 11> fFlags;
     std::array<uint8_t, 11> fSaved{};
+    PK::Target fHighest = PK::HighestTarget();
     int32_t fCacheLevel = PK::sLargestCacheLevel;
     uint64_t fCacheBytes = PK::sLargestCacheBytes;
 };

@@ -1,6 +1,6 @@
 #pragma once
 
-// The instruction sets that this processor has and the library offers, and the ways to test the bodies of each.
+// The instruction sets that this processor has, the library offers and it is not held below, and the ways to test the bodies of each.
 
 #include "support/FlagScope.h"
 
@@ -15,6 +15,7 @@
 namespace PKTest {
 
 inline std::vector<PK::Target> FindTargets(PK::Offer offer) {
+    PK::ApplyTargetSetting();
     const FlagScope flags;
     FlagScope::ClearAll();
     PK::SetCapabilities(PK::ReadProcessor());
@@ -36,7 +37,7 @@ public:
     /// The processor must have the instruction set.
     explicit TargetScope(PK::Target target) {
         using namespace PK;
-        uint8_t* const flags[] = {&sCPUHasSSE2, &sCPUHasSSSE3, &sCPUHasSSE4, &sCPUHasAVX2, &sCPUHasAVX512};
+        Flag* const flags[] = {&sCPUHasSSE2, &sCPUHasSSSE3, &sCPUHasSSE4, &sCPUHasAVX2, &sCPUHasAVX512};
         static_assert(std::size(flags) + 1 == std::size(kFlagTargets));
         for (size_t i = 0; i < std::size(flags); ++i) *flags[i] = kFlagTargets[i + 1] <= target;
         EXPECT_EQ(BestTarget(), target);

@@ -3,6 +3,7 @@
 
 #include "convert/KernelTable.h"
 #include "register/KernelRegister.h"
+#include "support/BodiesRun.h"
 #include "support/KernelRows.h"
 #include "support/KernelTrial.h"
 #include "support/RowBuffer.h"
@@ -25,26 +26,13 @@
 namespace {
 
 using namespace PK;
+using PKTest::Describe;
 using PKTest::Placement;
 using PKTest::RowBuffer;
 
 const std::vector<KernelRow>& Register() {
     static const std::vector<KernelRow> rows = KernelRegister();
     return rows;
-}
-
-std::string FormatName(PK_PixelFormat format) {
-    return format == PK_PixelFormat_RGB_444_10u ? "RGB_444_10u" : PK_PixelFormatName(format);
-}
-
-std::string Describe(const KernelRow& row) {
-    std::string text = std::string(row.family) + " " + row.name;
-    const Operands& operands = row.operands;
-    if (operands.source.format != PK_PixelFormat_Invalid)
-        text += " from " + FormatName(operands.source.format);
-    if (operands.destination.format != PK_PixelFormat_Invalid)
-        text += " to " + FormatName(operands.destination.format);
-    return text;
 }
 
 /// Whether a body follows the rule that a declared kernel has from some target on.
@@ -137,7 +125,9 @@ TEST_P(KernelSweep, EveryAlignment) {
 /// Bodies of one rule share no restatement here, so that not even a unit in the last place is allowed.
 TEST_P(KernelSweep, BodiesOfOneRuleAgreeToTheBit) {
     constexpr int32_t kSize = 4096;
-    ASSERT_FALSE(targets.empty());
+    if (HighestTarget() > Target::plain) {
+        ASSERT_FALSE(targets.empty());
+    }
     for (int round = 0; round < 8; ++round) {
         const PKTest::KernelTrial trial = PKTest::MakeTrial(row, kSize, random.Next());
         std::vector<std::vector<uint8_t>> sources;
@@ -152,6 +142,7 @@ TEST_P(KernelSweep, BodiesOfOneRuleAgreeToTheBit) {
         std::vector<uint8_t> other = first;
         const std::vector<uint8_t> before = first;
         for (const Target target : targets) {
+            PKTest::NoteBodyRun(row, target);
             first = other = before;
             trial.call(row.body(Leader(target)), pointers, first.data());
             trial.call(row.body(target), pointers, other.data());
