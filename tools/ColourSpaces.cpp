@@ -14,17 +14,6 @@ namespace {
 
 using Shared = std::shared_ptr<const PK::ColorSpace>;
 
-/// The destructors of the library's classes are not virtual; what is shared is of a class that nobody derives from.
-template <class Conversion>
-struct Owned final : Conversion {
-    using Conversion::Conversion;
-};
-
-template <class Conversion, class... Arguments>
-Shared Make(Arguments... arguments) {
-    return std::make_shared<Owned<Conversion>>(arguments...);
-}
-
 Space WithSRGBPrimaries(Shared conversion) {
     return {{}, std::move(conversion), true, true, true, ToneRangeOutput::Encoded};
 }
@@ -34,7 +23,7 @@ Space Hub(Shared conversion) {
 }
 
 Space PowerLaw(float gamma) {
-    return {{}, Make<PK::GammaColorSpace>(gamma), true, false, false, ToneRangeOutput::None};
+    return {{}, std::make_shared<PK::GammaColorSpace>(gamma), true, false, false, ToneRangeOutput::None};
 }
 
 Space WideGamut(Shared conversion) {
@@ -42,15 +31,16 @@ Space WideGamut(Shared conversion) {
 }
 
 Space P3(PK::PK_Illuminant white) {
-    return WideGamut(Make<PK::DCIP3ColorSpace>(white));
+    return WideGamut(std::make_shared<PK::DCIP3ColorSpace>(white));
 }
 
 Space PQ(bool useP3, bool normalised) {
-    return {{}, Make<PK::PQColorSpace>(useP3, normalised), false, false, true, ToneRangeOutput::None};
+    const auto conversion = std::make_shared<PK::PQColorSpace>(useP3, normalised);
+    return {{}, conversion, false, false, true, ToneRangeOutput::None};
 }
 
 Space HLG() {
-    return {{}, Make<PK::HLGColorSpace>(), false, false, false, ToneRangeOutput::None};
+    return {{}, std::make_shared<PK::HLGColorSpace>(), false, false, false, ToneRangeOutput::None};
 }
 
 struct NamedSpace {
@@ -60,9 +50,9 @@ struct NamedSpace {
 
 const std::vector<NamedSpace>& NamedSpaces() {
     static const std::vector<NamedSpace> spaces = {
-        {"srgb", [] { return WithSRGBPrimaries(Make<PK::SRGBColorSpace>()); }},
-        {"rec709", [] { return Hub(Make<PK::Rec709ColorSpace>()); }},
-        {"rec2020", [] { return WideGamut(Make<PK::Rec2020ColorSpace>()); }},
+        {"srgb", [] { return WithSRGBPrimaries(std::make_shared<PK::SRGBColorSpace>()); }},
+        {"rec709", [] { return Hub(std::make_shared<PK::Rec709ColorSpace>()); }},
+        {"rec2020", [] { return WideGamut(std::make_shared<PK::Rec2020ColorSpace>()); }},
         {"p3", [] { return P3(PK::kIlluminantD65); }},
         {"p3-d60", [] { return P3(PK::kIlluminantD60); }},
         {"p3-dci", [] { return P3(PK::kIlluminantDCI); }},
