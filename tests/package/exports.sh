@@ -1,23 +1,29 @@
 #!/usr/bin/env bash
-# exports.sh LIBRARY INCLUDE_DIR: the library's dynamic symbols are exactly the functions that the installed
-# headers mark PK_API, and the names of namespace PK in cxx_exports.txt.
+# exports.sh LIBRARY INCLUDE_DIR: the binary interface that the installed headers declare is the one in interface.txt,
+# and the library's dynamic symbols are exactly its functions.
 set -euo pipefail
 library=$1
 headers=$2
+here=$(dirname "$0")
 export LC_ALL=C
 
-# same WHAT DECLARED EXPORTED
+# same WHAT LEFT RIGHT
 same() {
-    [ -n "$2" ] || { echo "no $1 is declared"; exit 1; }
     if ! difference=$(diff <(echo "$2") <(echo "$3")); then
-        echo "declared (<) and exported (>) $1 differ:"
+        echo "$1 differ:"
         echo "$difference"
-        exit 1
+        return 1
     fi
-    echo "$(echo "$3" | wc -l) $1, as declared"
+    echo "$(echo "$3" | wc -l) lines: $1 agree"
 }
 
+table=$("$here/interface.py" "$headers")
+if ! same "interface.txt (<) and the headers (>)" "$(cat "$here/interface.txt")" "$table"; then
+    echo "If programs that are compiled already can live with it:"
+    echo "    tests/package/interface.py include > tests/package/interface.txt"
+    exit 1
+fi
+# The functions are the first paragraph. C names leave the library without their parameters.
+declared=$(sed -E '/^$/Q; s/ -> .*//; /^PK::|^[a-z ]* for /!s/\(.*//' "$here/interface.txt" | sort -u)
 exported=$(nm -DC --defined-only "$library" | sed 's/^[0-9a-f]* . //' | sort -u)
-declared=$(cat "$headers"/PixelKiln/*.h | sed 's|//.*||' | tr '\n' ' ' | grep -oP 'PK_API[^;({]*\b\KPK_\w+(?=\()' | sort)
-same functions "$declared" "$(grep -v 'PK::' <<<"$exported")"
-same "names of namespace PK" "$(cat "$(dirname "$0")/cxx_exports.txt")" "$(grep 'PK::' <<<"$exported")"
+same "declared (<) and exported (>) names" "$declared" "$exported"
