@@ -38,9 +38,11 @@ def run(commands, seconds, folder=None):
                                        env=os.environ | environment, cwd=folder, preexec_fn=set_up_child)
             stack.callback(end, process)
             started.append((process, output))
-        limit = time.monotonic() + seconds
+        waited, last = 0.0, time.monotonic()
         while True:
-            late = time.monotonic() > limit
+            now = time.monotonic()
+            waited, last = waited + min(now - last, 1), now  # while all are suspended, no time goes by
+            late = waited > seconds
             for process, output in started:
                 status = process.poll()
                 if status or (late and status is None):
