@@ -146,7 +146,7 @@ void Blur(const Lines& lines, const Passes& passes, uint8_t* callerScratch) {
     const int32_t size = passes.LargestSize();
     if (size == 0) return;
     const uint64_t bytes = 2 * uint64_t{kBundleStep} * lines.length;
-    if (size <= kLargestBundleSize && bytes <= kLargestBundleScratch) {
+    if (BoxFits32Bits(size) && bytes <= kLargestBundleScratch) {
         const PK_Result result = WithRowScratch(bytes, [&](uint8_t* scratch) {
             BlurInBundles(lines, passes, scratch);
             return PK_Success;

@@ -22,7 +22,7 @@ inline constexpr int32_t kBundleStep = 4 * kBundleLines;
 
 /// Whether 32 bits with a sign hold what a bundle forms of white pixels: 256 times the sum of a window, on the way to
 /// 255 times, and the numerator with edge pixels of weight 255.
-consteval bool BoxFits32Bits(int64_t size) {
+constexpr bool BoxFits32Bits(int64_t size) {
     const int64_t sum = 255 * (2 * size - 1);
     return 256 * sum <= INT32_MAX && 255 * (sum + 2 * 255) + 128 <= INT32_MAX;
 }
@@ -33,7 +33,7 @@ static_assert(BoxFits32Bits(kLargestBundleSize) && !BoxFits32Bits(kLargestBundle
 struct BoxBlurKernels {
     using Run = void (*)(const BoxPass& pass, const uint8_t* source, uint8_t* destination);
 
-    Run bundle; ///< for sizes up to kLargestBundleSize
+    Run bundle; ///< for sizes that fit 32 bits: up to kLargestBundleSize
     Run line;   ///< a single line, for any size
 
     static constexpr const char* kFamily = "BoxBlur";

@@ -27,23 +27,25 @@ TraceLevels& Levels() {
     return levels;
 }
 
+struct DatabaseOfEnvironment : DebugDatabase {
+    // A piece without "=" is no setting.
+    DatabaseOfEnvironment() {
+        const char* list = secure_getenv("PIXELKILN_SETTINGS");
+        std::string_view rest = list != nullptr ? list : "";
+        while (!rest.empty()) {
+            const std::string_view piece = rest.substr(0, rest.find(','));
+            rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
+            const size_t equals = piece.find('=');
+            if (equals == std::string_view::npos) continue;
+            SetEntry(std::string(piece.substr(0, equals)), std::string(piece.substr(equals + 1)));
+        }
+    }
+};
+
 } // namespace
 
-// A piece without "=" is no setting.
-DebugDatabase::DebugDatabase() {
-    const char* list = secure_getenv("PIXELKILN_SETTINGS");
-    std::string_view rest = list != nullptr ? list : "";
-    while (!rest.empty()) {
-        const std::string_view piece = rest.substr(0, rest.find(','));
-        rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
-        const size_t equals = piece.find('=');
-        if (equals != std::string_view::npos)
-            fEntries.emplace(piece.substr(0, equals), piece.substr(equals + 1));
-    }
-}
-
 DebugDatabase& DebugDatabase::Instance() {
-    static DebugDatabase database;
+    static DatabaseOfEnvironment database;
     return database;
 }
 

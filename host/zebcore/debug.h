@@ -28,8 +28,6 @@ public:
     void RemoveEntry(const std::string& name);
 
 private:
-    DebugDatabase();
-
     mutable std::mutex fMutex;
     std::map<std::string, std::string> fEntries;
 };

@@ -37,6 +37,9 @@ enum PK_BoxBlurFlags : int32_t {
 /// The quotients are exact on every processor and in every floating-point mode; the exception flags of MXCSR are
 /// left as the arithmetic on radii sets them.
 ///
+/// Lines whose length is above 2048 pixels go side by side through memory that is taken for the length of the call. Where
+/// it cannot be had they go one by one through the scratch, which is slower and gives the same.
+///
 /// Does nothing, and looks at no memory, if \p passCount is below 1, a pointer is null, or \p width or \p height
 /// is below 4. Runs on the calling thread; may be called from any number of threads at the same time with different
 /// radii, scratch and images. No alignment is asked for.

@@ -19,7 +19,8 @@ extern "C" {
 /// tests, the setting "PK.highestTarget" (plain, sse2, ssse3, sse41, avx, avx2, avx2fma or avx512) lets
 /// everything above it count as missing in the processor, for colour spaces that have not converted yet too.
 /// Every call wants a matching PK_Terminate.
-/// \return always PK_Success.
+/// \return always PK_Success: threads that cannot be had are done without, and a setting that there is no memory
+///         to read counts as absent.
 PK_API PK_Result PK_Initialize(void) noexcept;
 
 /// Takes back one PK_Initialize; the last one stops the library and lets the pool of threads go.

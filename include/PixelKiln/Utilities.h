@@ -54,8 +54,8 @@ PK_API PK_Result PK_InvertAlpha(const void* source, int32_t sourceRowBytes, void
 /// \param destination          first row of the destination; the source itself, or an image that does not
 ///                             overlap with it.
 /// \param destinationRowBytes  bytes from one row to the next.
-/// \param format               the format of both: four channels of 8u, 15u or 32f; of 8u only where alpha
-///                             comes first (ARGB order).
+/// \param format               the format of both: four channels of 8u, 15u or 32f; where alpha comes first
+///                             (ARGB order), of 8u only.
 /// \param width                pixels in a row, at most 134217727.
 /// \param height               rows.
 /// \param alpha                1 is full.

@@ -191,14 +191,21 @@ TEST(ConvertArguments, ImpossibleWidthsAndNullPointersAreRefused) {
         EXPECT_EQ(Refuse({.destinationFormat = destination, .sourceIsNull = true}), PK_ErrFailed);
         EXPECT_EQ(Refuse({.destinationFormat = destination, .destinationIsNull = true}), PK_ErrFailed);
     }
-    for (const PK_PixelFormat stream : {PK_PixelFormat_NTSCDV25, PK_PixelFormat_YUV_420_MPEG2_FRAME}) {
+    for (const PK_PixelFormat stream : {PK_PixelFormat_NTSCDV25, PK_PixelFormat_PALDV50,
+                                        PK_PixelFormat_NTSC_DV100_720p, PK_PixelFormat_YUV_420_MPEG2_FRAME}) {
         EXPECT_EQ(Refuse({.sourceFormat = stream, .destinationFormat = stream, .sourceIsNull = true}),
                   PK_ErrFailed);
+        for (const PK_PixelFormat destination : {kBGRA, PK_PixelFormat_PAL_DV100_1080i, kUnknownStream})
+            for (const int32_t width : {-1, -720, INT32_MIN})
+                EXPECT_EQ(Refuse({.sourceFormat = stream, .destinationFormat = destination, .width = width}),
+                          PK_ErrFailed)
+                    << PK_PixelFormatName(stream) << " of width " << width;
         EXPECT_EQ(Refuse({.sourceFormat = stream, .destinationIsNull = true}), PK_ErrFailed);
         EXPECT_EQ(Refuse({.destinationFormat = stream, .sourceIsNull = true}), PK_ErrFailed);
         EXPECT_EQ(Refuse({.destinationFormat = stream, .width = -1}), PK_ErrFailed);
         EXPECT_EQ(Refuse({.destinationFormat = stream, .height = -1}), PK_ErrFailed);
     }
+    EXPECT_EQ(Refuse({.sourceFormat = kUnknownStream, .width = -1}), PK_ErrFailed);
     EXPECT_EQ(Refuse({.sourceFormat = PK_PixelFormat_YUV_420_MPEG2_FRAME,
                       .destinationFormat = PK_PixelFormat_YUV_420_MPEG2_FRAME,
                       .width = -1}),

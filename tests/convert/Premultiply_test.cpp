@@ -1,6 +1,9 @@
 // Premultiplication by alpha and its inverse, by hand.
 
+#include "support/FloatEnvironment.h"
 #include "support/KernelRows.h"
+
+#include <bit>
 
 namespace {
 
@@ -63,18 +66,84 @@ TEST(Unpremultiply, FloatsTakeTheReciprocalEstimateUnlessAlphaIsAsGoodAsZero) {
               kBound);
 }
 
-TEST(Premultiply, EveryCodeUnderEveryAlpha) {
+// 8e-6 is 0x370637bd. The estimate of a reciprocal is far from 0, whatever its last bits are.
+TEST(Unpremultiply, FloatAlphaCountsAsZeroBelowTheThresholdToTheBit) {
+    const float least = std::bit_cast<float>(0x370637bdu);
+    for (const uint32_t bits : {0x370637bbu, 0x370637bcu, 0x370637bdu, 0x370637beu, 0x370637bfu}) {
+        const auto alpha = std::bit_cast<float>(bits);
+        const bool counts = alpha >= least;
+        for (size_t place = 0; place < 4; ++place) { // whatever its neighbours are
+            Floats last(16, 1), first(16, 1);
+            last[4 * place + 3] = first[4 * place] = alpha;
+            for (const PK::Target target : TargetsWithBody(UnpremultiplyRow_BGRA_32f)) {
+                Floats result(16);
+                PK::Body(UnpremultiplyRow_BGRA_32f, target)(last.data(), result.data(), 4);
+                EXPECT_EQ(result[4 * place + 3], counts ? alpha : 0) << PK::TargetName(target) << alpha;
+                EXPECT_EQ(result[4 * place] > 1e5f, counts) << PK::TargetName(target) << alpha;
+                PK::Body(UnpremultiplyRow_ARGB_32f, target)(first.data(), result.data(), 4);
+                EXPECT_EQ(result[4 * place], counts ? alpha : 0) << PK::TargetName(target) << alpha;
+                EXPECT_EQ(result[4 * place + 3] > 1e5f, counts) << PK::TargetName(target) << alpha;
+            }
+        }
+    }
+}
+
+/// Every code under every alpha, which comes last.
+Bytes EveryCodeUnderEveryAlpha() {
     Bytes row;
     for (unsigned alpha = 0; alpha < 256; ++alpha)
         for (unsigned code = 0; code < 256; ++code)
             row.insert(row.end(), {static_cast<uint8_t>(code), static_cast<uint8_t>(255 - code),
                                    static_cast<uint8_t>(code + 85), static_cast<uint8_t>(alpha)});
-    const Bytes alphaFirst(row.rbegin(), row.rend());
-    for (const PK::Kernel kernel : {PremultiplyRow_BGRA_8u, PremultiplyRow_VUYA_8u, UnpremultiplyRow_BGRA_8u,
-                                    UnpremultiplyRow_VUYA_8u, BGRA8uToBGRP32fRow, VUYA8uToVUYP32fRow})
+    return row;
+}
+
+constexpr uint32_t kRoundingModes[] = {0, kRoundDown, kRoundUp, kRoundToZero};
+
+TEST(Premultiply, EveryCodeUnderEveryAlpha) {
+    const Bytes row = EveryCodeUnderEveryAlpha(), alphaFirst(row.rbegin(), row.rend());
+    for (const PK::Kernel kernel : {PremultiplyRow_BGRA_8u, PremultiplyRow_VUYA_8u})
         ExpectReference(kernel, row);
-    for (const PK::Kernel kernel : {PremultiplyRow_ARGB_8u, UnpremultiplyRow_ARGB_8u})
-        ExpectReference(kernel, alphaFirst);
+    ExpectReference(PremultiplyRow_ARGB_8u, alphaFirst);
+    for (const uint32_t mode : kRoundingModes) {
+        SCOPED_TRACE(testing::Message() << "MXCSR bits " << mode);
+        const FloatEnvironment environment(mode);
+        for (const PK::Kernel kernel :
+             {UnpremultiplyRow_BGRA_8u, UnpremultiplyRow_VUYA_8u, BGRA8uToBGRP32fRow, VUYA8uToVUYP32fRow})
+            ExpectReference(kernel, row);
+        ExpectReference(UnpremultiplyRow_ARGB_8u, alphaFirst);
+    }
+}
+
+TEST(Premultiply, BytesRoundToTheNearestInEveryRoundingMode) {
+    const Bytes row = EveryCodeUnderEveryAlpha();
+    for (const PK::Kernel kernel : {PremultiplyRow_BGRA_8u, PremultiplyRow_ARGB_8u, PremultiplyRow_VUYA_8u})
+        ForEachBody(kernel, [&](PK::Target, PK::RowKernel body) {
+            Bytes expected(row.size()), actual(row.size());
+            body(row.data(), expected.data(), 65536);
+            for (const uint32_t mode : kRoundingModes) {
+                const FloatEnvironment environment(mode);
+                body(row.data(), actual.data(), 65536);
+                ASSERT_EQ(actual, expected) << "MXCSR bits " << mode;
+            }
+        });
+}
+
+// 32768 / a is a quotient that is rounded, and so is its product: every alpha, and colours at the ends and about them.
+TEST(Unpremultiply, WordsUnderEveryAlphaInEveryRoundingMode) {
+    Words row;
+    for (unsigned alpha = 0; alpha < 65536; ++alpha)
+        row.insert(row.end(), {static_cast<uint16_t>(alpha - 1), static_cast<uint16_t>(alpha / 2),
+                               static_cast<uint16_t>(alpha * 40503u >> 3), static_cast<uint16_t>(alpha)});
+    const Words alphaFirst(row.rbegin(), row.rend());
+    for (const uint32_t mode : kRoundingModes) {
+        SCOPED_TRACE(testing::Message() << "MXCSR bits " << mode);
+        const FloatEnvironment environment(mode);
+        for (const PK::Kernel kernel : {PremultiplyRow_BGRA_15u, UnpremultiplyRow_BGRA_15u})
+            ExpectReference(kernel, row);
+        for (const PK::Kernel kernel : {PremultiplyRow_ARGB_15u, UnpremultiplyRow_ARGB_15u})
+            ExpectReference(kernel, alphaFirst);
+    }
 }
 
 } // namespace

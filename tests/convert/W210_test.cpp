@@ -203,6 +203,18 @@ TEST(W210, FieldTwoOfTwoRowsIsTheSecondRow) {
     EXPECT_TRUE(std::equal(expected, expected + 4, pixel));
 }
 
+TEST(W210, EveryFieldButTheSecondBeginsAtTheFirstRow) {
+    const uint16_t y[4] = {401, 406, 1000, 1000}, u[2] = {404, 9}, v[2] = {1023, 9};
+    const void* const planes[3] = {y, u, v};
+    const int32_t rowBytes[3] = {4, 2, 2};
+    const uint8_t first[4] = {255, 101, 100, 255};
+    for (const int32_t field : {INT32_MIN, -2, -1, 0, 1, 3, 4, 6, 0x10002, INT32_MAX}) {
+        uint8_t pixel[4] = {};
+        ASSERT_EQ(PK_ConvertW210toQuarterResVUYX_8u(planes, rowBytes, 2, 2, pixel, 4, field), PK_Success);
+        EXPECT_TRUE(std::equal(first, first + 4, pixel)) << field;
+    }
+}
+
 TEST(W210, SucceedsWithoutWorkAndRefusesWhatItCannotKnow) {
     uint16_t words[64] = {};
     const void* const planes[3] = {words, words, words};

@@ -3,6 +3,7 @@
 #include <PixelKiln/BoxBlur.h>
 #include <PixelKiln/Lifecycle.h>
 
+#include "filters/BoxBlurKernels.h"
 #include "reference/ReferenceBoxBlur.h"
 #include "support/FloatEnvironment.h"
 #include "support/GuardedRows.h"
@@ -297,16 +298,17 @@ TEST(BoxBlur, WideWindows) {
 }
 
 // The radius is limited by the shorter side, so that sums beyond 32 bits need two long sides: here all rows are the
-// same memory, and a flat row stays flat however often it is filtered.
-TEST(BoxBlur, ARadiusWhoseSumsNeedMoreThan32Bits) {
-    const int32_t side = 16470;
-    std::vector<Pixel> row(side, {255, 128, 3, 200}), scratch(static_cast<size_t>(side) * 3);
-    const std::vector<Pixel> before = row;
+// same memory, and a flat row stays flat however often it is filtered. Bundles, which sum in 32 bits, would leave the
+// caller's scratch alone.
+TEST(BoxBlur, ARadiusWhoseSumsNeedMoreThan32BitsGoesByOneLineAtATime) {
+    const int32_t side = PK::kLargestBundleSize + 3;
+    std::vector<Pixel> row(side, {255, 128, 3, 200}), scratch(static_cast<size_t>(side) * 3, {1, 1, 1, 1});
+    const std::vector<Pixel> before = row, unused = scratch;
     double radius = 1e9;
-    const int32_t rows = 16460; // limits the radius to 16457
-    PK_BoxBlur(1, &radius, 1 | kRenormalise, scratch.data(), row.data(), 0, side, rows);
-    EXPECT_EQ(radius, 16457.0);
+    PK_BoxBlur(1, &radius, 1 | kRenormalise, scratch.data(), row.data(), 0, side, side);
+    EXPECT_EQ(radius, PK::kLargestBundleSize); // of size one more
     EXPECT_EQ(row, before);
+    EXPECT_NE(scratch, unused);
 }
 
 // Longer than what is worth bundling: 64 MiB of scratch end at 524,288 pixels.

@@ -7,6 +7,7 @@
 #include <PixelKiln/Buffers.h>
 
 #include <algorithm>
+#include <cstring>
 #include <gtest/gtest.h>
 
 using namespace PKTest;
@@ -56,6 +57,28 @@ TEST(CopyMemory, CopiesEverySmallSize) {
         CheckCopy(size, 0, 0, Guard::kAfter, random);
         CheckCopy(size, 1, 2, Guard::kBefore, random);
     }
+}
+
+// What lies where to a vector of 16 bytes is all that decides about the way; the last bytes are fewer than a step.
+TEST(CopyMemory, CopiesLargeBlocksFromEveryPlaceToEveryPlace) {
+    Random random(3);
+    constexpr size_t kLargest = (size_t{4} << 20) + 63;
+    const GuardedRows source(kLargest + 16, Guard::kAfter), destination(kLargest + 64, Guard::kAfter);
+    const std::vector<uint8_t> period = random.Bytes(65521); // a prime, so that no two pages are the same
+    for (size_t i = 0; i < source.Size(); ++i) source.Bytes()[i] = period[i % period.size()];
+    for (size_t from = 0; from < 16; ++from)
+        for (size_t to = 0; to < 16; ++to) {
+            const size_t size = (size_t{3} << 20) + 1 + random.Below(1u << 20);
+            SCOPED_TRACE(testing::Message()
+                         << "size " << size << " from " << from << " to " << to << " seed " << random.Seed());
+            uint8_t* const first = destination.Bytes() + 16 + to;
+            std::fill_n(destination.Bytes(), destination.Size(), uint8_t{0xa5});
+            ASSERT_EQ(PK_CopyMemory(first, source.Bytes() + from, size), PK_Success);
+            ASSERT_EQ(std::memcmp(first, source.Bytes() + from, size), 0);
+            const auto isUntouched = [](uint8_t byte) { return byte == 0xa5; };
+            ASSERT_TRUE(std::all_of(destination.Bytes(), first, isUntouched));
+            ASSERT_TRUE(std::all_of(first + size, first + size + 16, isUntouched));
+        }
 }
 
 TEST(CopyMemory, OfNothingSucceedsWithoutAddresses) {

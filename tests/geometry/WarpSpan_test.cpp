@@ -164,17 +164,20 @@ TEST(WarpSpan, DrawsFarDownAsTheRestatement) {
     }
 }
 
-/// Every alpha over every alpha, as one row of pixels.
+/// Every alpha over every alpha, as one row of pixels. The quotients are those of integers in every rounding mode.
 TEST(WarpSpan, EveryBodyMixesAsTheRestatement) {
     constexpr int32_t kWidth = 65536;
     std::vector<uint8_t> source(4 * kWidth), before(4 * kWidth);
     Random random(54);
     for (const PK_PixelFormat format : {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_VUYA_4444_8u}) {
-        for (int32_t round = 0; round < 12; ++round) {
+        for (int32_t round = 0; round < 24; ++round) {
+            constexpr uint32_t kModes[] = {0, kRoundDown, kRoundUp, kRoundToZero};
+            const bool isFlat = round < 16; // black and white, where quotients are at their ends
+            const FloatEnvironment rounding(kModes[isFlat ? round / 4 : round % 4]);
             random.Fill(source.data(), source.size());
             random.Fill(before.data(), before.size());
             for (size_t i = 0; i < kWidth; ++i) {
-                if (round < 4) { // black and white, where quotients are at their ends
+                if (isFlat) {
                     std::fill_n(&source[4 * i], 3, static_cast<uint8_t>(round & 1 ? 255 : 0));
                     std::fill_n(&before[4 * i], 3, static_cast<uint8_t>(round & 2 ? 255 : 0));
                 }

@@ -100,6 +100,27 @@ TEST(FillPixels, FillsLongRunsByEitherStringInstruction) {
     });
 }
 
+// Such pixels could be taken for ones of 8 bytes: two float samples of a colour are often the same.
+TEST(FillPixels, FillsLargeImagesWithPixelsWhoseHalvesDifferInOneByte) {
+    Random random(14);
+    for (size_t place = 8; place < 16; ++place) {
+        std::vector<uint8_t> pixel = random.Bytes(16);
+        std::copy_n(pixel.begin(), 8, pixel.begin() + 8);
+        pixel[place] ^= 0x10;
+        for (const size_t margin : {0, 4, 9}) CheckFill(pixel, {65536, 1, 0, false}, Guard::kAfter, margin);
+        CheckFill(pixel, {300, 250, 20, true}, Guard::kBefore, 0);
+    }
+}
+
+// Rows that begin at another place of a cache line are filled from the pixel turned round, which may differ from the
+// one before in its last bytes alone.
+TEST(FillPixels, FillsLargeImagesWithPixelsThatAreTheSameWhenTurnedButForOneByte) {
+    std::vector<uint8_t> pixel(16, 7);
+    pixel.back() = 9;
+    for (const ptrdiff_t padding : {1, 2, 4, 8, 15})
+        CheckFill(pixel, {300, 250, padding, false}, Guard::kAfter, 0);
+}
+
 TEST(FillPixels, FillsTheRowsOfLargeImagesBetweenTheirGaps) {
     Random random(13);
     constexpr int32_t kRows = 300; // of 4 KiB make an image of more than 1 MiB

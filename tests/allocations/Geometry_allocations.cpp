@@ -1,0 +1,80 @@
+// Images that are turned, warped, blurred and stamped.
+
+#include "allocations/Call.h"
+
+#include <PixelKiln/PixelKiln.h>
+
+#include <array>
+
+namespace {
+
+using namespace PKAllocations;
+
+constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u;
+constexpr Memory kBlocks = TakesNone("turns blocks in registers");
+constexpr Memory kBundles = TakesOrDoesWithout("lines side by side");
+
+void AddTurns(Calls& calls) {
+    const Image source(kBGRA);
+    const std::vector<uint8_t> turned(source.bytes.size());
+    constexpr int32_t kTurnedRowBytes = 4 * kHeight;
+    calls.push_back({{"PK_Transpose"}, kBlocks, turned, [source](uint8_t* block) {
+                         return PK_Transpose(source.bytes.data(), source.rowBytes, block, kTurnedRowBytes,
+                                             kWidth, kHeight, 4);
+                     }});
+    for (const int32_t degrees : {90, 180, 270})
+        calls.push_back({{"PK_RotateImage"}, kBlocks, turned, [=](uint8_t* block) {
+                             const int32_t rowBytes = degrees == 180 ? source.rowBytes : kTurnedRowBytes;
+                             return PK_RotateImage(source.bytes.data(), source.rowBytes, block, rowBytes,
+                                                   kWidth, kHeight, kBGRA, degrees);
+                         }});
+}
+
+void AddWarps(Calls& calls) {
+    constexpr int32_t kSide = 300;
+    for (const int32_t quality : {2, 3})
+        for (const float feather : {0.0f, 7.5f})
+            calls.push_back({{"PK_WarpAffineQuad"},
+                             TakesNone("has its polygons on the stack"),
+                             Content(4 * kSide * kSide),
+                             [=, source = Content(4 * kSide * kSide)](uint8_t* block) {
+                                 constexpr PK_Rect kRect = {0, 0, kSide, kSide};
+                                 constexpr double kFrom[8] = {0, 0, kSide, 0, kSide, kSide, 0, kSide};
+                                 constexpr double kTo[8] = {20, 9, 291, 33.5, 260, 288, 5, 240};
+                                 return PK_WarpAffineQuad(nullptr, nullptr, source.data(), 4 * kSide, &kRect,
+                                                          kFrom, block, 4 * kSide, &kRect, kTo, quality, 200,
+                                                          true, false, kBGRA, 0, true, false, feather);
+                             }});
+}
+
+void AddBlurs(Calls& calls) {
+    constexpr int32_t kLong = 4001, kShort = 37;
+    for (const bool areColumns : {false, true}) {
+        const int32_t width = areColumns ? kShort : kLong, height = areColumns ? kLong : kShort;
+        calls.push_back({{"PK_BoxBlur"},
+                         kBundles,
+                         Content(4 * kLong * kShort),
+                         [=, room = std::vector<uint8_t>(4 * (2 * kLong + kShort))](uint8_t* block) mutable {
+                             std::array<double, 3> radii = {3.1, 12, 1.7};
+                             const int32_t flags =
+                                 7 | PK_BoxBlur_Renormalise | (areColumns ? int32_t{PK_BoxBlur_Columns} : 0);
+                             PK_BoxBlur(3, radii.data(), flags, room.data(), block, 4 * width, width, height);
+                             return PK_Success;
+                         }});
+    }
+}
+
+void AddStamps(Calls& calls) {
+    constexpr int32_t kStampWidth = 900, kStampHeight = 300;
+    calls.push_back({{"PK_PrintNum"},
+                     TakesNone("draws digits of seven strokes"),
+                     Content(4 * kStampWidth * kStampHeight),
+                     [](uint8_t* block) {
+                         return PK_PrintNum(block, 4 * kStampWidth, kBGRA, kStampWidth, kStampHeight,
+                                            -1234567890, 0.08f, {0, 0}, true);
+                     }});
+}
+
+const Family sTurns(AddTurns), sWarps(AddWarps), sBlurs(AddBlurs), sStamps(AddStamps);
+
+} // namespace
