@@ -22,9 +22,9 @@ set(PIXELKILN_KERNEL_FLAGS_sse41 ${baseline} -msse4.1)
 set(PIXELKILN_KERNEL_FLAGS_avx ${baseline} -mavx)
 set(PIXELKILN_KERNEL_FLAGS_avx2 ${baseline} -mavx2)
 set(PIXELKILN_KERNEL_FLAGS_avx2fma ${baseline} -mavx2 -mfma)
-# The C library copies what tails need: groups of this size the compiler would copy by string instructions, which
-# start slowly.
-set(PIXELKILN_KERNEL_FLAGS_avx512 ${baseline} -mavx512f -mavx512bw -mavx512vl -mavx512dq -mstringop-strategy=libcall)
+# The C library copies what tails need: groups of this size g++ would copy by string instructions, which start slowly.
+set(PIXELKILN_KERNEL_FLAGS_avx512 ${baseline} -mavx512f -mavx512bw -mavx512vl -mavx512dq
+                                  $<$<CXX_COMPILER_ID:GNU>:-mstringop-strategy=libcall>)
 set(PIXELKILN_KERNEL_HEADER_plain plain)
 set(PIXELKILN_KERNEL_HEADER_sse2 vector128)
 set(PIXELKILN_KERNEL_HEADER_ssse3 vector128)

@@ -1,11 +1,11 @@
 #include "ColourSpaces.h"
 
 #include "Failure.h"
+#include "Numbers.h"
 #include "Terminal.h"
 
 #include <algorithm>
 #include <cctype>
-#include <charconv>
 #include <cmath>
 #include <functional>
 
@@ -74,10 +74,9 @@ std::string LowerCase(std::string text) {
 }
 
 float ParseGamma(const std::string& name, const std::string& text) {
-    float gamma = 0;
-    const char* end = text.data() + text.size();
-    const auto [stop, error] = std::from_chars(text.data(), end, gamma);
-    if (error == std::errc() && stop == end && std::isfinite(gamma) && gamma > 0) return gamma;
+    const char* next = text.c_str();
+    const auto gamma = static_cast<float>(ParseNumber(next));
+    if (*next == '\0' && std::isfinite(gamma) && gamma > 0) return gamma;
     throw Failure(kExitUsage,
                   "'" + name + "' needs an exponent above 0 from linear to encoded, such as gamma:0.45");
 }

@@ -1,8 +1,10 @@
 #pragma once
 
 // What colour spaces calculate at first need and then keep, in const operations that many threads may run on one
-// object. Every thread calculates the same values; they are written once, under one lock, and published by the
-// flag or number that readers look at first.
+// object. Every thread calculates the same values; they are written once, under the lock of first uses, and published by
+// the flag or number that readers look at first. Copying an object takes the lock, too.
+
+#include "primitives/FirstUse.h"
 
 #include <PixelKiln/ColorSpace.h>
 
@@ -12,16 +14,13 @@
 
 namespace PK {
 
-/// Held while a cache is written, and while an object is copied.
-std::mutex& CacheMutex();
-
 /// The matrix, calculated if it is not valid yet.
 template <class Calculate>
 const CSMatrix& CachedMatrix(CSMatrix& matrix, bool& isValid, Calculate calculate) {
     const std::atomic_ref<bool> published(isValid);
     if (!published.load(std::memory_order_acquire)) {
         const CSMatrix value = calculate();
-        const std::scoped_lock lock(CacheMutex());
+        const std::scoped_lock lock(FirstUseMutex());
         if (!published.load(std::memory_order_relaxed)) {
             matrix = value;
             published.store(true, std::memory_order_release);
@@ -37,7 +36,7 @@ const float* CachedCoeffs(float* coeffs, Calculate calculate) {
     if (published.load(std::memory_order_acquire) == 0.0f) {
         float values[3];
         calculate(values);
-        const std::scoped_lock lock(CacheMutex());
+        const std::scoped_lock lock(FirstUseMutex());
         if (std::memcmp(values, coeffs, sizeof values) != 0) {
             coeffs[1] = values[1];
             coeffs[2] = values[2];

@@ -44,11 +44,6 @@ bool AreClose(const float* a, const float* b, int count) {
 
 } // namespace
 
-std::mutex& CacheMutex() {
-    static std::mutex mutex;
-    return mutex;
-}
-
 ColorSpace::ColorSpace() = default;
 
 ColorSpace::ColorSpace(const ColorSpace& other) {
@@ -58,7 +53,7 @@ ColorSpace::ColorSpace(const ColorSpace& other) {
 ColorSpace::ColorSpace(ColorSpace&& other) : ColorSpace(other) {}
 
 ColorSpace& ColorSpace::operator=(const ColorSpace& other) {
-    const std::scoped_lock lock(CacheMutex());
+    const std::scoped_lock lock(FirstUseMutex());
     rgbToXYZ = other.rgbToXYZ;
     xyzToRGB = other.xyzToRGB;
     matricesValid = other.matricesValid;
@@ -99,7 +94,7 @@ void ColorSpace::CalculateMatrices() const {
     const CSMatrix toXYZ = ScaleColumns(primaries, primaries.Inverted() * WhiteXYZ(WhitePoint()));
     const CSMatrix toRGB = toXYZ.Inverted();
 
-    const std::scoped_lock lock(CacheMutex());
+    const std::scoped_lock lock(FirstUseMutex());
     // A reader that has its reference may be at it: what is right already is not written again.
     if (std::memcmp(&rgbToXYZ, &toXYZ, sizeof toXYZ) != 0) rgbToXYZ = toXYZ;
     if (std::memcmp(&xyzToRGB, &toRGB, sizeof toRGB) != 0) xyzToRGB = toRGB;

@@ -26,7 +26,7 @@ DCIP3ColorSpace::DCIP3ColorSpace(DCIP3ColorSpace&& other) : DCIP3ColorSpace(othe
 
 DCIP3ColorSpace& DCIP3ColorSpace::operator=(const DCIP3ColorSpace& other) {
     GammaColorSpace::operator=(other);
-    const std::scoped_lock lock(CacheMutex());
+    const std::scoped_lock lock(FirstUseMutex());
     illuminant = other.illuminant;
     std::ranges::copy(other.lumCoeffs, lumCoeffs);
     fromRec709 = other.fromRec709;

@@ -1,6 +1,7 @@
 #include "colour/DecodeTables.h"
 
 #include "colour/HDRCurves.h"
+#include "primitives/FirstUse.h"
 #include "primitives/VectorMath.h"
 
 #include <algorithm>
@@ -59,13 +60,13 @@ Table<kHLGDecodeEntries> MakeHLGTable() {
 } // namespace
 
 const float* PQDecodeTable() {
-    static const auto table = MakePQTable();
-    return table.entries;
+    static constinit FirstUse<Table<kPQDecodeEntries>> sTable;
+    return sTable.Get(MakePQTable).entries;
 }
 
 const float* HLGDecodeTable() {
-    static const auto table = MakeHLGTable();
-    return table.entries;
+    static constinit FirstUse<Table<kHLGDecodeEntries>> sTable;
+    return sTable.Get(MakeHLGTable).entries;
 }
 
 } // namespace PK

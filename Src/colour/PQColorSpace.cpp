@@ -41,7 +41,7 @@ PQColorSpace::PQColorSpace(PQColorSpace&& other) : PQColorSpace(other) {}
 PQColorSpace& PQColorSpace::operator=(const PQColorSpace& other) {
     ColorSpace::operator=(other);
     p3 = other.p3;
-    const std::scoped_lock lock(CacheMutex());
+    const std::scoped_lock lock(FirstUseMutex());
     std::ranges::copy(other.primaries, primaries);
     std::ranges::copy(other.lumCoeffs, lumCoeffs);
     scale = other.scale;

@@ -102,7 +102,7 @@ struct ScaleBytesTo15u : SampleGroup<1, 2, 1, 2> {
 /// The plain body gives the quotient. The vector bodies give it for the pixels that start before the first
 /// 16-byte boundary of the destination, and the rounded form after it; hosts compare against both.
 void ExpandBytesTo15u(const void* source, void* destination, int32_t width) {
-    if constexpr (Target::PK_TARGET == Target::plain)
+    if constexpr (kTarget == Target::plain)
         RunRow(ScaleBytesTo15u<0>(), width, destination, source);
     else
         RunRowWithHead<16>(ScaleBytesTo15u<0>(), ScaleBytesTo15u<1>(), width, destination, source);

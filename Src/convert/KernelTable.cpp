@@ -9,7 +9,6 @@
 
 #include <cstddef>
 #include <iterator>
-#include <ranges>
 
 namespace PK {
 namespace {
@@ -257,8 +256,8 @@ RowKernel Body(Kernel kernel, Target target) noexcept {
 
 bool ChooseTarget(Kernel kernel, Target& target) noexcept {
     if (kernel == Kernel::None) return false;
-    for (const Target candidate : TargetsOf(Offer::flags) | std::views::reverse) {
-        target = candidate;
+    for (std::size_t i = std::size(kFlagTargets); i > 0; --i) {
+        target = kFlagTargets[i - 1];
         if (IsEnabled(target) && Body(kernel, target)) return true;
     }
     return false;

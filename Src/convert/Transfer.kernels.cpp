@@ -9,8 +9,10 @@
 namespace PK::PK_TARGET {
 namespace {
 
+constexpr double kToLinear = 2.4, kToGamma = 0.41666666;
+
 /// sign(c) |c|^exponent on the colour of BGRA pixels.
-template <double kExponent>
+template <const double& kExponent>
 struct PowerColour : PixelGroup<16, 16> {
     static void Group(const uint8_t* source, uint8_t* destination) {
         F32 colour[3], alpha;
@@ -19,8 +21,8 @@ struct PowerColour : PixelGroup<16, 16> {
         StoreFloatChannels(destination, colour[0], colour[1], colour[2], alpha);
     }
 };
-using GammaToLinear = PowerColour<2.4>;
-using LinearToGamma = PowerColour<0.41666666>;
+using GammaToLinear = PowerColour<kToLinear>;
+using LinearToGamma = PowerColour<kToGamma>;
 
 /// Four table look-ups a pixel, which no vector instruction speeds up: a gather is slower than single loads.
 struct Gamma8uToLinearFloat32 : Groups<1, Each<16>, Each<4>> {

@@ -44,7 +44,7 @@ struct Halve : SampleGroup<2, 2, 1, 2> {
 };
 
 constexpr RowKernel XRGBRow() {
-    if constexpr (Target::PK_TARGET >= Target::sse41) return Row<RoundRGBToXRGB>;
+    if constexpr (kTarget >= Target::sse41) return Row<RoundRGBToXRGB>;
     return Row<TruncateRGBToXRGB>;
 }
 

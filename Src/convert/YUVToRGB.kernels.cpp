@@ -51,7 +51,7 @@ struct YUVToRGBFloat : PixelGroup<16, 16> {
 
 /// The direct kernels exist from SSE2 up: without it the router takes the way over VUYX8uToRGB8uRow.
 constexpr RowKernel FromSSE2(RowKernel body) {
-    return Target::PK_TARGET == Target::plain ? nullptr : body;
+    return kTarget == Target::plain ? nullptr : body;
 }
 
 } // namespace

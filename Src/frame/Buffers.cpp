@@ -2,6 +2,7 @@
 
 #include "frame/PixelFormat.h"
 #include "frame/RowScratch.h"
+#include "frame/SharedRandom.h"
 #include "frame/Wrap32.h"
 
 #include <PixelKiln/Buffers.h>
@@ -31,7 +32,7 @@ struct Block {
 // the same address modulo 8192. All null if there is no memory.
 Block AllocateStaggered(uint64_t bytes) {
     if (bytes > std::numeric_limits<uint64_t>::max() - kMaximalOverhead) return {};
-    const uint64_t offset = static_cast<uint64_t>(std::rand() % kStaggerSteps) * kStaggerBytes;
+    const uint64_t offset = static_cast<uint64_t>(SharedRandom() % kStaggerSteps) * kStaggerBytes;
     const uint64_t overhead = offset + kBlockAlignment - 1;
     Block block;
     block.base = MemoryRecycler::Allocate(bytes + overhead, &block.allocatedSize);

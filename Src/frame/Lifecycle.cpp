@@ -8,6 +8,7 @@
 #include <PixelKiln/Lifecycle.h>
 
 #include <mutex>
+#include <pthread.h>
 
 namespace PK {
 namespace {
@@ -17,6 +18,14 @@ constinit std::mutex sMutex;
 
 // Calls of PK_Initialize not yet matched by PK_Terminate; below 0 after a stop too many. Guarded by sMutex.
 int32_t sNestingCount = 0;
+
+// Nobody is in the middle of a start or stop while the process forks. This lock is held while others are taken, those of
+// the host among them, and so must be taken before them: what is registered last comes first. They are registered by
+// constructors of an early priority, this by one that has none.
+[[gnu::constructor]] void FollowForks() {
+    constexpr auto goOn = [] { sMutex.unlock(); };
+    pthread_atfork([] { sMutex.lock(); }, goOn, goOn);
+}
 
 } // namespace
 } // namespace PK

@@ -127,7 +127,7 @@ inline void PackFourColumns(const F32* columns, F32& firstTwo, F32& lastTwo) {
 
 /// Rounds eight columns by the current rounding mode and stores them as lines: first those on place 0 of each
 /// block of lanes, then those on place 1 and so on.
-inline void StoreLines(const F32 (&columns)[kSide], int16_t* lines) {
+[[maybe_unused]] inline void StoreLines(const F32 (&columns)[kSide], int16_t* lines) {
     constexpr int kValues = 2 * kLanes; // of a vector
     F32 left[2], right[2];
     PackFourColumns(columns, left[0], left[1]);
@@ -140,7 +140,7 @@ inline void StoreLines(const F32 (&columns)[kSide], int16_t* lines) {
 
 /// For eight lanes. Turns vectors that hold a line each into vectors that hold a column each, with the lines in
 /// the order 0, 2, 4, 6, 1, 3, 5, 7, in which StoreLines stores them one after the other.
-inline void TransposeBlock(F32 (&x)[kSide]) {
+[[maybe_unused]] inline void TransposeBlock(F32 (&x)[kSide]) {
     TransposePixels(x[0], x[2], x[4], x[6]);
     TransposePixels(x[1], x[3], x[5], x[7]);
     F32 columns[kSide];

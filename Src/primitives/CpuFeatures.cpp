@@ -1,5 +1,7 @@
 #include "primitives/CpuFeatures.h"
 
+#include "primitives/FirstUse.h"
+
 #include <cpuid.h>
 
 namespace PK {
@@ -67,11 +69,11 @@ CpuFlags FlagsOf(const CpuidReport& report) {
 }
 
 const CpuFeatures& CpuFeatures::Instance() {
-    static const CpuFeatures features = [] {
+    static constinit FirstUse<CpuFeatures> sFeatures;
+    return sFeatures.Get([] {
         const CpuFlags flags = FlagsOf(ReadProcessor());
         return CpuFeatures{{flags, flags, flags}};
-    }();
-    return features;
+    });
 }
 
 } // namespace PK

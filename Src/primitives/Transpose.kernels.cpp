@@ -119,7 +119,7 @@ void TransposeBlock(const TransposeArea& area, int32_t firstRow, int32_t endRow,
 template <class Tile>
 void Transpose(const TransposeArea& area) {
     // Without vectors, pixels smaller than a lane are not worth gathering in lanes.
-    constexpr bool kAreWorthTiles = Target::PK_TARGET != Target::plain || Tile::kPixelBytes >= 4;
+    constexpr bool kAreWorthTiles = kTarget != Target::plain || Tile::kPixelBytes >= 4;
     if (!kAreWorthTiles || area.rows < Tile::kRows || area.columns < Tile::kColumns)
         return TransposePixelwise<Tile::kPixelBytes>(area);
     // A source row of one cache line is read once.

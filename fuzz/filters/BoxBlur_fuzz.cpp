@@ -33,7 +33,7 @@ struct Request {
 /// One call on these pixels.
 std::vector<uint8_t> Blur(const Request& request, ImageMemory& image, const std::vector<uint8_t>& content,
                           ByteStream& stream, uint32_t state) {
-    const auto [width, height] = request.size;
+    const int32_t width = request.size.width, height = request.size.height;
     const size_t room = 4 * static_cast<size_t>(width + height + std::max(width, height));
     ImageMemory scratch({room, 1, 0}, stream);
     std::vector<double> radii = request.radii;

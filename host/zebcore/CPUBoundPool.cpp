@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <csignal>
+#include <cstdlib>
+#include <new>
 #include <xmmintrin.h>
 
 namespace zebcore::threads {
@@ -15,25 +17,26 @@ constexpr size_t kWokenAtOnce = 2;
 } // namespace
 
 CPUBoundPool::Job::Job(const Function& theFunction, int32_t theCount) noexcept
-    : function(theFunction), count(theCount), floatMode(_mm_getcsr()) {}
+    : function(theFunction), count(theCount), runner(std::this_thread::get_id()), floatMode(_mm_getcsr()) {}
 
-CPUBoundPool::CPUBoundPool(uint32_t threadCount) {
+CPUBoundPool::CPUBoundPool(uint32_t threadCount) : fWantedThreads(threadCount) {
     fThreads.reserve(threadCount);
+    StartThreads();
+}
+
+void CPUBoundPool::StartThreads() noexcept {
+    fLacksThreads = false;
     // Signals are the program's: its handlers run on its own threads. Only faults belong to who commits them.
     sigset_t blocked, previous;
     sigfillset(&blocked);
     for (const int fault : {SIGBUS, SIGFPE, SIGILL, SIGSEGV}) sigdelset(&blocked, fault);
     pthread_sigmask(SIG_SETMASK, &blocked, &previous);
-    StartThreads(threadCount);
-    pthread_sigmask(SIG_SETMASK, &previous, nullptr);
-}
-
-void CPUBoundPool::StartThreads(uint32_t count) {
     try {
-        while (fThreads.size() < count) fThreads.emplace_back([this] { Serve(); });
+        while (fThreads.size() < fWantedThreads) fThreads.emplace_back([this] { Serve(); });
     } catch (const std::exception&) {
         // The ones that there are must do.
     }
+    pthread_sigmask(SIG_SETMASK, &previous, nullptr);
 }
 
 CPUBoundPool::~CPUBoundPool() {
@@ -51,11 +54,12 @@ void CPUBoundPool::Run(const Function& function, int32_t count) {
     size_t woken;
     {
         const std::lock_guard lock(fMutex);
+        if (fLacksThreads) StartThreads();
         fJobs.push_back(job);
         woken = ClaimSleepers(job);
     }
     Wake(woken);
-    RunParts(job);
+    RunParts(job, Role::runner);
     {
         std::unique_lock lock(fMutex);
         fJobs.erase(fJobs.iterator_to(job)); // from here on nobody enters it
@@ -63,6 +67,21 @@ void CPUBoundPool::Run(const Function& function, int32_t count) {
     }
     _mm_setcsr(_mm_getcsr() | job.floatExceptions);
     if (job.failure) std::rethrow_exception(job.failure);
+}
+
+// The threads cannot be joined, nor woken from what they wait for: both are made anew in their place. The tasks of
+// other threads are lost with their stacks. Those of this thread, if it forked from within a part, go on without the
+// parts that helpers had begun.
+void CPUBoundPool::StartOverInChild() noexcept {
+    ++fForks;
+    for (std::thread& thread : fThreads) new (&thread) std::thread;
+    fThreads.clear();
+    fLacksThreads = true;
+    new (&fHasWork) std::condition_variable;
+    fSleepers = fWakes = 0;
+    fJobs.remove_if([](const Job& job) { return job.runner != std::this_thread::get_id(); });
+    for (Job& job : fJobs) job.helpersInside = 0;
+    fMutex.unlock();
 }
 
 // A thread of the pool: works while there is work, and sleeps until somebody claims it.
@@ -91,7 +110,7 @@ void CPUBoundPool::Help(Job& job, std::unique_lock<std::mutex>& lock) noexcept {
     Wake(woken);
     const uint32_t ownFloatMode = _mm_getcsr();
     _mm_setcsr(job.floatMode);
-    RunParts(job);
+    RunParts(job, Role::helper);
     const uint32_t raised = _mm_getcsr() & kFloatExceptions;
     _mm_setcsr(ownFloatMode);
     lock.lock();
@@ -115,15 +134,23 @@ void CPUBoundPool::Wake(size_t count) noexcept {
     for (; count > 0; --count) fHasWork.notify_one();
 }
 
-void CPUBoundPool::RunParts(Job& job) noexcept {
+void CPUBoundPool::RunParts(Job& job, Role role) noexcept {
+    const uint32_t forks = fForks;
     int64_t part;
     while ((part = job.nextPart.fetch_add(1, std::memory_order_relaxed)) < job.count) {
+        std::exception_ptr failure;
         try {
             job.function(static_cast<int32_t>(part));
         } catch (...) {
+            failure = std::current_exception();
+        }
+        // A helper that forked in its part and comes back from it in the child: nobody is there whom it could help, the
+        // job least of all. It was the only thread, and so the process ends with it.
+        if (role == Role::helper && fForks != forks) std::exit(EXIT_SUCCESS);
+        if (failure) {
             job.nextPart.store(job.count, std::memory_order_relaxed);
             const std::lock_guard lock(fMutex);
-            if (!job.failure) job.failure = std::current_exception();
+            if (!job.failure) job.failure = failure;
         }
     }
 }

@@ -29,6 +29,10 @@ public:
 
     uint64_t KeptBytes() const noexcept;
 
+    /// Around a fork: nobody else changes the pool in between.
+    void HoldForFork() noexcept { fMutex.lock(); }
+    void GoOnAfterFork() noexcept { fMutex.unlock(); }
+
     /// The size of the class that serves \p size; \p size itself if it is too large for any.
     static uint64_t ClassSize(uint64_t size) noexcept;
 

@@ -7,6 +7,8 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fcntl.h>
+#include <mutex>
+#include <pthread.h>
 #include <string_view>
 #include <unistd.h>
 
@@ -17,51 +19,54 @@ namespace {
 std::atomic<uint32_t> sTraceChanges{1};
 std::atomic<TraceSink> sTraceSink{nullptr};
 
-struct TraceLevels {
-    std::mutex mutex;
-    std::map<std::string, int32_t, std::less<>> highest;
-};
+// Guards what follows. Both tables are made as the library is loaded, ahead of those who fill them: a
+// fork would leave the child with one that another thread of the parent was just making at its first use.
+constinit std::mutex sMutex;
+[[gnu::init_priority(101)]] std::map<std::string, int32_t, std::less<>> sHighestLevels;
+[[gnu::init_priority(101)]] DebugDatabase sDatabase;
+bool sHasReadEnvironment = false;
 
-TraceLevels& Levels() {
-    static TraceLevels levels;
-    return levels;
+[[gnu::constructor(101)]] void FollowForks() {
+    constexpr auto goOn = [] { sMutex.unlock(); };
+    pthread_atfork([] { sMutex.lock(); }, goOn, goOn);
 }
 
-struct DatabaseOfEnvironment : DebugDatabase {
-    // A piece without "=" is no setting.
-    DatabaseOfEnvironment() {
-        const char* list = secure_getenv("PIXELKILN_SETTINGS");
-        std::string_view rest = list != nullptr ? list : "";
-        while (!rest.empty()) {
-            const std::string_view piece = rest.substr(0, rest.find(','));
-            rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
-            const size_t equals = piece.find('=');
-            if (equals == std::string_view::npos) continue;
-            SetEntry(std::string(piece.substr(0, equals)), std::string(piece.substr(equals + 1)));
-        }
+// A piece without "=" is no setting.
+void ReadEnvironment(std::map<std::string, std::string>& settings) {
+    const char* list = secure_getenv("PIXELKILN_SETTINGS");
+    std::string_view rest = list != nullptr ? list : "";
+    while (!rest.empty()) {
+        const std::string_view piece = rest.substr(0, rest.find(','));
+        rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
+        const size_t equals = piece.find('=');
+        if (equals != std::string_view::npos)
+            settings.insert_or_assign(std::string(piece.substr(0, equals)),
+                                      std::string(piece.substr(equals + 1)));
     }
-};
+}
 
 } // namespace
 
 DebugDatabase& DebugDatabase::Instance() {
-    static DatabaseOfEnvironment database;
-    return database;
+    const std::lock_guard lock(sMutex);
+    if (!sHasReadEnvironment) ReadEnvironment(sDatabase.fEntries);
+    sHasReadEnvironment = true;
+    return sDatabase;
 }
 
 std::string DebugDatabase::GetEntry(const std::string& name, const std::string& defaultText) const {
-    const std::lock_guard lock(fMutex);
+    const std::lock_guard lock(sMutex);
     const auto entry = fEntries.find(name);
     return entry == fEntries.end() ? defaultText : entry->second;
 }
 
 void DebugDatabase::SetEntry(const std::string& name, const std::string& text) {
-    const std::lock_guard lock(fMutex);
+    const std::lock_guard lock(sMutex);
     fEntries[name] = text;
 }
 
 void DebugDatabase::RemoveEntry(const std::string& name) {
-    const std::lock_guard lock(fMutex);
+    const std::lock_guard lock(sMutex);
     fEntries.erase(name);
 }
 
@@ -70,23 +75,20 @@ uint32_t TraceChangeCount() noexcept {
 }
 
 bool TraceEnabled(const char* channel, int32_t level, bool enabledByDefault) {
-    TraceLevels& levels = Levels();
-    const std::lock_guard lock(levels.mutex);
-    const auto entry = levels.highest.find(std::string_view(channel));
-    return entry == levels.highest.end() ? enabledByDefault : level <= entry->second;
+    const std::lock_guard lock(sMutex);
+    const auto entry = sHighestLevels.find(std::string_view(channel));
+    return entry == sHighestLevels.end() ? enabledByDefault : level <= entry->second;
 }
 
 void SetTraceLevel(const char* channel, int32_t highestLevel) {
-    TraceLevels& levels = Levels();
-    const std::lock_guard lock(levels.mutex);
-    levels.highest[channel] = highestLevel;
+    const std::lock_guard lock(sMutex);
+    sHighestLevels[channel] = highestLevel;
     ++sTraceChanges;
 }
 
 void ClearTraceLevel(const char* channel) {
-    TraceLevels& levels = Levels();
-    const std::lock_guard lock(levels.mutex);
-    levels.highest.erase(channel);
+    const std::lock_guard lock(sMutex);
+    sHighestLevels.erase(channel);
     ++sTraceChanges;
 }
 

@@ -3,11 +3,11 @@
 /// \file
 /// The host's settings, its trace, and what it does about a violated contract.
 ///
-/// Everything here is safe from all threads.
+/// Everything here is safe from all threads, and in the child of a fork, whatever other threads of the parent were doing
+/// here: see threads.h. Settings and levels are those of the parent.
 
 #include <cstdint>
 #include <map>
-#include <mutex>
 #include <string>
 
 namespace zebcore::debug {
@@ -28,7 +28,6 @@ public:
     void RemoveEntry(const std::string& name);
 
 private:
-    mutable std::mutex fMutex;
     std::map<std::string, std::string> fEntries;
 };
 

@@ -4,6 +4,8 @@
 
 #include "zebcore/RecyclerPool.h"
 
+#include <pthread.h>
+
 namespace zebcore::utility {
 namespace {
 
@@ -16,6 +18,11 @@ constinit RecyclerPool sPool(kCap);
 struct EmptyAtExit {
     ~EmptyAtExit() { sPool.SetCap(0); }
 } sEmptyAtExit;
+
+[[gnu::constructor(101)]] void FollowForks() {
+    constexpr auto goOn = [] { sPool.GoOnAfterFork(); };
+    pthread_atfork([] { sPool.HoldForFork(); }, goOn, goOn);
+}
 
 } // namespace
 

@@ -7,7 +7,8 @@
 
 namespace zebcore::utility {
 
-/// Keeps blocks that were given back and hands them out again. Safe from all threads.
+/// Keeps blocks that were given back and hands them out again. Safe from all threads, and in the child of a fork,
+/// whatever other threads of the parent were doing here: see threads.h.
 class MemoryRecycler {
 public:
     /// A block of at least \p size bytes, 16-byte aligned, its contents undefined.

@@ -7,18 +7,48 @@
 #include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <boost/smart_ptr/weak_ptr.hpp>
+#include <pthread.h>
 #include <thread>
 #include <unistd.h>
+#include <utility>
 
 namespace zebcore::threads {
 namespace {
 
-std::mutex sMutex;
-boost::weak_ptr<CPUBoundPool> sPool; // guarded by sMutex
+constinit std::mutex sMutex;
+boost::weak_ptr<CPUBoundPool> sPool;           // guarded by sMutex
+boost::shared_ptr<CPUBoundPool> sPoolOverFork; // so is this; set while the process forks
 
 boost::shared_ptr<CPUBoundPool> PoolIfAny() {
     const std::lock_guard lock(sMutex);
     return sPool.lock();
+}
+
+// Leaves no dangling pointer to those who come or fork even later.
+struct ForgetAtExit {
+    ~ForgetAtExit() {
+        const std::lock_guard lock(sMutex);
+        sPool.reset();
+    }
+} sForgetAtExit;
+
+void HoldForFork() {
+    sMutex.lock();
+    sPoolOverFork = sPool.lock();
+    if (sPoolOverFork) sPoolOverFork->HoldForFork();
+}
+
+// The pool is let go behind the lock, since it may have been held for the fork alone in the end.
+void EndFork(void (CPUBoundPool::*end)() noexcept) {
+    const boost::shared_ptr<CPUBoundPool> pool = std::move(sPoolOverFork);
+    if (pool) (pool.get()->*end)();
+    sMutex.unlock();
+}
+
+[[gnu::constructor(101)]] void FollowForks() {
+    pthread_atfork(
+        HoldForFork, [] { EndFork(&CPUBoundPool::GoOnInParent); },
+        [] { EndFork(&CPUBoundPool::StartOverInChild); });
 }
 
 } // namespace

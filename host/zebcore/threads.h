@@ -2,6 +2,12 @@
 
 /// \file
 /// The host's threads, and its pool for work that keeps a processor busy.
+///
+/// Forks: a child has of all threads the one that forked, and may use all services of the host at once. So a host holds
+/// its locks over a fork (pthread_atfork), or has none. The library holds its own: that of PK_Initialize and PK_Terminate
+/// first, since it calls the host under it, then the others, under which it calls nobody. Handlers that are registered
+/// last run first, and the library registers its own as it is loaded, the first one without a priority: a host that has
+/// handlers registers them by then, for which the bundled one has constructors of priority 101.
 
 #include <boost/function.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
@@ -25,6 +31,9 @@ public:
 /// The executor of the process, started if nobody holds one: together with the thread that calls, it has a
 /// thread for each processor that the process may use. If the system gives it fewer, it works with those.
 /// Safe from all threads.
+///
+/// The child of a fork has the executor of its parent, as long as it is held there. Its threads are started anew at the
+/// first task of the child.
 /// \return never null; throws std::bad_alloc.
 boost::shared_ptr<AsyncExecutor> CreateCPUBoundExecutor();
 
@@ -41,6 +50,11 @@ boost::shared_ptr<AsyncExecutor> CreateCPUBoundExecutor();
 /// Every call runs in the floating-point mode (MXCSR) of the calling thread, and the exception flags that it raises
 /// are the calling thread's afterwards: neither results nor flags tell which thread made the call. Before it takes
 /// up something else, a thread of the executor has its own mode again. The x87 control word is not carried.
+///
+/// A task whose part forks goes on in the child as well, if the part ran on the thread that had called this: indices that
+/// nobody had begun are called there too, those that other threads had begun are not, and nobody waits for them. If the
+/// part ran on a thread of the executor, the caller does not exist in the child; when the part returns there, the child
+/// ends as by exit(0). A part that forks had better leave the child by exec or _exit.
 /// \param function  what to call; it is not copied.
 /// \param count     number of calls; 0 and below make none.
 void ExecuteCPUBoundTaskOnAllProcessors(const boost::function<void(int32_t)>& function, int32_t count);

@@ -7,7 +7,8 @@
 /// is the first row as the operation walks it and the row bytes lead to the next; negative row bytes walk an
 /// image from its last row in memory to its first. No alignment is asked for unless a function says so. All
 /// functions may be called from any thread at the same time on different memory. Those that allocate draw
-/// from the process-wide rand(), which they never seed.
+/// from the process-wide rand(), which they never seed. A child that is forked while a thread of the program's own
+/// is in rand() cannot call it, nor these: that lock is the C library's.
 
 #include <PixelKiln/PixelFormat.h>
 

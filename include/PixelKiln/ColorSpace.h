@@ -130,7 +130,7 @@ public:
     /// \param toWhite    likewise.
     static CSMatrix CalculateAdaptationMatrix(const float* fromWhite, const float* toWhite);
 
-    /// \return a shared instance, made at the first request, which lives as long as the library.
+    /// \return a shared instance, which lives as long as the library.
     static const ColorSpace& WorkingSpace(PK_WorkingSpace which);
 
 protected:

@@ -7,12 +7,18 @@
 /// plug-ins, each start and stop the library for themselves. An operation that runs while PK_Initialize detects
 /// the processor, or while PK_SetDebugFlag writes, may choose some of its kernels by the old flags and some by the
 /// new: where these give different results, rows of its image may differ.
+///
+/// A child made by fork() may use the whole library, whatever other threads of its parent were doing in it at that
+/// moment: it has the count of open calls, the flags and the settings of its parent, and a pool of its own that starts
+/// its threads at its first task. What other threads were working on does not exist in the child, and what memory they
+/// held is lost there. fork() waits until no thread is in the middle of a start or stop. It must not be called in a
+/// handler of signals, nor in one of trace messages.
 
 #include <PixelKiln/Types.h>
 
 extern "C" {
 
-/// Starts the library. Calls nest: only the one that brings the count of open calls to 1 does any work,
+/// Starts the library; a child that is forked later finds it started. Calls nest: only the one that brings the count of open calls to 1 does any work,
 /// which is to detect the processor (this sets capability flags and never clears any), to read the host's
 /// settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), to start the
 /// primitives, and to take the host's pool of threads, on which some operations run parts of their work. For

@@ -57,7 +57,8 @@ void AddLifecycle(Calls& calls) {
                      }});
     calls.push_back(
         {{"PK_hasSSE4", "PK_hasAVX", "PK_hasAVX2"}, kFlags, std::vector<uint8_t>(1), [](uint8_t* block) {
-             return Answer(block, 8 | PK_hasSSE4() | PK_hasAVX() << 1 | PK_hasAVX2() << 2);
+             return Answer(block,
+                           static_cast<uint8_t>(8 | PK_hasSSE4() | PK_hasAVX() << 1 | PK_hasAVX2() << 2));
          }});
 }
 

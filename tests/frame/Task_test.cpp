@@ -17,6 +17,7 @@
 #include <vector>
 
 using PKTest::AllocationCount;
+using PKTest::AllocationLimit;
 using PKTest::CallCounts;
 using PKTest::RestingThreadCount;
 using PKTest::SettledThreadCount;
@@ -150,6 +151,31 @@ TEST(TaskExecutor, IsNotTouchedByAStopTooMany) {
     const CountingTask task(64);
     RunTaskOnAllProcessors(task); // on the calling thread
     EXPECT_TRUE(task.EachPartRan(1));
+}
+
+// Without memory for the pool there is none, and else it has the threads for which there is memory.
+TEST(TaskExecutor, IsDoneWithoutAsFarAsThereIsNoMemoryForIt) {
+    const size_t before = RestingThreadCount();
+    size_t threads = 0;
+    for (int granted = 0; threads < kThreadsOfExecutor; ++granted) {
+        ASSERT_LT(granted, 100);
+        {
+            const AllocationLimit limit(granted);
+            ASSERT_EQ(PK_Initialize(), PK_Success);
+        }
+        const size_t now = RestingThreadCount() - before;
+        EXPECT_GE(now, threads) << granted;
+        if (granted == 0) {
+            EXPECT_EQ(now, 0u);
+        }
+        threads = now;
+        const CountingTask task(64);
+        RunTaskOnAllProcessors(task);
+        EXPECT_TRUE(task.EachPartRan(1)) << granted;
+        ASSERT_EQ(PK_Terminate(), PK_Success);
+        EXPECT_EQ(SettledThreadCount(before), before) << granted;
+    }
+    EXPECT_EQ(threads, kThreadsOfExecutor);
 }
 
 TEST(TaskExecutor, IsCreatedAnewWhereThereWasOne) {

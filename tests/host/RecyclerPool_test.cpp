@@ -107,6 +107,48 @@ TEST(RecyclerPool, GivesUpTheClassThatWasQuietForLongest) {
     pool.Give(other, kMegabyte + kMegabyte / 2);
 }
 
+TEST(RecyclerPool, TakesAClassThatServesAsBusy) {
+    Pool pool(4 * kMegabyte);
+    void* first = pool.Take(kMegabyte);
+    void* second = pool.Take(kMegabyte);
+    void* quiet = pool.Take(2 * kMegabyte);
+    pool.Give(first, kMegabyte);
+    pool.Give(second, kMegabyte);
+    pool.Give(quiet, 2 * kMegabyte);
+    ASSERT_EQ(pool.Take(kMegabyte), second); // the last thing done with that class
+    pool.Give(pool.Take(kMegabyte + kMegabyte / 2), kMegabyte + kMegabyte / 2); // 4.5 MB in all
+    ASSERT_EQ(pool.KeptBytes(), 2 * kMegabyte + kMegabyte / 2);
+    ASSERT_EQ(pool.Take(kMegabyte), first);
+    pool.Give(first, kMegabyte);
+    pool.Give(second, kMegabyte);
+}
+
+TEST(RecyclerPool, TakesAClassThatGetsABlockBackAsBusy) {
+    Pool pool(4 * kMegabyte);
+    void* busy = pool.Take(kMegabyte);
+    void* quiet = pool.Take(2 * kMegabyte);
+    pool.Give(quiet, 2 * kMegabyte);
+    pool.Give(busy, kMegabyte);
+    pool.Give(pool.Take(kMegabyte + kMegabyte / 2), kMegabyte + kMegabyte / 2); // 4.5 MB in all
+    ASSERT_EQ(pool.KeptBytes(), 2 * kMegabyte + kMegabyte / 2);
+    ASSERT_EQ(pool.Take(kMegabyte), busy);
+    pool.Give(busy, kMegabyte);
+}
+
+TEST(RecyclerPool, GivesUpOneClassAfterTheOtherInTheOrderOfTheirLastUse) {
+    Pool pool(8 * kMegabyte);
+    const uint64_t sizes[] = {2 * kMegabyte, kMegabyte / 2, 3 * kMegabyte, kMegabyte}; // the oldest first
+    std::vector<void*> blocks;
+    for (const uint64_t size : sizes) blocks.push_back(pool.Take(size));
+    for (size_t i = 0; i < blocks.size(); ++i) pool.Give(blocks[i], sizes[i]);
+    uint64_t kept = 6 * kMegabyte + kMegabyte / 2;
+    for (const uint64_t size : sizes) {
+        pool.SetCap(kept - 1); // one byte too few
+        kept -= size;
+        EXPECT_EQ(pool.KeptBytes(), kept);
+    }
+}
+
 TEST(RecyclerPool, KeepsNothingLargerThanItsCapOrOfAForeignSize) {
     Pool pool(kMegabyte);
     void* small = pool.Take(4096);

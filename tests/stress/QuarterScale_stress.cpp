@@ -44,7 +44,8 @@ Call Copy(Size size, PKTest::Random& random) {
 }
 
 Call Reduce(int32_t field, PKTest::Random& random) {
-    constexpr Size kSource = {2 * kSize.width, kSize.height}; // the width counts samples that are written
+    static constexpr Size kSource = {2 * kSize.width,
+                                     kSize.height}; // the width counts samples that are written
     return {RandomPlanes(kSize, random), [field, source = RandomPlanes(kSource, random)](uint8_t* image) {
                 const Planes from(source, kSource), to(image, kSize);
                 return PK_QuarterScalePlanar420_8u(from.first, from.rowBytes, to.first, to.rowBytes,

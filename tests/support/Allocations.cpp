@@ -7,18 +7,21 @@
 namespace {
 
 std::atomic<int> sAllocations = 0;
+std::atomic<int> sLastToSucceed = std::numeric_limits<int>::max(); // by number
+
+void* AllocateIfAllowed(size_t size) {
+    return ++sAllocations <= sLastToSucceed ? std::malloc(size != 0 ? size : 1) : nullptr;
+}
 
 } // namespace
 
 // Counted in the whole test program. Not inlined: g++ 12 would see a mismatch where it inlines only one of a pair.
 [[gnu::noinline]] void* operator new(size_t size) {
-    ++sAllocations;
-    if (void* memory = std::malloc(size != 0 ? size : 1)) return memory;
+    if (void* memory = AllocateIfAllowed(size)) return memory;
     throw std::bad_alloc();
 }
 [[gnu::noinline]] void* operator new(size_t size, const std::nothrow_t&) noexcept {
-    ++sAllocations;
-    return std::malloc(size != 0 ? size : 1);
+    return AllocateIfAllowed(size);
 }
 [[gnu::noinline]] void operator delete(void* memory) noexcept {
     std::free(memory);
@@ -31,6 +34,11 @@ namespace PKTest {
 
 int AllocationCount() {
     return sAllocations;
+}
+
+void AllocationLimit::SetLimit(int allocations) {
+    constexpr int kNone = std::numeric_limits<int>::max();
+    sLastToSucceed = allocations == kNone ? kNone : sAllocations + allocations;
 }
 
 } // namespace PKTest

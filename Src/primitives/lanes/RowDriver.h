@@ -17,6 +17,8 @@
 
 #include "primitives/simd/Target.h"
 
+#include <cstddef>
+
 namespace PK::PK_TARGET {
 
 /// Where a group stands that has no room in its row.
@@ -180,7 +182,10 @@ PK_FLATTEN void RunGroups(Formula formula, int64_t elements, Rows<Operands...> o
     const int64_t groups = elements < whole ? 0 : (elements - whole) / kElements + 1;
     elements -= groups * kElements;
     const uint8_t* const end = destination + groups * kGroupBytes<typename Formula::Destination, Formula>;
-    for (; destination != end; advance()) formula.Group(sources..., destination);
+    while (destination != end) {
+        formula.Group(sources..., destination);
+        advance();
+    }
     for (; elements > 0; elements -= kElements, advance())
         EndGroup(formula, {false, elements, kElements}, operands, destination, sources...);
 }

@@ -10,7 +10,7 @@ namespace PK::PK_TARGET {
 /// a b + c
 template <class Vector>
 inline Vector MultiplyAdd(Vector a, Vector b, Vector c) {
-    if constexpr (Target::PK_TARGET == Target::avx2fma)
+    if constexpr (kTarget == Target::avx2fma)
         return {_mm256_fmadd_ps(a.v, b.v, c.v)};
     else
         return a * b + c;

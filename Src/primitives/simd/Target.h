@@ -6,6 +6,7 @@
 //
 // Every target has the same types and the same functions on them:
 //
+//   kTarget                  the target itself
 //   F32, I32                 kLanes lanes of float or 32-bit integer; kLanes is a multiple of four, so that a
 //                            vector holds whole interleaved four-channel float pixels
 //   F64, I64                 a double or 64-bit integer for each lane, where 24 bits are not enough
@@ -22,6 +23,12 @@
 //   LoadChannels, ...        kLanes four-channel pixels to and from four vectors, one a channel
 
 #include "primitives/simd/Targets.h"
+
+namespace PK::PK_TARGET {
+
+inline constexpr Target kTarget = Target::PK_TARGET;
+
+} // namespace PK::PK_TARGET
 
 #include PK_TARGET_HEADER
 

@@ -6,13 +6,15 @@
 
 #include <cstdint>
 #include <cstring>
-// The compiler's own definitions leave operands uninitialised whose value does not matter, and it warns of
-// that wherever it inlines them.
+#ifndef __clang__ // g++'s own definitions leave operands uninitialised whose value does not matter, and it warns of that
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Wuninitialized"
 #pragma GCC diagnostic ignored "-Wmaybe-uninitialized"
+#endif
 #include <immintrin.h>
+#ifndef __clang__
 #pragma GCC diagnostic pop
+#endif
 
 /// Before a loop over groups: the formula of a group is compiled into it, however long.
 #define PK_FLATTEN [[gnu::flatten]]

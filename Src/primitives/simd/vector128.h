@@ -15,8 +15,8 @@
 namespace PK::PK_TARGET {
 
 inline constexpr int kLanes = 4;
-inline constexpr bool kHasByteShuffle = Target::PK_TARGET >= Target::ssse3;
-inline constexpr bool kHasSSE41 = Target::PK_TARGET >= Target::sse41;
+inline constexpr bool kHasByteShuffle = kTarget >= Target::ssse3;
+inline constexpr bool kHasSSE41 = kTarget >= Target::sse41;
 
 struct F32 {
     __m128 v;
