@@ -4,6 +4,10 @@ source "$(dirname "${BASH_SOURCE[0]}")/../scripts/lib.sh"
 # What each run of the unit tests tells of the bodies that it ran.
 bodies=build/bodies
 
+# Tests that call the bodies of all instruction sets themselves, by name; what is left calls what the library chooses.
+walking='*KernelSweep.Every*:FloatKernelSweep*:Targets/*:*MatricesFromCodes*:Matrices.*:YUV422*:Downsample*:ApproxPower*'
+walking+=':Vector*:BoxBlurKernels*:ConvertFloat*:WarpSpan*'
+
 # run_tests NAME FILTER [COMMAND...]: the unit tests of build/release in one process a processor, each behind a command
 # such as an emulator.
 run_tests() {
