@@ -25,10 +25,10 @@ def set_up_child():
     pathlib.Path("/proc/self/oom_score_adj").write_text("1000")
 
 
-def run(commands, seconds, folder=None):
-    """Runs commands side by side until one fails, all are done, or the time is over.
+def run(commands, seconds, folder=None, silence=float("inf")):
+    """Runs commands side by side until one fails, all are done, the time is over, or one has been silent for so long.
 
-    Returns the first failed one's status ("late" if the time was over, 0 if none failed) and what it wrote.
+    Returns the first failed one's status ("late" if it was the time, 0 if none failed) and what it wrote.
     """
     with contextlib.ExitStack() as stack:
         started = []
@@ -38,11 +38,16 @@ def run(commands, seconds, folder=None):
                                        env=os.environ | environment, cwd=folder, preexec_fn=set_up_child)
             stack.callback(end, process)
             started.append((process, output))
-        limit = time.monotonic() + seconds
+        written, spoke = [0] * len(started), [0.0] * len(started)
+        waited, last = 0.0, time.monotonic()
         while True:
-            late = time.monotonic() > limit
-            for process, output in started:
-                status = process.poll()
+            now = time.monotonic()
+            waited, last = waited + min(now - last, 1), now  # while all are suspended, no time goes by
+            for i, (process, output) in enumerate(started):
+                status, size = process.poll(), os.fstat(output.fileno()).st_size
+                if size != written[i]:
+                    written[i], spoke[i] = size, waited
+                late = waited > seconds or waited - spoke[i] > silence
                 if status or (late and status is None):
                     return "late" if status is None else status, text_of(output)
             if all(process.poll() == 0 for process, _ in started):
@@ -125,59 +130,57 @@ class Tree:
 class Tests:
     """The tests in the order in which they are tried."""
 
-    def __init__(self, tree):
+    def __init__(self, tree, seconds):
         self.tree = tree
         self.program = tree.build_folder / "tests" / "pixelkiln_tests"
-        self.seconds = {}  # of the unmutated tree, by what is run
+        self.seconds = seconds  # of the unmutated tree, by what is run; as far as it has been
 
-    def unit_tests(self, name, chosen, limit):
+    def unit_tests(self, chosen):
         commands = [([self.program, f"--gtest_filter={chosen}", "--gtest_fail_fast", "--gtest_color=no"],
                      {"GTEST_TOTAL_SHARDS": str(PROCESSORS), "GTEST_SHARD_INDEX": str(shard)})
                     for shard in range(PROCESSORS)]
-        return self.judged(name, commands, limit, r"\[  FAILED  \] ([^\s,]+)", r"\[ RUN      \] (\S+)")
+        return self.judged("unit tests", commands, r"\[  FAILED  \] ([^\s,]+)", r"\[ RUN      \] (\S+)")
 
-    def other_tests(self, limit):
+    def other_tests(self):
         listed = subprocess.run(["ctest", "--test-dir", self.tree.build_folder, "--show-only=json-v1"], check=True,
                                 capture_output=True, text=True).stdout
         names = [re.escape(test["name"]) for test in json.loads(listed)["tests"]
                  if str(self.program) not in test.get("command", [])]
         command = ["ctest", "--test-dir", self.tree.build_folder, "--stop-on-failure", "--timeout", "300",
                    "-j", str(PROCESSORS), "-R", "^(" + "|".join(names) + ")$"]
-        return self.judged("other tests", [(command, {})], limit, r"(\S+) \.*\**(?:Failed|Timeout|\S*Exception)")
+        return self.judged("other tests", [(command, {})], r"(\S+) \.*\**(?:Failed|Timeout|\S*Exception)")
 
-    def step(self, name, limit):
-        return self.judged(name, [([f".ci/steps/{name}"], {})], limit)
+    def step(self, name):
+        return self.judged(name, [([f".ci/steps/{name}"], {})])
 
-    def judged(self, name, commands, limit, *expressions):
+    def judged(self, name, commands, *expressions):
         """What failed, or nothing."""
-        start = time.monotonic()
-        status, output = run(commands, limit, self.tree.folder)
-        self.seconds.setdefault(name, time.monotonic() - start)
+        known, start = self.seconds.get(name), time.monotonic()
+        # A mutation may make it slower, by chance or for ever. No single test takes longer than all of them do
+        # unmutated, and each says when it begins.
+        seconds, silence = (120 + 4 * known, 60 + known) if known is not None else (7200, 7200)
+        status, output = run(commands, seconds, self.tree.folder, silence)
         if not status:
+            self.seconds.setdefault(name, time.monotonic() - start)
             return ""
         found = next((names[-1] for names in (re.findall(each, output) for each in expressions) if names), name)
         return f"{found} ({'time over' if status == 'late' else 'crashed' if 'RUN' in output[-200:] else 'failed'})"
 
     def failure_unmutated(self, steps):
-        return self.unit_tests("unit tests", "*", 3600) or self.other_tests(3600) or next(
-            filter(None, (self.step(step, 3600) for step in steps)), "")
-
-    def limit(self, name):
-        """A mutation may make it slower, by chance or for ever."""
-        return 30 + 4 * self.seconds[name]
+        """As far as this is not known."""
+        runs = {"unit tests": lambda: self.unit_tests("*"), "other tests": self.other_tests,
+                **{step: lambda step=step: self.step(step) for step in steps}}
+        return next(filter(None, (test() for name, test in runs.items() if name not in self.seconds)), "")
 
     def failure(self, mutation, steps):
         likely = self.likely(mutation)
-        limit = self.limit("unit tests")
-        return (self.unit_tests("likely", likely, limit) or self.unit_tests("rest", f"*-{likely}", limit)
-                or self.later(steps))
+        return self.unit_tests(likely) or self.unit_tests(f"*-{likely}") or self.later(steps)
 
     def later(self, steps):
-        status, output = self.tree.build()
+        status, _ = self.tree.build()
         if status:
             return "build of tools (failed)"
-        return self.other_tests(self.limit("other tests")) or next(
-            filter(None, (self.step(step, self.limit(step)) for step in steps)), "")
+        return self.other_tests() or next(filter(None, map(self.step, steps)), "")
 
     def likely(self, mutation):
         """A filter: the tests in files of the source's name, those of its name, and the sweeps of its kernels."""

@@ -105,6 +105,11 @@ class Processes(unittest.TestCase):
             child = pathlib.Path("/proc", pathlib.Path(folder, "child").read_text().strip(), "stat")
             self.assertTrue(not child.exists() or child.read_text().split()[2] == "Z")
 
+    def test_silence_is_late_too_and_words_are_not(self):
+        speaker = ["sh", "-c", "for i in 1 2 3 4 5; do echo; sleep 0.2; done"]
+        self.assertEqual(run([(speaker, {})], 60, silence=3)[0], 0)
+        self.assertEqual(run([(speaker, {}), (["sleep", "60"], {})], 60, silence=3)[0], "late")
+
     def test_success_is_the_output_of_all(self):
         self.assertEqual(run([(["echo", "a"], {}), (["sh", "-c", "echo $NAME"], {"NAME": "b"})], 60), (0, "a\nb\n"))
 
