@@ -42,7 +42,8 @@ boost::shared_ptr<AsyncExecutor> CreateCPUBoundExecutor();
 ///
 /// The calling thread takes part from the first index on, and so never waits for a thread of the pool to be
 /// free, only for calls that have begun. Hence \p function may itself call this, any number of threads may call
-/// it at once, and without an executor the calling thread makes all calls. A call allocates nothing.
+/// it at once, and without an executor the calling thread makes all calls. It allocates nothing, but for the first task
+/// of a forked child.
 ///
 /// An exception that leaves \p function ends the task: indices that nobody has begun are skipped, those that
 /// have begun are waited for, and then the first exception is thrown on the calling thread.
