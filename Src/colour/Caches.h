@@ -8,11 +8,21 @@
 
 #include <PixelKiln/ColorSpace.h>
 
+#include <algorithm>
 #include <atomic>
-#include <cstring>
+#include <bit>
+#include <cstddef>
+#include <cstdint>
 #include <mutex>
 
 namespace PK {
+
+/// Not by value: what has come out as not-a-number is not written again either.
+inline bool AreSameBits(const float* a, const float* b, size_t count) {
+    return std::equal(a, a + count, b, [](float x, float y) {
+        return std::bit_cast<uint32_t>(x) == std::bit_cast<uint32_t>(y);
+    });
+}
 
 /// The matrix, calculated if it is not valid yet.
 template <class Calculate>
@@ -37,7 +47,7 @@ const float* CachedCoeffs(float* coeffs, Calculate calculate) {
         float values[3];
         calculate(values);
         const std::scoped_lock lock(FirstUseMutex());
-        if (std::memcmp(values, coeffs, sizeof values) != 0) {
+        if (!AreSameBits(values, coeffs, 3)) {
             coeffs[1] = values[1];
             coeffs[2] = values[2];
             published.store(values[0], std::memory_order_release);

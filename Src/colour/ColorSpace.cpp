@@ -2,6 +2,7 @@
 #include "colour/MatrixColumn.h"
 
 #include <cmath>
+#include <iterator>
 
 namespace PK {
 
@@ -96,8 +97,8 @@ void ColorSpace::CalculateMatrices() const {
 
     const std::scoped_lock lock(FirstUseMutex());
     // A reader that has its reference may be at it: what is right already is not written again.
-    if (std::memcmp(&rgbToXYZ, &toXYZ, sizeof toXYZ) != 0) rgbToXYZ = toXYZ;
-    if (std::memcmp(&xyzToRGB, &toRGB, sizeof toRGB) != 0) xyzToRGB = toRGB;
+    if (!AreSameBits(rgbToXYZ.m, toXYZ.m, std::size(toXYZ.m))) rgbToXYZ = toXYZ;
+    if (!AreSameBits(xyzToRGB.m, toRGB.m, std::size(toRGB.m))) xyzToRGB = toRGB;
 }
 
 CSMatrix ColorSpace::CalculateConversionMatrix(const ColorSpace& from, const ColorSpace& to) {

@@ -25,6 +25,7 @@ DCIP3ColorSpace::DCIP3ColorSpace(const DCIP3ColorSpace& other) : DCIP3ColorSpace
 DCIP3ColorSpace::DCIP3ColorSpace(DCIP3ColorSpace&& other) : DCIP3ColorSpace(other) {}
 
 DCIP3ColorSpace& DCIP3ColorSpace::operator=(const DCIP3ColorSpace& other) {
+    if (this == &other) return *this;
     GammaColorSpace::operator=(other);
     const std::scoped_lock lock(FirstUseMutex());
     illuminant = other.illuminant;

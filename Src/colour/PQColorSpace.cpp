@@ -39,6 +39,7 @@ PQColorSpace::PQColorSpace(const PQColorSpace& other) : ColorSpace(other), p3(ot
 PQColorSpace::PQColorSpace(PQColorSpace&& other) : PQColorSpace(other) {}
 
 PQColorSpace& PQColorSpace::operator=(const PQColorSpace& other) {
+    if (this == &other) return *this;
     ColorSpace::operator=(other);
     p3 = other.p3;
     const std::scoped_lock lock(FirstUseMutex());

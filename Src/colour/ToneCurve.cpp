@@ -10,14 +10,15 @@ namespace {
 /// white.
 RGB BendLuminance(RGB linear, const ToneCurve& curve, const LuminanceSpace& space) {
     constexpr double kLeastSum = 1e-6;
-    const auto [X, Y, Z] = (space.toXYZ * Column{{linear.r, linear.g, linear.b}}).c;
+    const Column tristimulus = space.toXYZ * Column{{linear.r, linear.g, linear.b}};
+    const auto& [X, Y, Z] = tristimulus.c;
     const float sum = Z + X + Y;
     const bool hasColour = static_cast<double>(sum) > kLeastSum;
     const float x = hasColour ? X / sum : space.white[0];
     const float y = hasColour ? Y / sum : space.white[1];
     const float bent = curve(Y);
-    const auto [r, g, b] = (space.toRGB * Column{{x * bent / y, bent, (1 - x - y) * bent / y}}).c;
-    return {r, g, b};
+    const Column colour = space.toRGB * Column{{x * bent / y, bent, (1 - x - y) * bent / y}};
+    return {colour.c[0], colour.c[1], colour.c[2]};
 }
 
 } // namespace

@@ -54,7 +54,7 @@ Target BestTarget(Offer offer = Offer::flags) noexcept;
 template <class Family>
 const Family& KernelsFor(Target target) noexcept {
     constexpr std::span<const Target> kTargets = TargetsOf(Family::kOffer);
-    const Family* kernels = nullptr;
+    const Family* kernels = &Family::template For<kTargets.front()>();
     const auto find = [&]<std::size_t... kIndices>(std::index_sequence<kIndices...>) {
         ((target == kTargets[kIndices] && (kernels = &Family::template For<kTargets[kIndices]>())) || ...);
     };

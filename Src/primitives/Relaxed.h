@@ -13,9 +13,9 @@ public:
     constexpr Relaxed(T value = {}) noexcept : fValue(value) {}
 
     operator T() const noexcept { return fValue.load(std::memory_order_relaxed); }
-    T operator=(T value) noexcept {
+    Relaxed& operator=(T value) noexcept {
         fValue.store(value, std::memory_order_relaxed);
-        return value;
+        return *this;
     }
 
 private:

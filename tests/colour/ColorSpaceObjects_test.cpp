@@ -264,14 +264,18 @@ const ColorSpace& Shared(int64_t which) {
     return ColorSpace::WorkingSpace(static_cast<PK_WorkingSpace>(which));
 }
 
+const std::type_info& ClassOf(const ColorSpace& space) {
+    return typeid(space);
+}
+
 TEST(WorkingSpace, AreOfTheirClasses) {
-    EXPECT_EQ(typeid(Shared(0)), typeid(Rec709ColorSpace));
-    EXPECT_EQ(typeid(Shared(1)), typeid(Rec2020ColorSpace));
-    EXPECT_EQ(typeid(Shared(2)), typeid(DCIP3ColorSpace));
-    EXPECT_EQ(typeid(Shared(3)), typeid(DCIP3ColorSpace));
-    EXPECT_EQ(typeid(Shared(4)), typeid(PQColorSpace));
-    EXPECT_EQ(typeid(Shared(5)), typeid(PQColorSpace));
-    EXPECT_EQ(typeid(Shared(6)), typeid(SRGBColorSpace));
+    EXPECT_EQ(ClassOf(Shared(0)), typeid(Rec709ColorSpace));
+    EXPECT_EQ(ClassOf(Shared(1)), typeid(Rec2020ColorSpace));
+    EXPECT_EQ(ClassOf(Shared(2)), typeid(DCIP3ColorSpace));
+    EXPECT_EQ(ClassOf(Shared(3)), typeid(DCIP3ColorSpace));
+    EXPECT_EQ(ClassOf(Shared(4)), typeid(PQColorSpace));
+    EXPECT_EQ(ClassOf(Shared(5)), typeid(PQColorSpace));
+    EXPECT_EQ(ClassOf(Shared(6)), typeid(SRGBColorSpace));
     EXPECT_EQ(Shared(2).WhitePoint(), ColorSpace::Illuminant(kIlluminantD60));
     EXPECT_EQ(Shared(3).WhitePoint(), ColorSpace::Illuminant(kIlluminantD65));
     EXPECT_TRUE(ConvertAlike(Shared(2), DCIP3ColorSpace(kIlluminantD60)));

@@ -196,7 +196,7 @@ PK_FLATTEN void RunGroups(Formula formula, int64_t elements, Rows<Operands...> o
 template <class Formula, class... Pointers>
 inline void RunRow(const Formula& formula, int64_t elements, void* destination, Pointers... sources) {
     RunGroups(formula, elements, typename Formula::Sources(), static_cast<uint8_t*>(destination),
-              static_cast<const uint8_t*>(static_cast<const void*>(sources))...);
+              reinterpret_cast<const uint8_t*>(sources)...);
 }
 
 /// A formula without constants as a kernel of one row in and one out, and of two in.
