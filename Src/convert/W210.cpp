@@ -27,8 +27,7 @@ struct RowsOfPlanes {
 
 std::optional<PK_Result> ResultWithoutPlanes(const void* const planes[3], const int32_t planeRowBytes[3],
                                              int32_t width, int32_t height, const void* destination) {
-    if (const auto result =
-            ResultWithoutWork(width, height, {static_cast<const void*>(planes), planeRowBytes, destination}))
+    if (const auto result = ResultWithoutWork(width, height, {planes, planeRowBytes, destination}))
         return result;
     return ResultWithoutWork(width, height, {planes[0], planes[1], planes[2]});
 }

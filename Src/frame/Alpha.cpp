@@ -41,9 +41,9 @@ using ChannelRow = decltype(ChannelKernels::replace);
 PK_Result RunRows(const Rows& rows, ChannelRow row, const ChannelPattern& pattern) {
     const auto* source = static_cast<const uint8_t*>(rows.source);
     auto* destination = static_cast<uint8_t*>(rows.destination);
-    const auto length = static_cast<size_t>(BytesPerPixel(rows.format) * rows.width);
+    const int64_t bytes = int64_t{BytesPerPixel(rows.format)} * rows.width;
     for (ptrdiff_t i = 0; i < rows.height; ++i)
-        row(source + i * rows.sourceRowBytes, destination + i * rows.destinationRowBytes, length, pattern);
+        row(source + i * rows.sourceRowBytes, destination + i * rows.destinationRowBytes, bytes, pattern);
     return PK_Success;
 }
 

@@ -6,6 +6,8 @@
 
 #include "primitives/simd/Targets.h"
 
+#include <algorithm>
+#include <array>
 #include <cstddef>
 #include <optional>
 #include <span>
@@ -53,13 +55,12 @@ Target BestTarget(Offer offer = Offer::flags) noexcept;
 /// The functions of one target of the family's offer.
 template <class Family>
 const Family& KernelsFor(Target target) noexcept {
-    constexpr std::span<const Target> kTargets = TargetsOf(Family::kOffer);
-    const Family* kernels = &Family::template For<kTargets.front()>();
-    const auto find = [&]<std::size_t... kIndices>(std::index_sequence<kIndices...>) {
-        ((target == kTargets[kIndices] && (kernels = &Family::template For<kTargets[kIndices]>())) || ...);
-    };
-    find(std::make_index_sequence<kTargets.size()>());
-    return *kernels;
+    static constexpr std::span<const Target> kTargets = TargetsOf(Family::kOffer);
+    using Kernels = const Family& (*)();
+    static constexpr auto kKernels = []<std::size_t... kIndices>(std::index_sequence<kIndices...>) {
+        return std::array<Kernels, kTargets.size()>{Family::template For<kTargets[kIndices]>...};
+    }(std::make_index_sequence<kTargets.size()>());
+    return kKernels[std::ranges::find(kTargets, target) - kTargets.begin()]();
 }
 
 /// The functions of the highest target that is enabled at this moment.

@@ -13,9 +13,9 @@ public:
     constexpr Relaxed(T value = {}) noexcept : fValue(value) {}
 
     operator T() const noexcept { return fValue.load(std::memory_order_relaxed); }
-    Relaxed& operator=(T value) noexcept {
+    T operator=(T value) noexcept {
         fValue.store(value, std::memory_order_relaxed);
-        return *this;
+        return value;
     }
 
 private:

@@ -140,6 +140,7 @@ constexpr KernelRow kColour[] = {
 
 std::vector<KernelRow> KernelRegister() {
     std::vector<KernelRow> all;
+    all.reserve(kKernelCount);
     for (int i = 0; i < kKernelCount; ++i) all.push_back(Info(static_cast<Kernel>(i)));
     const auto add = [&all](std::span<const KernelRow> rows) {
         all.insert(all.end(), rows.begin(), rows.end());

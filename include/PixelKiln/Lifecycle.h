@@ -6,23 +6,25 @@
 /// All may be called from any thread at any time. Parts of a program that know nothing of each other, as two
 /// plug-ins, each start and stop the library for themselves. An operation that runs while PK_Initialize detects
 /// the processor, or while PK_SetDebugFlag writes, may choose some of its kernels by the old flags and some by the
-/// new: where these give different results, rows of its image may differ.
+/// new: where these give different results, rows of its image may differ. A flag that a setting clears is set for a
+/// moment in between.
 ///
 /// A child made by fork() may use the whole library, whatever other threads of its parent were doing in it at that
 /// moment: it has the count of open calls, the flags and the settings of its parent, and a pool of its own that starts
 /// its threads at its first task. What other threads were working on does not exist in the child, and what memory they
 /// held is lost there. fork() waits until no thread is in the middle of a start or stop. It must not be called in a
-/// handler of signals, nor in one of trace messages.
+/// handler of signals, nor in one of trace messages. Handlers given to pthread_atfork() before the library was loaded run
+/// while it holds its locks, and must not call it.
 
 #include <PixelKiln/Types.h>
 
 extern "C" {
 
-/// Starts the library; a child that is forked later finds it started. Calls nest: only the one that brings the count of open calls to 1 does any work,
-/// which is to detect the processor (this sets capability flags and never clears any), to read the host's
-/// settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that flag), to start the
-/// primitives, and to take the host's pool of threads, on which some operations run parts of their work. For
-/// tests, the setting "PK.highestTarget" (plain, sse2, ssse3, sse41, avx, avx2, avx2fma or avx512) lets
+/// Starts the library; a child that is forked later finds it started. Calls nest: only the one that brings the count
+/// of open calls to 1 does any work, which is to detect the processor (this sets capability flags and never clears
+/// any), to read the host's settings "PK.disableAVX" and "PK.disableAVX2" (an entry of exactly "true" clears that
+/// flag), to start the primitives, and to take the host's pool of threads, on which some operations run parts of their
+/// work. For tests, the setting "PK.highestTarget" (plain, sse2, ssse3, sse41, avx, avx2, avx2fma or avx512) lets
 /// everything above it count as missing in the processor, for colour spaces that have not converted yet too.
 /// Every call wants a matching PK_Terminate.
 /// \return always PK_Success: threads that cannot be had are done without, and a setting that there is no memory
