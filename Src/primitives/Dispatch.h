@@ -57,9 +57,10 @@ template <class Family>
 const Family& KernelsFor(Target target) noexcept {
     static constexpr std::span<const Target> kTargets = TargetsOf(Family::kOffer);
     using Kernels = const Family& (*)();
-    static constexpr auto kKernels = []<std::size_t... kIndices>(std::index_sequence<kIndices...>) {
+    constexpr auto list = []<std::size_t... kIndices>(std::index_sequence<kIndices...>) {
         return std::array<Kernels, kTargets.size()>{Family::template For<kTargets[kIndices]>...};
-    }(std::make_index_sequence<kTargets.size()>());
+    };
+    static constexpr auto kKernels = list(std::make_index_sequence<kTargets.size()>());
     return kKernels[std::ranges::find(kTargets, target) - kTargets.begin()]();
 }
 
