@@ -20,17 +20,24 @@ if(PIXELKILN_SANITIZE)
   add_compile_options(-fsanitize=${PIXELKILN_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
   add_link_options(-fsanitize=${PIXELKILN_SANITIZE})
 endif()
-# What fuzzes wants to see which branches of the library its inputs reach. Clang brings libFuzzer; who links another
-# engine gives the flags for it too.
+# What fuzzes wants to see which branches of the library its inputs reach; kernels have few. Clang brings libFuzzer; who
+# links another engine gives the flags for it too.
 set(LIB_FUZZING_ENGINE "$ENV{LIB_FUZZING_ENGINE}" CACHE STRING "Fuzzing engine to link; empty takes that of the compiler")
+set(PIXELKILN_FUZZING_COVERAGE "")
 if(PIXELKILN_BUILD_FUZZ AND NOT LIB_FUZZING_ENGINE AND CMAKE_CXX_COMPILER_ID MATCHES Clang)
   set(LIB_FUZZING_ENGINE -fsanitize=fuzzer)
-  target_compile_options(pixelkiln_flags INTERFACE -fsanitize=fuzzer-no-link)
-  target_link_options(pixelkiln_flags INTERFACE -fsanitize=fuzzer-no-link)
+  set(PIXELKILN_FUZZING_COVERAGE -fsanitize=fuzzer-no-link)
+  target_link_options(pixelkiln_flags INTERFACE ${PIXELKILN_FUZZING_COVERAGE})
+  include(CheckCXXSymbolExists)
+  check_cxx_symbol_exists(_LIBCPP_VERSION version PIXELKILN_HAS_LIBCXX)
+  if(PIXELKILN_HAS_LIBCXX)
+    # libFuzzer itself may be built with libstdc++. That stands last, so that exceptions are those of libc++.
+    list(APPEND LIB_FUZZING_ENGINE -lc++ -lc++abi -l:libstdc++.so.6)
+  endif()
 endif()
 
-# pixelkiln_compile_quickly(TARGET [HEADER...]): for what only tests the library and is not measured itself. HEADERs are
-# compiled once, with those of the standard library that most sources take.
+# pixelkiln_compile_quickly(TARGET [HEADER...]): for programs, which are not measured themselves. HEADERs are compiled once,
+# with those of the standard library that most sources take.
 function(pixelkiln_compile_quickly target)
   target_compile_options(${target} PRIVATE $<$<NOT:$<CONFIG:Debug>>:-O1>)
   if(PIXELKILN_SANITIZE)
