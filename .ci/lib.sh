@@ -8,7 +8,7 @@ bodies=build/bodies
 walking='*KernelSweep.Every*:FloatKernelSweep*:Targets/*:*MatricesFromCodes*:Matrices.*:YUV422*:Downsample*:ApproxPower*'
 walking+=':Vector*:BoxBlurKernels*:ConvertFloat*:WarpSpan*'
 
-# run_tests NAME FILTER [COMMAND...]: the unit tests of build/release, or of the build folder that $build names, in one process
+# run_tests NAME FILTER [COMMAND...]: the unit tests of build/release, or of the build folder that $tested names, in one process
 # a processor, each behind a command such as an emulator.
 run_tests() {
     local name=$1 filter=$2 shards shard failed=0 processes=()
@@ -18,7 +18,7 @@ run_tests() {
     for ((shard = 0; shard < shards; shard++)); do
         rm -f "$bodies/$name.$shard"
         GTEST_TOTAL_SHARDS=$shards GTEST_SHARD_INDEX=$shard PIXELKILN_BODIES_RUN=$bodies/$name.$shard \
-            timeout 15m "$@" "${build:-build/release}/tests/pixelkiln_tests" --gtest_brief=1 --gtest_filter="$filter" \
+            timeout 15m "$@" "${tested:-build/release}/tests/pixelkiln_tests" --gtest_brief=1 --gtest_filter="$filter" \
             >"$bodies/$name.$shard.log" 2>&1 &
         processes+=($!)
     done
