@@ -9,7 +9,8 @@ walking='*KernelSweep.Every*:FloatKernelSweep*:Targets/*:*MatricesFromCodes*:Mat
 walking+=':Vector*:BoxBlurKernels*:ConvertFloat*:WarpSpan*'
 
 # run_tests NAME FILTER [COMMAND...]: the unit tests of build/release, or of the build folder that $tested names, in one process
-# a processor, each behind a command such as an emulator.
+# a processor, each behind a command such as an emulator. Walks over all codes, which the tests of the release go whole, are
+# thinned out.
 run_tests() {
     local name=$1 filter=$2 shards shard failed=0 processes=()
     shift 2
@@ -18,7 +19,7 @@ run_tests() {
     for ((shard = 0; shard < shards; shard++)); do
         rm -f "$bodies/$name.$shard"
         GTEST_TOTAL_SHARDS=$shards GTEST_SHARD_INDEX=$shard PIXELKILN_BODIES_RUN=$bodies/$name.$shard \
-            timeout 15m "$@" "${tested:-build/release}/tests/pixelkiln_tests" --gtest_brief=1 --gtest_filter="$filter" \
+            PIXELKILN_TEST_STRIDE=17 timeout 15m "$@" "${tested:-build/release}/tests/pixelkiln_tests" --gtest_brief=1 --gtest_filter="$filter" \
             >"$bodies/$name.$shard.log" 2>&1 &
         processes+=($!)
     done

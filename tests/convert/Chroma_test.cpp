@@ -3,6 +3,7 @@
 
 #include "support/KernelRows.h"
 #include "support/Random.h"
+#include "support/Walk.h"
 
 namespace {
 
@@ -34,7 +35,9 @@ TEST(Downsample444To422Row, FiltersChromaAndKeepsLuma) {
 TEST(Downsample444To422Row, FiltersAllTriplesOfCodes) {
     // Each triple takes the last three of four pixels, in V from the left and in U from the right.
     Bytes source(65536 * 16);
+    Walk walk;
     for (size_t centre = 0; centre < 256; ++centre) {
+        if (walk.LeavesOut()) continue;
         for (size_t i = 0; i < 65536; ++i) {
             const uint8_t left = Byte(i >> 8), right = Byte(i), c = Byte(centre);
             const uint8_t pixels[] = {left, right, 3, 9, c, c, 4, 9, right, left, 5, 9};
@@ -129,7 +132,9 @@ TEST(YUV422ToBGR8uRow, TheAverageIsRoundedToEightBitsBeforeTheMatrix) {
 
 TEST(YUV422ToBGR8uRow, AllCodes) {
     Bytes uyvy(65536 * 4);
+    Walk walk;
     for (size_t luma = 0; luma < 256; luma += 2) {
+        if (walk.LeavesOut()) continue;
         for (size_t i = 0; i < 65536; ++i) {
             const uint8_t pair[4] = {Byte(i), Byte(luma), Byte(i >> 8), Byte(luma + 1)};
             std::copy(std::begin(pair), std::end(pair), &uyvy[4 * i]);

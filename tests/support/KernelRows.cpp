@@ -4,6 +4,7 @@
 #include "reference/ReferenceKernels.h"
 #include "support/FloatEnvironment.h"
 #include "support/Samples.h"
+#include "support/Walk.h"
 
 #include <PixelKiln/PixelFormat.h>
 
@@ -145,7 +146,9 @@ void ExpectReferenceInEveryRoundingMode(Kernel kernel) {
 
 void ExpectReferenceForAllCodes(Kernel kernel) {
     Bytes source(65536 * 4);
+    Walk walk;
     for (unsigned third = 0; third < 256; ++third) {
+        if (walk.LeavesOut()) continue;
         for (unsigned i = 0; i < 65536; ++i) {
             source[4 * i] = static_cast<uint8_t>(i);
             source[4 * i + 1] = static_cast<uint8_t>(i >> 8);
