@@ -74,6 +74,24 @@ KernelTrial TrialWith(const KernelRow& kernel, int32_t size, Random& random) {
                 })};
 }
 
+/// Two rows in and one out by constants that are drawn.
+template <class Constants, Constants (*kDraw)(Random&)>
+KernelTrial TwoRowTrialWith(const KernelRow& kernel, int32_t size, Random& random) {
+    const Constants constants = kDraw(random);
+    return {{RowOf(kernel.operands.source, size), RowOf(kernel.operands.second, size)},
+            RowOf(kernel.operands.destination, size),
+            Typed<TwoRowKernelWith<Constants>>(
+                [=](TwoRowKernelWith<Constants> run, const Sources& sources, uint8_t* destination) {
+                    run(sources[0], sources[1], destination, size, constants);
+                })};
+}
+
+/// An opacity or weight, one in four at an end.
+float DrawAmount(Random& random) {
+    constexpr float kEnds[] = {0, 1, 8e-6f, 0.99999f};
+    return random.Below(4) == 0 ? kEnds[random.Below(4)] : static_cast<float>(random.Next()) * 0x1p-32f;
+}
+
 ChannelPattern DrawInteger(Random& random) {
     const auto channel = static_cast<int32_t>(random.Below(4));
     return random.Below(2) ? PatternOfChannel(channel, static_cast<uint8_t>(random.Next()))
