@@ -38,7 +38,9 @@ public:
     }
 
     /// Rows from `firstRow` up to `endRow` of images in the formats of the plan.
-    PK_Result Run(const MixImages& images, int32_t firstRow, int32_t endRow) const {
+    /// \param begin  is called once there is memory, before the first row.
+    template <class Begin>
+    PK_Result Run(const MixImages& images, int32_t firstRow, int32_t endRow, const Begin& begin) const {
         const int32_t width = images.destination.width;
         RowMemory memory(width);
         memory.AddSource(fFirst);
@@ -47,12 +49,17 @@ public:
         return memory.With([&](TemporaryRows& rows) {
             const RowSource first(images.first, fFirst, rows), second(images.second, fSecond, rows);
             const RowSink sink(images.destination, fDestination, rows);
+            begin();
             for (int32_t row = firstRow; row < endRow; ++row) {
                 fKernel(first.Row(row), second.Row(row), sink.Row(row), width, fAmount);
                 sink.Finish(row);
             }
             return PK_Success;
         });
+    }
+
+    PK_Result Run(const MixImages& images, int32_t firstRow, int32_t endRow) const {
+        return Run(images, firstRow, endRow, [] {});
     }
 
 private:

@@ -148,6 +148,11 @@ public:
     /// Where the operation writes a row in the working format.
     uint8_t* Row(int32_t row) const { return fTemporary != nullptr ? fTemporary : fImage.Row(row); }
 
+    /// Brings a row in the working format that stands elsewhere to its place.
+    void Take(int32_t row, const uint8_t* working) const {
+        fChain.ConvertRow(working, fImage.Row(row), fImage.width, fScratch);
+    }
+
     /// Brings the row that was written to its place.
     void Finish(int32_t row) const {
         if (fTemporary != nullptr) fChain.ConvertRow(fTemporary, fImage.Row(row), fImage.width, fScratch);

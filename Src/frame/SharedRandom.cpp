@@ -18,9 +18,25 @@ constinit std::mutex sMutex;
 
 } // namespace
 
-int SharedRandom() noexcept {
-    const std::scoped_lock lock(sMutex);
+SharedRandoms::SharedRandoms() noexcept {
+    sMutex.lock();
+}
+
+SharedRandoms::~SharedRandoms() {
+    sMutex.unlock();
+}
+
+int SharedRandoms::Next() noexcept {
     return std::rand();
+}
+
+int SharedRandom() noexcept {
+    return SharedRandoms().Next();
+}
+
+void SeedSharedRandom(unsigned seed) noexcept {
+    const std::scoped_lock lock(sMutex);
+    std::srand(seed);
 }
 
 } // namespace PK

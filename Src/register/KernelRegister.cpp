@@ -3,7 +3,11 @@
 #include "register/KernelRegister.h"
 
 #include "colour/ColourKernels.h"
+#include "composite/BlackKernels.h"
+#include "composite/BlendKernels.h"
 #include "composite/MaskKernels.h"
+#include "composite/MatteKernels.h"
+#include "composite/OverKernels.h"
 #include "convert/BridgeKernels.h"
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
@@ -125,6 +129,102 @@ constexpr KernelRow kOperations[] = {
     Entry<&WarpBilinearKernels::blendOther>("WarpSpan_BlendOther", {Bytes(4), Bytes(4)}),
 };
 
+constexpr Operand kVUYA8 = {Samples::Bytes, 4, 1, PK_PixelFormat_VUYA_4444_8u};
+
+// The order of top, back and destination.
+constexpr Operands kThreeOf(Operand pixel) {
+    return {pixel, pixel, pixel};
+}
+// By fours from SSE2 on.
+constexpr Agreement kByFours = DeclaredFrom(Target::sse2);
+constexpr PlaceRule kFromBoundary = {.headAlignment = 16};
+
+constexpr KernelRow kComposites[] = {
+    Entry<&OverKernels::straight8u_AA>("StraightOverRow_8u_AA", kThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::straight8u_AX>("StraightOverRow_8u_AX", kThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::straight8u_XA>("StraightOverRow_8u_XA", kThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::straight8u_XX>("StraightOverRow_8u_XX", kThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::premultiplied8u_AA>("PremultipliedOverRow_8u_AA", kThreeOf(kBGRA8), kByFours,
+                                            kFromBoundary),
+    Entry<&OverKernels::premultiplied8u_AX>("PremultipliedOverRow_8u_AX", kThreeOf(kBGRA8), kByFours,
+                                            kFromBoundary),
+    Entry<&OverKernels::premultiplied8u_XA>("PremultipliedOverRow_8u_XA", kThreeOf(kBGRA8), kByFours,
+                                            kFromBoundary),
+    Entry<&OverKernels::premultiplied8u_XX>("PremultipliedOverRow_8u_XX", kThreeOf(kBGRA8), kByFours,
+                                            kFromBoundary),
+    Entry<&OverKernels::premultipliedYUV8u_AA>("PremultipliedYUVOverRow_8u_AA", kThreeOf(kVUYA8), kByFours,
+                                               kFromBoundary),
+    Entry<&OverKernels::premultipliedYUV8u_AX>("PremultipliedYUVOverRow_8u_AX", kThreeOf(kVUYA8), kByFours,
+                                               kFromBoundary),
+    Entry<&OverKernels::premultipliedYUV8u_XA>("PremultipliedYUVOverRow_8u_XA", kThreeOf(kVUYA8), kByFours,
+                                               kFromBoundary),
+    Entry<&OverKernels::premultipliedYUV8u_XX>("PremultipliedYUVOverRow_8u_XX", kThreeOf(kVUYA8), kByFours,
+                                               kFromBoundary),
+    Entry<&OverKernels::straight32f_AA>("StraightOverRow_32f_AA", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_AX>("StraightOverRow_32f_AX", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_XA>("StraightOverRow_32f_XA", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_XX>("StraightOverRow_32f_XX", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_AA>("PremultipliedOverRow_32f_AA", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_AX>("PremultipliedOverRow_32f_AX", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_XA>("PremultipliedOverRow_32f_XA", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_XX>("PremultipliedOverRow_32f_XX", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::color>("BlendRow_Color", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::colorBurn>("BlendRow_ColorBurn", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::colorDodge>("BlendRow_ColorDodge", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::darken>("BlendRow_Darken", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::darkerColor>("BlendRow_DarkerColor", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::difference>("BlendRow_Difference", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::exclusion>("BlendRow_Exclusion", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::hardLight>("BlendRow_HardLight", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::hardMix>("BlendRow_HardMix", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::hue>("BlendRow_Hue", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::lighten>("BlendRow_Lighten", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::lighterColor>("BlendRow_LighterColor", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::linearBurn>("BlendRow_LinearBurn", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::linearDodge>("BlendRow_LinearDodge", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::linearLight>("BlendRow_LinearLight", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::luminosity>("BlendRow_Luminosity", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::multiply>("BlendRow_Multiply", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::normal>("BlendRow_Normal", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::overlay>("BlendRow_Overlay", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::pinLight>("BlendRow_PinLight", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::saturation>("BlendRow_Saturation", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::screen>("BlendRow_Screen", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::softLight>("BlendRow_SoftLight", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::vividLight>("BlendRow_VividLight", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::subtract>("BlendRow_Subtract", kThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::divide>("BlendRow_Divide", kThreeOf(kBGRA32f)),
+};
+
+constexpr Operands kTwoOf(Operand pixel) {
+    return {pixel, pixel};
+}
+constexpr Operand kBGRA15 = {Samples::Words, 8, 1, PK_PixelFormat_BGRA_4444_15u};
+
+constexpr KernelRow kMattes[] = {
+    Entry<&BlackKernels::rgb8u>("OverBlackRow_RGB8u", kTwoOf(kBGRA8)),
+    Entry<&BlackKernels::rgb8uAlphaFirst>("OverBlackRow_RGB8u_AlphaFirst", kTwoOf(kBGRA8)),
+    Entry<&BlackKernels::yuv8u>("OverBlackRow_YUV8u", kTwoOf(kVUYA8), kByFours, kFromBoundary),
+    Entry<&BlackKernels::floats>("OverBlackRow_32f", kTwoOf(kBGRA32f)),
+    Entry<&BlackKernels::floatsAlphaFirst>("OverBlackRow_32f_AlphaFirst", kTwoOf(kBGRA32f)),
+    Entry<&AlphaTestKernels::codes>("TestAlphaRow_8u", {kBGRA8, Integers(1)}),
+    Entry<&AlphaTestKernels::codesAlphaFirst>("TestAlphaRow_8u_AlphaFirst", {kBGRA8, Integers(1)}),
+    Entry<&AlphaTestKernels::floats>("TestAlphaRow_32f", {kBGRA32f, Integers(1)}),
+    Entry<&AlphaTestKernels::floatsAlphaFirst>("TestAlphaRow_32f_AlphaFirst", {kBGRA32f, Integers(1)}),
+    Entry<&MatteKernels::complement8u>("MatteComplementRow_8u", kTwoOf(kBGRA8)),
+    Entry<&MatteKernels::complement8uAlphaFirst>("MatteComplementRow_8u_AlphaFirst", kTwoOf(kBGRA8)),
+    Entry<&MatteKernels::complement15u>("MatteComplementRow_15u", kTwoOf(kBGRA15)),
+    Entry<&MatteKernels::complement15uAlphaFirst>("MatteComplementRow_15u_AlphaFirst", kTwoOf(kBGRA15)),
+    Entry<&MatteKernels::complement32f>("MatteComplementRow_32f", kTwoOf(kBGRA32f)),
+    Entry<&MatteKernels::complement32fAlphaFirst>("MatteComplementRow_32f_AlphaFirst", kTwoOf(kBGRA32f)),
+    Entry<&MatteKernels::remove8u>("RemoveMatteRow_8u", kThreeOf(kBGRA8)),
+    Entry<&MatteKernels::remove8uAlphaFirst>("RemoveMatteRow_8u_AlphaFirst", kThreeOf(kBGRA8)),
+    Entry<&MatteKernels::remove15u>("RemoveMatteRow_15u", kThreeOf(kBGRA15)),
+    Entry<&MatteKernels::remove15uAlphaFirst>("RemoveMatteRow_15u_AlphaFirst", kThreeOf(kBGRA15)),
+    Entry<&MatteKernels::remove32f>("RemoveMatteRow_32f", kThreeOf(kBGRA32f)),
+    Entry<&MatteKernels::remove32fAlphaFirst>("RemoveMatteRow_32f_AlphaFirst", kThreeOf(kBGRA32f)),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -148,6 +248,8 @@ std::vector<KernelRow> KernelRegister() {
     add(kBridges);
     add(kPrimitives);
     add(kOperations);
+    add(kComposites);
+    add(kMattes);
     add(kColour);
     return all;
 }

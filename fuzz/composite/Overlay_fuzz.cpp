@@ -4,7 +4,7 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/Formats.h"
-#include "support/ImageMemory.h"
+#include "support/Input.h"
 #include "support/Size.h"
 #include "support/Switches.h"
 
@@ -13,7 +13,6 @@
 
 #include <PixelKiln/Overlay.h>
 
-#include <algorithm>
 #include <cmath>
 #include <string>
 
@@ -27,25 +26,6 @@ Size DrawSize(ByteStream& stream) {
         return {stream.Between(16380, 16390), 1}; // about where rows no longer fit the stack
     return {stream.Between(-1, 120), stream.Between(0, 40)};
 }
-
-RowsLayout DrawRaster(ByteStream& stream, PK_PixelFormat format, Size size) {
-    return DrawLayout(stream, int64_t{PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0))}, size);
-}
-
-/// An image, given to a call as it is or, now and then, as null.
-struct Input {
-    PK_PixelFormat format;
-    SourceImage memory;
-    bool isNull;
-
-    Input(ByteStream& stream, PK_PixelFormat pixelFormat, const RowsLayout& layout)
-        : format(pixelFormat), memory(layout, stream), isNull(stream.OneIn(64)) {}
-    Input(ByteStream& stream, PK_PixelFormat pixelFormat, Size size)
-        : Input(stream, pixelFormat, DrawRaster(stream, pixelFormat, size)) {}
-
-    uint8_t* Pixels() const { return isNull ? nullptr : memory.Pixels(); }
-    int32_t RowBytes() const { return memory.RowBytes(); }
-};
 
 struct MaskCall {
     const Input &first, &second, &mask, &destination;

@@ -3,13 +3,16 @@
 /// \file
 /// The whole exported interface.
 
+#include <PixelKiln/BlendMode.h>
 #include <PixelKiln/BoxBlur.h>
 #include <PixelKiln/Buffers.h>
 #include <PixelKiln/CodecBridges.h>
 #include <PixelKiln/ColorSpace.h>
+#include <PixelKiln/Composite.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/Lifecycle.h>
+#include <PixelKiln/Matte.h>
 #include <PixelKiln/Overlay.h>
 #include <PixelKiln/PixelFormat.h>
 #include <PixelKiln/Planar.h>

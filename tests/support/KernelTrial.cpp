@@ -2,7 +2,9 @@
 
 #include "colour/ColourKernels.h"
 #include "colour/DecodeTables.h"
+#include "composite/BlackKernels.h"
 #include "composite/MaskKernels.h"
+#include "composite/MatteKernels.h"
 #include "convert/BridgeKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "geometry/WarpSpan.h"
@@ -153,6 +155,23 @@ KernelTrial MaskTrial(const KernelRow& kernel, int32_t size, Random& random) {
                 })};
 }
 
+/// A test that tells a number.
+KernelTrial AlphaTestTrial(const KernelRow& kernel, int32_t size, Random&) {
+    return {{RowOf(kernel.operands.source, size)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<AlphaTestKernels::Test>(
+                [=](AlphaTestKernels::Test run, const Sources& sources, uint8_t* destination) {
+                    const AlphaTest told = run(sources[0], size);
+                    std::memcpy(destination, &told, sizeof told);
+                })};
+}
+
+MattePixel DrawMatte(Random& random) {
+    MattePixel pixel;
+    random.Fill(pixel.bytes, sizeof pixel.bytes);
+    return pixel;
+}
+
 /// Y, U and V, and for an average the same of the row below.
 template <int kRows>
 KernelTrial PlanesTrial(const KernelRow& kernel, int32_t size, Random&) {
@@ -284,6 +303,12 @@ constexpr SpecialTrial kSpecial[] = {
     {"W210", PlanesTrial<1>},
     {"QuarterScale", InterleaveTrial, "Interleave"},
     {"Mask", MaskTrial},
+    {"Black", TrialWith<float, DrawAmount>},
+    {"AlphaTest", AlphaTestTrial},
+    {"Matte", TrialWith<MattePixel, DrawMatte>, "MatteComplement"},
+    {"Matte", TwoRowTrial},
+    {"Over", TwoRowTrialWith<float, DrawAmount>},
+    {"Blend", TwoRowTrialWith<float, DrawAmount>},
     {"BoxBlur", BoxTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},

@@ -12,6 +12,7 @@
 //
 // The integer layouts also load and store IntChannels.
 
+#include "primitives/Thresholds.h"
 #include "primitives/simd/Target.h"
 
 namespace PK::PK_TARGET {
@@ -91,6 +92,20 @@ struct Pixels32f {
         StoreFloatChannels(destination, InOrder<kAlpha>(channels));
     }
 };
+
+inline Channels Select(I32 mask, const Channels& a, const Channels& b) {
+    return {Select(mask, a.c0, b.c0), Select(mask, a.c1, b.c1), Select(mask, a.c2, b.c2),
+            Select(mask, a.c3, b.c3)};
+}
+
+inline F32 Magnitude(F32 x) {
+    return FromBits(Bits(x) & Ints(INT32_MAX));
+}
+
+/// Where a value counts as 0. Not-a-number never does.
+inline I32 IsNegligible(F32 x) {
+    return Less(Magnitude(x), Floats(kNegligible));
+}
 
 /// All bits of a group of four lanes set where they are in each of the four, else none: a vote of the four pixels that a
 /// shortcut is taken for together, however wide the vector.

@@ -241,4 +241,32 @@ void RunRowWithHead(const HeadFormula& headFormula, const Formula& formula, int6
                    static_cast<uint8_t*>(destination), static_cast<const uint8_t*>(sources)...);
 }
 
+template <class EndFormula, class Formula, class... Operands>
+void RunMiddleAndEnds(const EndFormula& endFormula, const Formula& formula, int64_t head, int64_t middle,
+                      int64_t tail, Rows<Operands...> operands, uint8_t* destination,
+                      RowOf<Operands>... sources) {
+    RunHeadAndRest(endFormula, formula, head, middle, operands, destination, sources...);
+    RunRow(endFormula, tail, destination + Formula::Destination::BytesOf(head + middle),
+           (sources + Operands::BytesOf(head + middle))...);
+}
+
+/// A row of which only whole runs of kRun elements from a boundary of the destination on follow one formula, and the
+/// elements before and behind them another on the same operands.
+template <int32_t kAlignment, int32_t kRun, class EndFormula, class Formula, class... Pointers>
+void RunRowWithEnds(const EndFormula& endFormula, const Formula& formula, int64_t elements, void* destination,
+                    Pointers... sources) {
+    const int64_t head =
+        ElementsBeforeBoundary<kAlignment, Formula::Destination::kBytes>(destination, elements);
+    const int64_t middle = (elements - head) / kRun * kRun;
+    RunMiddleAndEnds(endFormula, formula, head, middle, elements - head - middle, typename Formula::Sources(),
+                     static_cast<uint8_t*>(destination), static_cast<const uint8_t*>(sources)...);
+}
+
+/// A formula that is made of constants, as a kernel of two rows in and one out.
+template <class Formula, class Constants>
+void TwoRowsWith(const void* first, const void* second, void* destination, int32_t width,
+                 const Constants& constants) {
+    RunRow(Formula(constants), width, destination, first, second);
+}
+
 } // namespace PK::PK_TARGET

@@ -47,7 +47,16 @@ Run Shade(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// Attenuated colour over whatever stands there, at full opacity: it has none.
+Run Blend(const uint8_t* source, uint8_t* back) {
+    return [=] {
+        libyuv::ARGBBlend(source, kBGRARowBytes, back, kBGRARowBytes, back, kBGRARowBytes, kWidth, kHeight);
+    };
+}
+
 const AddPeers add = {
+    {"Premultiplied BGRA 8u over opaque", "libyuv ARGBBlend", false, Blend},
+    {"Premultiplied BGRA 8u over premultiplied", "libyuv ARGBBlend", false, Blend},
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
