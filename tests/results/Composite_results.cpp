@@ -34,9 +34,14 @@ void Lay(Line& line, const Layers& layers, PK_BlendMode mode, Size size, float o
     Image image(layers.destination, size.width, size.height, kSpread, line.random);
     top.Fill(layers.top, Content::kEdges, line.random);
     back.Fill(layers.back, Content::kEdges, line.random);
-    line.results.Add(PK_CompositeWithBlendMode(top.First(), top.Step(), layers.top, back.First(), back.Step(),
-                                               layers.back, image.First(), image.Step(), layers.destination,
-                                               size.width, size.height, opacity, mode, 4, inLinear));
+    if (mode == PK_BlendMode_Normal)
+        line.results.Add(PK_Composite(top.First(), top.Step(), layers.top, back.First(), back.Step(),
+                                      layers.back, image.First(), image.Step(), layers.destination,
+                                      size.width, size.height, opacity, 4, inLinear));
+    else
+        line.results.Add(PK_CompositeWithBlendMode(
+            top.First(), top.Step(), layers.top, back.First(), back.Step(), layers.back, image.First(),
+            image.Step(), layers.destination, size.width, size.height, opacity, mode, 4, inLinear));
     image.AddTo(line.results);
 }
 

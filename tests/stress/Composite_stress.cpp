@@ -67,7 +67,7 @@ std::function<bool()> PrepareDissolve() {
         struct Pixel {
             float b, g, r, a;
         };
-        const std::vector<Pixel> top(kWidth * kHeight, {1, 1, 1, 0.5f}), back(top.size(), {});
+        const std::vector<Pixel> top(kWidth * kHeight, {1, 1, 1, 0.5f}), back(top.size());
         std::vector<Pixel> result(top.size());
         if (PK_CompositeWithBlendMode(top.data(), 16 * kWidth, kFormat, back.data(), 16 * kWidth, kFormat,
                                       result.data(), 16 * kWidth, kFormat, kWidth, kHeight, 1,
