@@ -102,8 +102,9 @@ struct OverBlackFloats : PixelGroup<16, 16> {
     void Group(const uint8_t* source, uint8_t* destination) const {
         const Channels c = Pixels32f<kAlpha>::Load(source);
         const F32 alpha = c.c3 * opacity;
-        const F32 part = Select(Less(Floats(1), Floats(kNegligible) + alpha), Floats(1), alpha);
-        Pixels32f<kAlpha>::Store(destination, {c.c0 * part, c.c1 * part, c.c2 * part, Floats(1)});
+        const I32 passes = Less(Floats(1), Floats(kNegligible) + alpha);
+        const auto scaled = [&](F32 x) { return Select(passes, x, x * alpha); };
+        Pixels32f<kAlpha>::Store(destination, {scaled(c.c0), scaled(c.c1), scaled(c.c2), Floats(1)});
     }
 
     F32 opacity;

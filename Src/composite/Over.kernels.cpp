@@ -5,6 +5,7 @@
 
 #include "composite/OverKernels.h"
 #include "primitives/Thresholds.h"
+#include "primitives/lanes/ByteScale.h"
 #include "primitives/lanes/PixelLanes.h"
 #include "primitives/lanes/RowDriver.h"
 
@@ -155,15 +156,33 @@ struct OverCodes : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
     F32 opacity;
 };
 
+/// Premultiplied RGB at full opacity: s + b x (255 - alpha of s) / 255, to the nearest in every rounding mode, which is what
+/// floats give for all codes.
+template <Opaque kOpaque, class Rule>
+struct OverFully : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
+    static void Group(const uint8_t* top, const uint8_t* back, uint8_t* destination) {
+        const I32 full = Ints(-0x1000000);
+        const I32 b = kOpaque.back ? LoadInts(back) | full : LoadInts(back);
+        const I32 s = kOpaque.top ? LoadInts(top) | full : LoadInts(top), alpha = AlphaOf(s);
+        const I32 isNone = Rule::Agreed(Equal(alpha, Ints(0)));
+        const I32 rest = ScaleBytes(WithoutStaleColour<false, kOpaque.back>(b), Ints(255) - alpha);
+        const I32 sum = AddBytes(WithoutStaleColour<false, kOpaque.top>(s), rest);
+        Store(destination, Select(isNone, b, sum));
+    }
+};
+
 template <Colour kColour, Opaque kOpaque>
 void OverCodesRow(const void* top, const void* back, void* destination, int32_t width, const float& opacity) {
-    using Pixelwise = OverCodes<kColour, kOpaque, ByPixel>;
     const float amount = Clamped(opacity);
-    if constexpr (kTarget == Target::plain)
-        RunRow(Pixelwise(amount), width, destination, top, back);
-    else
-        RunRowWithEnds<16, 4>(Pixelwise(amount), OverCodes<kColour, kOpaque, ByFours>(amount), width,
-                              destination, top, back);
+    const auto run = [&](const auto& byPixel, [[maybe_unused]] const auto& byFours) {
+        if constexpr (kTarget == Target::plain)
+            RunRow(byPixel, width, destination, top, back);
+        else
+            RunRowWithEnds<16, 4>(byPixel, byFours, width, destination, top, back);
+    };
+    if constexpr (kColour == Colour::premultiplied)
+        if (amount == 1) return run(OverFully<kOpaque, ByPixel>(), OverFully<kOpaque, ByFours>());
+    run(OverCodes<kColour, kOpaque, ByPixel>(amount), OverCodes<kColour, kOpaque, ByFours>(amount));
 }
 
 // Floats: every pixel by itself, and nothing is limited.

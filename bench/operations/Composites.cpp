@@ -11,11 +11,11 @@ namespace {
 constexpr size_t kBytes8 = 4 * static_cast<size_t>(kPixels), kBytes32 = 4 * kBytes8;
 constexpr PK_PixelFormat kFloats = PK_PixelFormat_BGRA_4444_32f;
 
-template <PK_PixelFormat kTop, PK_PixelFormat kBack>
+template <PK_PixelFormat kTop, PK_PixelFormat kBack, bool kFully = false>
 Run Over(const uint8_t* source, uint8_t* back) {
     return [=] {
         PK_Composite(source, kBGRARowBytes, kTop, back, kBGRARowBytes, kBack, back, kBGRARowBytes, kBack,
-                     kWidth, kHeight, kOpacity, 4, false);
+                     kWidth, kHeight, kFully ? 1 : kOpacity, 4, false);
     };
 }
 
@@ -44,6 +44,10 @@ const AddOperations add = {
      Over<kPremultiplied, kOpaque>},
     {"Premultiplied BGRA 8u over premultiplied", 2 * kBytes8, kBytes8, Samples::Bytes, Against::Peer, 1,
      Over<kPremultiplied, kPremultiplied>},
+    {"Premultiplied BGRA 8u over opaque at full opacity", 2 * kBytes8, kBytes8, Samples::Bytes, Against::Peer,
+     1, Over<kPremultiplied, kOpaque, true>},
+    {"Premultiplied BGRA 8u over premultiplied at full opacity", 2 * kBytes8, kBytes8, Samples::Bytes,
+     Against::Peer, 1, Over<kPremultiplied, kPremultiplied, true>},
     {"Straight BGRA 8u over straight", 2 * kBytes8, kBytes8, Samples::Bytes, Against::Peer, 0.7,
      Over<kStraight, kStraight>},
     ModeRow<PK_BlendMode_ColorBurn>("Blend of BGRA 32f, ColorBurn"),

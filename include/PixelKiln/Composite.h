@@ -23,12 +23,14 @@ extern "C" {
 ///     premultiplied               (s - K) x o + K + (b - K) x (1 - a)
 ///
 /// |a| below 8e-6 gives the back pixel, |1 - a| below 8e-6 the colour of the top with full alpha. Over a pixel of the
-/// back without alpha the top shows alone: straight with its own colour, premultiplied with its colour times o; its
-/// alpha is sa x o. Straight YUV of 8 bits is mixed by its codes, without regard to their zeros. Codes are rounded to
-/// the nearest, by the caller's rounding mode, and limited to 0 to 255; floats are not limited.
+/// back without alpha the top shows alone: straight with its own colour, premultiplied as the formula has it without b; its
+/// alpha is sa x o. Straight YUV of 8 bits is mixed by its codes, without regard to their zeros. Codes are rounded as the
+/// caller's rounding mode says, by default to the nearest, premultiplied RGB at full opacity always to the nearest, and
+/// limited to 0 to 255; floats are not limited.
 ///
-/// With SSE2 the 8-bit formulas go by runs of four pixels, from the first 16-byte boundary of a working row on. The
-/// shortcuts are taken where all four agree: that a is exactly 0, that it is at least 0.99999237, that ba is 0. Else a
+/// With SSE2 the 8-bit formulas go by runs of four pixels, from the first that begins at a 16-byte boundary of the row
+/// that is written on. The shortcuts are taken where all four agree: that a is exactly 0, that it is at least
+/// 0.99999237, and for straight colour that ba is 0. Else a
 /// pixel without alpha counts as one without colour too, so that stale colour never shows; 1 / 255 is the nearest
 /// float, and 255 / A is the processor's estimate of a reciprocal times 255, 0 where A is at most 2^-17. Results may
 /// differ from those of single pixels by a step of rounding.

@@ -9,8 +9,8 @@ extern "C" {
 
 /// Flattens an image onto opaque black with an opacity.
 ///
-/// Rows are converted, as PK_Convert converts them, to a format to work in, laid over black there, and converted to the
-/// destination's. It is the destination's own if that is BGRA_4444, ARGB_4444 or VUYA_4444 at 8u or 32f, of BT.601; at
+/// Rows are converted, as PK_Convert converts them but for denormal results, which stay, to a format to work in, laid over black there, and converted to the
+/// destination's. It is the destination's own if that is BGRA_4444, ARGB_4444 or VUYA_4444 at 8u or gamma-encoded 32f, VUYA of BT.601; at
 /// full opacity VUYA_4444 of BT.709 too. Else it is, of the family of the destination, BGRA_4444 or VUYA_4444 at 32f for
 /// a quality of 3 and above, at 8u below. VUYA is of BT.709 at full opacity where the destination is, else of BT.601.
 ///
@@ -21,7 +21,7 @@ extern "C" {
 ///    above 255; unchanged where a' is 255.
 ///  - VUY 8u with SSE2: af = a x o as a float, and (c - K) x af / 255 + K to the nearest. A pixel passes whose af is at
 ///    least 254.5; from the first 16-byte boundary of a row on runs of four pass together, or none of them.
-///  - 32f: c x a x o; from 1 - 8e-6 on the factor counts as 1. Nothing is limited.
+///  - 32f: c x a x o; the colour passes where a x o is above 1 - 8e-6. Nothing is limited.
 ///
 /// Alpha becomes opaque. Row 0 in memory meets row 0 in memory, whatever the origins of the formats.
 ///
@@ -62,17 +62,18 @@ PK_API PK_Result PK_CompositeToBlack(const void* source, int32_t sourceRowBytes,
 /// The alpha of each row is looked at in the format that is worked in: at 32f it is full or none within 8e-6. An opaque
 /// row is copied or converted, and not written at all where the call is in place: where source and destination have one
 /// first byte, row bytes and format. A transparent row is filled with opaque black in the destination's own
-/// format, if PK_FillWithOpaqueBlack serves that.
+/// format as PK_FillWithOpaqueBlack does it, which leaves the last pixel of an odd width of 4:2:2; RGB_444_10u, which has
+/// no fill, is laid over black.
 ///
 /// Memory and threads are those of PK_CompositeToBlack, and so are the parameters, and:
 ///
 /// \param alphaTestResult  receives 0 where all rows are opaque, or there is no pixel; 1 where all are transparent; else
 ///                         2. It is written on success only.
 /// \return
-///  - PK_ErrBadSrcFormat, PK_ErrBadDstFormat: a format is compressed, planar or outside the catalogue.
+///  - PK_ErrBadSrcFormat, PK_ErrBadDstFormat: a format is compressed or planar, else outside the catalogue.
+///  - PK_ErrFailed: no place for the test result.
 ///  - PK_Success: done; with a width of 0 or a height below 1 nothing was to do.
-///  - PK_ErrFailed: no place for the test result, a negative width, a width too great, or a null pointer where there
-///    are pixels.
+///  - PK_ErrFailed: a negative width, a width too great, or a null pointer where there are pixels.
 ///  - PK_ErrOutOfMemory: no memory for rows of a wide image that are converted.
 PK_API PK_Result PK_CompositeToBlackAndTestSourceAlpha(const void* source, int32_t sourceRowBytes,
                                                        PK_PixelFormat sourceFormat, void* dest,

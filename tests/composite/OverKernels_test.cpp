@@ -8,6 +8,7 @@
 #include "support/RowBuffer.h"
 #include "support/Samples.h"
 #include "support/Targets.h"
+#include "support/Walk.h"
 
 #include <PixelKiln/PixelFormat.h>
 
@@ -92,7 +93,7 @@ TEST_P(OverBodies, FollowTheRuleForCodesAtEveryPlaceOfARow) {
             std::vector<uint8_t> top = fRandom.Bytes(bytes), back = fRandom.Bytes(bytes);
             DrawAlphas(top, fRandom);
             DrawAlphas(back, fRandom);
-            const auto offset = static_cast<int>(4 * fRandom.Below(4));
+            const auto offset = static_cast<int>(fRandom.Below(3) ? 4 * fRandom.Below(4) : fRandom.Below(16));
             const RowBuffer expected(bytes, {Placement::kAtOffset, offset}),
                 actual(bytes, {Placement::kAtOffset, offset});
             const float opacity = kOpacities[fRandom.Below(std::size(kOpacities))];
@@ -125,6 +126,24 @@ TEST_P(OverBodies, FollowTheRuleForEveryAlphaOverEveryAlpha) {
             ASSERT_EQ(reinterpret_cast<uintptr_t>(actual.data()) % 16, 0u);
             ASSERT_EQ(expected, actual) << member.name << ", opacity " << opacity;
         }
+}
+
+// At full opacity the kernel computes in integers what the rule has in floats.
+TEST_P(OverBodies, FollowTheRuleForEveryCodeOverEveryCodeAtFullOpacity) {
+    std::vector<uint8_t> top(65536 * 4), back(top.size(), 255), expected(top.size()), actual(top.size());
+    const Member& member = kCodes[4];
+    Walk walk;
+    for (size_t code = 0; code < 256; ++code) {
+        if (walk.LeavesOut()) continue;
+        for (size_t i = 0; i < 65536; ++i) {
+            std::fill_n(&top[4 * i], 3, static_cast<uint8_t>(code));
+            top[4 * i + 3] = static_cast<uint8_t>(i);
+            std::fill_n(&back[4 * i], 3, static_cast<uint8_t>(i >> 8));
+        }
+        reference::Over8u(member.rule, ByFours(), top.data(), back.data(), expected.data(), 65536, 1);
+        Body(member)(top.data(), back.data(), actual.data(), 65536, 1);
+        ASSERT_EQ(expected, actual) << "top " << code;
+    }
 }
 
 TEST_P(OverBodies, RoundCodesByTheModeOfTheCaller) {

@@ -115,8 +115,10 @@ void Four(const OverRule& rule, const uint8_t* top, const uint8_t* back, uint8_t
 void Over8u(const OverRule& rule, bool byFours, const uint8_t* top, const uint8_t* back, uint8_t* destination,
             int32_t width, float opacity) {
     const float o = opacity + kSmall > 1 ? 1 : opacity;
-    const auto toBoundary = static_cast<int32_t>((-reinterpret_cast<uintptr_t>(destination) & 15) + 3) / 4;
-    const int32_t head = byFours ? std::min(width, toBoundary) : width, end = head + (width - head) / 4 * 4;
+    const auto address = reinterpret_cast<uintptr_t>(destination);
+    const bool hasFours = byFours && address % 4 == 0; // else no pixel begins at the boundary
+    const int32_t head = hasFours ? std::min(width, static_cast<int32_t>((-address & 15) / 4)) : width;
+    const int32_t end = head + (width - head) / 4 * 4;
     const auto alone = [&](int32_t first, int32_t last) {
         for (int64_t x = first; x < last; ++x) {
             const Pixel s = PixelAt(top, x, rule.topIsOpaque), b = PixelAt(back, x, rule.backIsOpaque);

@@ -251,12 +251,14 @@ void RunMiddleAndEnds(const EndFormula& endFormula, const Formula& formula, int6
 }
 
 /// A row of which only whole runs of kRun elements from a boundary of the destination on follow one formula, and the
-/// elements before and behind them another on the same operands.
+/// elements before and behind them another on the same operands; all of them where none begins at the boundary.
 template <int32_t kAlignment, int32_t kRun, class EndFormula, class Formula, class... Pointers>
 void RunRowWithEnds(const EndFormula& endFormula, const Formula& formula, int64_t elements, void* destination,
                     Pointers... sources) {
+    constexpr int32_t kBytes = Formula::Destination::kBytes;
+    const bool meetsBoundary = reinterpret_cast<uintptr_t>(destination) % kBytes == 0;
     const int64_t head =
-        ElementsBeforeBoundary<kAlignment, Formula::Destination::kBytes>(destination, elements);
+        meetsBoundary ? ElementsBeforeBoundary<kAlignment, kBytes>(destination, elements) : elements;
     const int64_t middle = (elements - head) / kRun * kRun;
     RunMiddleAndEnds(endFormula, formula, head, middle, elements - head - middle, typename Formula::Sources(),
                      static_cast<uint8_t*>(destination), static_cast<const uint8_t*>(sources)...);

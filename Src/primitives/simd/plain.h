@@ -313,6 +313,14 @@ inline I32 MultiplyHalvesHigh(I32 a, I32 b) {
 inline I32 AverageHalves(I32 a, I32 b) {
     return MapHalves(a, b, [](uint32_t x, uint32_t y) { return (x + y + 1) >> 1; });
 }
+/// The sum of each byte and its counterpart, at most 255.
+inline I32 AddBytes(I32 a, I32 b) {
+    uint8_t bytes[16], others[16];
+    Store(bytes, a);
+    Store(others, b);
+    for (int i = 0; i < 16; ++i) bytes[i] = static_cast<uint8_t>(Saturate(bytes[i] + others[i], 255));
+    return LoadInts(bytes);
+}
 /// The lesser of each 16-bit half and its counterpart; both are below 32768.
 inline I32 MinHalves(I32 a, I32 b) {
     return MapHalves(a, b, [](uint32_t x, uint32_t y) { return x < y ? x : y; });

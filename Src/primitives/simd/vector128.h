@@ -293,6 +293,10 @@ inline I32 MultiplyHalvesHigh(I32 a, I32 b) {
 inline I32 AverageHalves(I32 a, I32 b) {
     return {_mm_avg_epu16(a.v, b.v)};
 }
+/// The sum of each byte and its counterpart, at most 255.
+inline I32 AddBytes(I32 a, I32 b) {
+    return {_mm_adds_epu8(a.v, b.v)};
+}
 /// The lesser of each 16-bit half and its counterpart; both are below 32768.
 inline I32 MinHalves(I32 a, I32 b) {
     return {_mm_min_epi16(a.v, b.v)};

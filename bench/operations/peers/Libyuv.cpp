@@ -55,8 +55,8 @@ Run Blend(const uint8_t* source, uint8_t* back) {
 }
 
 const AddPeers add = {
-    {"Premultiplied BGRA 8u over opaque", "libyuv ARGBBlend", false, Blend},
-    {"Premultiplied BGRA 8u over premultiplied", "libyuv ARGBBlend", false, Blend},
+    {"Premultiplied BGRA 8u over opaque at full opacity", "libyuv ARGBBlend", false, Blend},
+    {"Premultiplied BGRA 8u over premultiplied at full opacity", "libyuv ARGBBlend", false, Blend},
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
