@@ -3,7 +3,9 @@
 #include "register/KernelRegister.h"
 
 #include "colour/ColourKernels.h"
+#include "composite/AlphaGainKernels.h"
 #include "composite/MaskKernels.h"
+#include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
@@ -21,11 +23,13 @@
 
 namespace PK {
 
-// Rows of planes, whatever their number.
+// Rows of planes, and rows that are summed, whatever their number.
 template <>
 inline constexpr Shape kShapeOf<PlanesRow> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<QuarterScaleKernels::Interleave> = Shape::SeveralRows;
+template <>
+inline constexpr Shape kShapeOf<SumKernels::Sum> = Shape::SeveralRows;
 
 namespace {
 
@@ -125,6 +129,34 @@ constexpr KernelRow kOperations[] = {
     Entry<&WarpBilinearKernels::blendOther>("WarpSpan_BlendOther", {Bytes(4), Bytes(4)}),
 };
 
+constexpr KernelRow kGainsAndSums[] = {
+    Entry<&AlphaGainKernels::straight8u>("AlphaGainRow_Straight8u", {Bytes(4), Bytes(4)}),
+    Entry<&AlphaGainKernels::straight32f>("AlphaGainRow_Straight32f", {Floats(4), Floats(4)}),
+    Entry<&AlphaGainKernels::premultipliedRGB8u>("AlphaGainRow_PremultipliedRGB8u", {Bytes(4), Bytes(4)}),
+    Entry<&AlphaGainKernels::premultipliedVUY8u>("AlphaGainRow_PremultipliedVUY8u", {Bytes(4), Bytes(4)}),
+    Entry<&AlphaGainKernels::premultiplied32f>("AlphaGainRow_Premultiplied32f", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 0>("StoreSumOfRows_1", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 1>("StoreSumOfRows_2", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 2>("StoreSumOfRows_3", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 3>("StoreSumOfRows_4", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 4>("StoreSumOfRows_5", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 5>("StoreSumOfRows_6", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 6>("StoreSumOfRows_7", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 7>("StoreSumOfRows_8", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 8>("StoreSumOfRows_9", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 9>("StoreSumOfRows_10", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 0>("AddSumOfRows_1", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 1>("AddSumOfRows_2", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 2>("AddSumOfRows_3", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 3>("AddSumOfRows_4", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 4>("AddSumOfRows_5", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 5>("AddSumOfRows_6", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 6>("AddSumOfRows_7", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 7>("AddSumOfRows_8", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 8>("AddSumOfRows_9", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 9>("AddSumOfRows_10", {Floats(4), Floats(4)}),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -148,6 +180,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kBridges);
     add(kPrimitives);
     add(kOperations);
+    add(kGainsAndSums);
     add(kColour);
     return all;
 }

@@ -3,6 +3,7 @@
 #include "colour/ColourKernels.h"
 #include "colour/DecodeTables.h"
 #include "composite/MaskKernels.h"
+#include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "geometry/WarpSpan.h"
@@ -175,6 +176,22 @@ KernelTrial InterleaveTrial(const KernelRow& kernel, int32_t size, Random&) {
             })};
 }
 
+/// A gain, one in four at an end or beyond what bytes can show.
+float DrawGain(Random& random) {
+    constexpr float kEnds[] = {8e-6f, 1, 0.5f, 1e30f};
+    return random.Below(4) == 0 ? kEnds[random.Below(4)] : static_cast<float>(random.Next()) * 0x1p-31f;
+}
+
+/// As many rows as the name ends in.
+KernelTrial SumTrial(const KernelRow& kernel, int32_t size, Random&) {
+    const int32_t rows = std::stoi(std::strrchr(kernel.name, '_') + 1);
+    return {std::vector<TrialRow>(Count(rows), RowOf(kernel.operands.source, size)),
+            RowOf(kernel.operands.destination, size),
+            Typed<SumKernels::Sum>([=](SumKernels::Sum run, const Sources& sources, uint8_t* destination) {
+                run(sources.data(), destination, size);
+            })};
+}
+
 KernelTrial FillTrial(const KernelRow& kernel, int32_t size, Random& random) {
     FillPattern pattern;
     random.Fill(pattern.bytes, FillPattern::kPeriod);
@@ -284,6 +301,8 @@ constexpr SpecialTrial kSpecial[] = {
     {"W210", PlanesTrial<1>},
     {"QuarterScale", InterleaveTrial, "Interleave"},
     {"Mask", MaskTrial},
+    {"AlphaGain", TrialWith<float, DrawGain>},
+    {"Sum", SumTrial},
     {"BoxBlur", BoxTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},

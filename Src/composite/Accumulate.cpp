@@ -1,0 +1,164 @@
+// PK_Accumulate: the weighted sum of any number of images.
+
+#include <PixelKiln/Accumulate.h>
+
+#include "composite/AlphaGainKernels.h"
+#include "composite/SumKernels.h"
+#include "convert/RasterFormats.h"
+#include "convert/WorkingRows.h"
+#include "frame/Arguments.h"
+#include "primitives/Dispatch.h"
+#include "primitives/Thresholds.h"
+
+#include <algorithm>
+#include <array>
+#include <cstring>
+#include <span>
+
+namespace PK {
+namespace {
+
+constexpr int32_t kLinearQuality = 5; // from which on light is summed
+
+/// The images as the caller tells them: there may be any number, so that nothing is kept for each.
+struct Summands {
+    const void* const* pixels;
+    const int32_t* rowBytes;
+    const PK_PixelFormat* formats;
+    const double* weights;
+    int32_t count;
+
+    SourceImage Image(int32_t i, int32_t width, int32_t height) const {
+        return {static_cast<const uint8_t*>(pixels[i]), rowBytes[i], formats[i], width, height};
+    }
+    float Weight(int32_t i) const { return static_cast<float>(weights[i]); }
+
+    /// Those of the images whose formats are told.
+    std::span<const PK_PixelFormat> Formats() const {
+        return {formats, formats == nullptr || count < 0 ? 0 : static_cast<size_t>(count)};
+    }
+    bool HaveNull() const {
+        if (count == 0) return false;
+        if (PK::HasNull({pixels, rowBytes, formats, weights})) return true;
+        return std::ranges::find(pixels, pixels + count, nullptr) != pixels + count;
+    }
+};
+
+/// Chains to one format, one for each format that comes up.
+class ChainsTo {
+public:
+    bool Add(PK_PixelFormat from, PK_PixelFormat to, int32_t quality) {
+        const auto added = All();
+        if (std::ranges::find(added, from, &ConversionChain::source) != added.end()) return true;
+        return fChains[fCount++].Build(from, to, quality);
+    }
+
+    const ConversionChain& From(PK_PixelFormat format) const {
+        return *std::ranges::find(All(), format, &ConversionChain::source);
+    }
+
+    std::span<const ConversionChain> All() const { return {fChains.data(), fCount}; }
+
+private:
+    std::array<ConversionChain, std::size(kRasterFormats)> fChains;
+    size_t fCount = 0;
+};
+
+/// The ways to the format that is summed in and from there, and the kernels that sum.
+class SumPlan {
+public:
+    bool Build(std::span<const PK_PixelFormat> sources, PK_PixelFormat destination, int32_t quality) {
+        fWorking =
+            quality < kLinearQuality ? PK_PixelFormat_BGRP_4444_32f : PK_PixelFormat_BGRP_4444_32f_Linear;
+        return std::ranges::all_of(
+                   sources, [&](PK_PixelFormat source) { return fIn.Add(source, fWorking, quality); }) &&
+               fOut.Build(fWorking, destination, quality);
+    }
+
+    PK_Result Run(const Summands& summands, const DestinationImage& destination) const {
+        const int32_t slots = std::min(summands.count, kMostSummands);
+        RowMemory memory(destination.width);
+        for (const ConversionChain& chain : fIn.All()) memory.AddChain(chain);
+        memory.AddChain(fOut);
+        for (int32_t row = 0; row <= slots; ++row) memory.AddRow(fWorking);
+        return memory.With([&](TemporaryRows& rows) {
+            Rows own = {};
+            const uint64_t bytes = BytesOfRow(fWorking, destination.width);
+            for (int32_t i = 0; i < slots; ++i) own.summands[i] = rows.Take(bytes);
+            own.sum = rows.Take(bytes);
+            std::memset(own.sum, 0, bytes); // the sum of no images
+            for (int32_t row = 0; row < destination.height; ++row) {
+                Sum(summands, destination, row, own, rows.Scratch());
+                fOut.ConvertRow(own.sum, destination.Row(row), destination.width, rows.Scratch());
+            }
+            return PK_Success;
+        });
+    }
+
+private:
+    struct Rows {
+        uint8_t* summands[kMostSummands];
+        uint8_t* sum; ///< Of its own, since a destination may be a source that is still to be read.
+    };
+
+    void Sum(const Summands& summands, const DestinationImage& destination, int32_t row, const Rows& own,
+             const ChainScratch& scratch) const {
+        for (int32_t first = 0; first != summands.count;) {
+            const int32_t count = std::min(summands.count - first, kMostSummands);
+            for (int32_t i = 0; i < count; ++i)
+                Weigh(summands, first + i, destination, row, own.summands[i], scratch);
+            const auto& members = first == 0 ? fSums.store : fSums.add;
+            members[count - 1](own.summands, own.sum, destination.width);
+            first += count;
+        }
+    }
+
+    /// A row of one image times its weight.
+    void Weigh(const Summands& summands, int32_t i, const DestinationImage& destination, int32_t row,
+               uint8_t* weighted, const ChainScratch& scratch) const {
+        const int32_t width = destination.width;
+        const float weight = summands.Weight(i);
+        if (kNegligible > weight) {
+            std::memset(weighted, 0, BytesOfRow(fWorking, width));
+            return;
+        }
+        const SourceImage image = summands.Image(i, width, destination.height);
+        const bool isTurned = PK_IsOriginTopLeft(image.format) != PK_IsOriginTopLeft(destination.format);
+        const SourceImage view = isTurned ? Reversed(image) : image;
+        RowSource(view, fIn.From(image.format), scratch).ConvertRow(row, weighted);
+        fScale(weighted, weighted, width, weight);
+    }
+
+    PK_PixelFormat fWorking = PK_PixelFormat_Invalid;
+    ChainsTo fIn;
+    ConversionChain fOut;
+    AlphaGainKernels::Gain fScale = Best<AlphaGainKernels>().premultiplied32f;
+    const SumKernels& fSums = Best<SumKernels>();
+};
+
+PK_Result Accumulate(const Summands& summands, const DestinationImage& destination, int32_t quality) {
+    if (!IsRasterFormat(destination.format)) return PK_ErrBadDstFormat;
+    if (!std::ranges::all_of(summands.Formats(), IsRasterFormat)) return PK_ErrBadSrcFormat;
+    if (summands.count < 0) return PK_ErrFailed;
+    if (const auto result = ResultWithoutWork(destination.width, destination.height, {destination.pixels},
+                                              BelowZero::Refused))
+        return *result;
+    if (summands.HaveNull()) return PK_ErrFailed;
+
+    SumPlan plan;
+    if (!plan.Build(summands.Formats(), destination.format, quality)) return PK_ErrFailed;
+    return plan.Run(summands, destination);
+}
+
+} // namespace
+} // namespace PK
+
+using namespace PK;
+
+PK_Result PK_Accumulate(const void* const* sources, const int32_t* sourceRowBytes,
+                        const PK_PixelFormat* sourceFormats, const double* weights, int32_t count, void* dest,
+                        int32_t destRowBytes, PK_PixelFormat destFormat, int32_t width, int32_t height,
+                        int32_t quality) noexcept {
+    return Accumulate({sources, sourceRowBytes, sourceFormats, weights, count},
+                      {static_cast<uint8_t*>(dest), destRowBytes, destFormat, width, height}, quality);
+}
