@@ -28,7 +28,7 @@ void AddGains(Calls& calls) {
         Gain(PK_PixelFormat_V210_422_10u, kBGRA, 0.7f, TakesOrRefuses("rows that are converted")));
     calls.push_back(
         Gain(kBGRA, PK_PixelFormat_ARGB_4444_32f, 0.7f, TakesOrRefuses("rows that are converted")));
-    calls.push_back(Gain(PK_PixelFormat_V210_422_10u, kBGRA, 0, TakesNone("fills")));
+    calls.push_back(Gain(kBGRA, PK_PixelFormat_VUYA_4444_8u, 0, TakesNone("fills")));
     calls.push_back({{"PK_IsOpacityNOP"}, TakesNone("compares two numbers"), {0}, [](uint8_t* block) {
                          *block = PK_IsOpacityNOP(PK_BlendMode_Normal, 1.0f);
                          return PK_Success;

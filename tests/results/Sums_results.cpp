@@ -94,6 +94,11 @@ void AddGains(Lines& lines) {
         AddScaling(lines, NameOf(to) + "/none", {to, to, 7e-6f});
     }
     AddOddGains(lines);
+    lines.Add("nop", [](Line& line) {
+        for (PK_BlendMode mode = -1; mode < 30; ++mode)
+            for (const float opacity : {0.0f, 0.99999f, 0.999993f, 1.0f, 1.000007f, 1.00001f})
+                line.results.Add(PK_IsOpacityNOP(mode, opacity));
+    });
 }
 
 constexpr PK_PixelFormat kSummed[] = {

@@ -9,11 +9,14 @@ pixel() { "$program" convert "$1" - --to BGRA_4444_8u --packed | hex | cut -c 1-
 
 expect 0 "out/mean.png: 1 frame 3x2, BGRA_4444_8u" accumulate in/black.png in/white.png out/mean.png
 is "half of the light of white" "$(pixel out/mean.png)" "bf bf bf ff" # 255 x 0.5^0.41666666 = 191.03
-expect 0 "" accumulate in/black.png in/white.png out/mean.png --quality 4
-is "half of the code of white" "$(pixel out/mean.png)" "80 80 80 ff"
-expect 0 "" accumulate in/black.png in/white.png in/red.png out/mean.png -q 4 --weights 0.5,0.2,0.3
-is "by weight" "$(pixel out/mean.png)" "33 33 80 ff" # 0.2 x 255 = 51, 0.5 x 255 = 127.5
+premultiplied=(--quality 4 --to BGRX_4444_8u) # not divided by alpha on the way
+expect 0 "" accumulate in/black.png in/white.png out/mean.png "${premultiplied[@]}"
+is "half of the code of white" "$(pixel out/mean.png)" "80 80 80 ff" # 127.5
+expect 0 "" accumulate in/black.png in/white.png in/red.png out/mean.png -q 4 --weights 0.4,0.2,0.4
+is "by weight" "$(pixel out/mean.png)" "33 33 99 ff" # 0.2 x 255 = 51, 0.6 x 255 = 153
 expect 0 "" accumulate in/black.png in/white.png out/mean.png -q 4 --weights 3,2
+is "divided by alpha" "$(pixel out/mean.png)" "66 66 66 ff" # 2 / 5 x 255 = 102
+expect 0 "" accumulate in/black.png in/white.png out/mean.png "${premultiplied[@]}" --weights 3,2
 is "beyond white" "$(pixel out/mean.png)" "ff ff ff ff"
 expect 0 "" accumulate in/red.png in/white.png out/mean.png -q 4 --weights 1,-1
 identical out/mean.png in/red.png

@@ -19,8 +19,8 @@ constexpr const char* kNotes =
     R"(Colours are added premultiplied, and at the default quality, 5, as linear light: what one would see of
 pictures shown in quick succession. At a lower quality the codes of the samples are added.
 
-Weights need not add up to 1, and what is beyond white is clipped. One that is 0 or less leaves its
-picture out.
+Weights need not add up to 1; but a sum with alpha of its own, as in a PNG without --to, is divided by that
+alpha in the end. A weight that is 0 or less leaves its picture out.
 
 Examples:
   pixelkiln accumulate shot-1.png shot-2.png shot-3.png mean.png
