@@ -101,7 +101,6 @@ Run MeanOfFive(const uint8_t* source, uint8_t* destination) {
 const AddPeers add = {
     {"Gain of BGRP 8u", "OpenCV convertTo", true, Scaled<CV_8UC4>},
     {"Gain of BGRP 32f", "OpenCV convertTo", false, Scaled<CV_32FC4>},
-    {"Mean of five BGRX 8u", "OpenCV accumulate", true, MeanOfFive<CV_8UC4>},
     {"Mean of five BGRP 8u", "OpenCV accumulate", true, MeanOfFive<CV_8UC4>},
     {"Mean of five BGRP 32f", "OpenCV accumulate", false, MeanOfFive<CV_32FC4>},
     {"Composite of two BGRA 8u by a one-bit mask", "OpenCV copyTo (mask of bytes)", false, MaskedCopy},
