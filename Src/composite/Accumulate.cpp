@@ -2,7 +2,6 @@
 
 #include <PixelKiln/Accumulate.h>
 
-#include "composite/AlphaGainKernels.h"
 #include "composite/SumKernels.h"
 #include "convert/RasterFormats.h"
 #include "convert/WorkingRows.h"
@@ -82,57 +81,64 @@ public:
         memory.AddChain(fOut);
         for (int32_t row = 0; row <= slots; ++row) memory.AddRow(fWorking);
         return memory.With([&](TemporaryRows& rows) {
-            Rows own = {};
+            Work work = {summands, destination, rows.Scratch(), {}};
             const uint64_t bytes = BytesOfRow(fWorking, destination.width);
-            for (int32_t i = 0; i < slots; ++i) own.summands[i] = rows.Take(bytes);
-            own.sum = rows.Take(bytes);
-            std::memset(own.sum, 0, bytes); // the sum of no images
+            for (int32_t i = 0; i < slots; ++i) work.own[i] = rows.Take(bytes);
+            uint8_t* const sum = rows.Take(bytes);
+            std::memset(sum, 0, bytes); // that of no images
+            // The destination may be a source, which a second group of ten would find written.
+            const bool isDirect = fOut.IsCopy() && 0 < slots && slots == summands.count;
             for (int32_t row = 0; row < destination.height; ++row) {
-                Sum(summands, destination, row, own, rows.Scratch());
-                fOut.ConvertRow(own.sum, destination.Row(row), destination.width, rows.Scratch());
+                Sum(work, row, isDirect ? destination.Row(row) : sum);
+                if (!isDirect) fOut.ConvertRow(sum, destination.Row(row), destination.width, work.scratch);
             }
             return PK_Success;
         });
     }
 
 private:
-    struct Rows {
-        uint8_t* summands[kMostSummands];
-        uint8_t* sum; ///< Of its own, since a destination may be a source that is still to be read.
+    /// The images of a run, and its rows for one group of them.
+    struct Work {
+        const Summands& summands;
+        const DestinationImage& destination;
+        ChainScratch scratch;
+        uint8_t* own[kMostSummands];
     };
 
-    void Sum(const Summands& summands, const DestinationImage& destination, int32_t row, const Rows& own,
-             const ChainScratch& scratch) const {
-        for (int32_t first = 0; first != summands.count;) {
-            const int32_t count = std::min(summands.count - first, kMostSummands);
-            for (int32_t i = 0; i < count; ++i)
-                Weigh(summands, first + i, destination, row, own.summands[i], scratch);
+    void Sum(const Work& work, int32_t row, uint8_t* sum) const {
+        for (int32_t first = 0; first != work.summands.count;) {
+            const int32_t count = std::min(work.summands.count - first, kMostSummands);
+            WeightedRow group[kMostSummands];
+            for (int32_t i = 0; i < count; ++i) group[i] = Weighted(work, first + i, row, work.own[i]);
             const auto& members = first == 0 ? fSums.store : fSums.add;
-            members[count - 1](own.summands, own.sum, destination.width);
+            members[count - 1](group, sum, work.destination.width);
             first += count;
         }
     }
 
-    /// A row of one image times its weight.
-    void Weigh(const Summands& summands, int32_t i, const DestinationImage& destination, int32_t row,
-               uint8_t* weighted, const ChainScratch& scratch) const {
-        const int32_t width = destination.width;
-        const float weight = summands.Weight(i);
+    /// A row of one image, where it lies or converted. One that is left out is zeros, and not its samples times 0: an
+    /// infinite one would make that no number.
+    WeightedRow Weighted(const Work& work, int32_t i, int32_t row, uint8_t* own) const {
+        const float weight = work.summands.Weight(i);
+        const int32_t width = work.destination.width;
         if (kNegligible > weight) {
-            std::memset(weighted, 0, BytesOfRow(fWorking, width));
-            return;
+            std::memset(own, 0, BytesOfRow(fWorking, width));
+            return {own, 1};
         }
-        const SourceImage image = summands.Image(i, width, destination.height);
-        const bool isTurned = PK_IsOriginTopLeft(image.format) != PK_IsOriginTopLeft(destination.format);
+        // As in any conversion, only between a bottom-up and a top-down format do rows change their order in memory.
+        const SourceImage image = work.summands.Image(i, width, work.destination.height);
+        const bool isTurned = PK_IsOriginTopLeft(image.format) != PK_IsOriginTopLeft(work.destination.format);
         const SourceImage view = isTurned ? Reversed(image) : image;
-        RowSource(view, fIn.From(image.format), scratch).ConvertRow(row, weighted);
-        fScale(weighted, weighted, width, weight);
+        const ConversionChain& chain = fIn.From(image.format);
+        const RowSource source(view, chain, work.scratch);
+        if (chain.IsCopy()) return {source.Row(row), weight};
+        source.ConvertRow(row, own);
+        return {own, weight};
     }
 
     PK_PixelFormat fWorking = PK_PixelFormat_Invalid;
     ChainsTo fIn;
     ConversionChain fOut;
-    AlphaGainKernels::Gain fScale = Best<AlphaGainKernels>().premultiplied32f;
     const SumKernels& fSums = Best<SumKernels>();
 };
 

@@ -1,4 +1,4 @@
-// Adds up rows of float pixels, from the first to the last, so that every body rounds alike.
+// Adds up rows of float pixels, each times its weight, from the first to the last, so that every body rounds alike.
 
 #include "composite/SumKernels.h"
 #include "primitives/lanes/RowDriver.h"
@@ -11,28 +11,36 @@ using Pixel = Each<16>;
 template <class>
 using PixelOf = Pixel;
 
-/// The sum of the pixels of all rows, stored or added to the destination.
+/// The sum of the pixels of all rows, each times the weight of its row, stored or added to the destination.
 template <class DestinationPixel, class... Pointers>
 struct Sum : Groups<kLanes, DestinationPixel, PixelOf<Pointers>...> {
-    static void Group(RowOf<Pointers>... rows, uint8_t* destination) {
+    static constexpr int kRows = sizeof...(Pointers);
+
+    explicit Sum(const WeightedRow* rows) {
+        for (int i = 0; i < kRows; ++i) fWeights[i] = Floats(rows[i].weight);
+    }
+
+    void Group(RowOf<Pointers>... rows, uint8_t* destination) const {
         constexpr int kVectorBytes = 4 * kLanes;
         for (int at = 0; at < 4 * kVectorBytes; at += kVectorBytes) {
-            const F32 sum = (... + LoadFloats(rows + at));
-            if constexpr (DestinationPixel::kIsRead)
-                Store(destination + at, LoadFloats(destination + at) + sum);
-            else
-                Store(destination + at, sum);
+            const F32 samples[] = {LoadFloats(rows + at)...};
+            F32 sum = samples[0] * fWeights[0];
+            for (int i = 1; i < kRows; ++i) sum = sum + samples[i] * fWeights[i];
+            if constexpr (DestinationPixel::kIsRead) sum = LoadFloats(destination + at) + sum;
+            Store(destination + at, sum);
         }
     }
+
+    F32 fWeights[kRows];
 };
 
 /// Takes its rows one by one out of the array.
 template <int kRows, class DestinationPixel, class... Taken>
-void SumRows(const uint8_t* const* rows, void* destination, int32_t width, Taken... taken) {
+void SumRows(const WeightedRow* rows, void* destination, int32_t width, Taken... taken) {
     if constexpr (sizeof...(Taken) == kRows)
-        RunRow(Sum<DestinationPixel, Taken...>(), width, destination, taken...);
+        RunRow(Sum<DestinationPixel, Taken...>(rows), width, destination, taken...);
     else
-        SumRows<kRows, DestinationPixel>(rows, destination, width, taken..., rows[sizeof...(Taken)]);
+        SumRows<kRows, DestinationPixel>(rows, destination, width, taken..., rows[sizeof...(Taken)].pixels);
 }
 
 template <int kRows>

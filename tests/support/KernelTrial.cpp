@@ -183,12 +183,15 @@ float DrawGain(Random& random) {
 }
 
 /// As many rows as the name ends in.
-KernelTrial SumTrial(const KernelRow& kernel, int32_t size, Random&) {
-    const int32_t rows = std::stoi(std::strrchr(kernel.name, '_') + 1);
-    return {std::vector<TrialRow>(Count(rows), RowOf(kernel.operands.source, size)),
+KernelTrial SumTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    std::vector<float> weights(std::stoul(std::strrchr(kernel.name, '_') + 1));
+    for (float& weight : weights) weight = DrawGain(random);
+    return {std::vector<TrialRow>(weights.size(), RowOf(kernel.operands.source, size)),
             RowOf(kernel.operands.destination, size),
             Typed<SumKernels::Sum>([=](SumKernels::Sum run, const Sources& sources, uint8_t* destination) {
-                run(sources.data(), destination, size);
+                std::vector<WeightedRow> rows;
+                for (size_t i = 0; i < weights.size(); ++i) rows.push_back({sources[i], weights[i]});
+                run(rows.data(), destination, size);
             })};
 }
 
