@@ -41,7 +41,7 @@ Run Mean(const uint8_t* source, uint8_t* destination) {
 
 // clang-format off: one row an operation
 const AddOperations add = {
-    {"Gain of BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Memcpy, 0.8,
+    {"Gain of BGRA 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Memcpy, 0.7,
      Gain<PK_PixelFormat_BGRA_4444_8u, 4>},
     {"Gain of BGRP 8u", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 1,
      Gain<PK_PixelFormat_BGRP_4444_8u, 4>},
