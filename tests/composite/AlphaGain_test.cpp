@@ -1,6 +1,6 @@
-// PK_AlphaGain: which samples a gain scales, in which format, and by which rounding. PK_IsOpacityNOP.
+// PK_AlphaGain: which samples a gain scales, in which format, and by which rounding.
 
-#include "composite/AlignedPicture.h"
+#include "composite/ReferenceGain.h"
 #include "convert/RasterFormats.h"
 #include "frame/Capabilities.h"
 #include "support/FlagScope.h"
@@ -39,113 +39,6 @@ Pixel Gained(PK_PixelFormat format, Pixel pixel, float gain) {
 PK_Result Gain(const AlignedPicture& from, AlignedPicture& to, float gain, int32_t quality) {
     return PK_AlphaGain(from.Pixels(), from.RowBytes(), from.format, to.Pixels(), to.RowBytes(), to.format,
                         to.width, to.height, gain, quality);
-}
-
-enum class Scaled { kAlpha8, kAll8, kAllVUY8, kAlpha32, kAll32 };
-
-struct Method {
-    PK_PixelFormat working;
-    Scaled scaled;
-};
-
-/// Format by format, as tabled.
-Method MethodOf(PK_PixelFormat destination, int32_t quality) {
-    switch (destination) {
-    case PK_PixelFormat_BGRA_4444_8u:
-    case PK_PixelFormat_VUYA_4444_8u:
-    case PK_PixelFormat_VUYA_4444_8u_709:
-        return {destination, Scaled::kAlpha8};
-    case PK_PixelFormat_BGRP_4444_8u:
-    case PK_PixelFormat_BGRX_4444_8u:
-        return {destination, Scaled::kAll8};
-    case PK_PixelFormat_VUYP_4444_8u:
-    case PK_PixelFormat_VUYX_4444_8u:
-    case PK_PixelFormat_VUYP_4444_8u_709:
-    case PK_PixelFormat_VUYX_4444_8u_709:
-        return {destination, Scaled::kAllVUY8};
-    case PK_PixelFormat_BGRA_4444_32f:
-    case PK_PixelFormat_BGRA_4444_32f_Linear:
-    case PK_PixelFormat_VUYA_4444_32f:
-    case PK_PixelFormat_VUYA_4444_32f_709:
-        return {destination, Scaled::kAlpha32};
-    case PK_PixelFormat_BGRP_4444_32f:
-    case PK_PixelFormat_BGRX_4444_32f:
-    case PK_PixelFormat_BGRP_4444_32f_Linear:
-    case PK_PixelFormat_BGRX_4444_32f_Linear:
-    case PK_PixelFormat_VUYP_4444_32f:
-    case PK_PixelFormat_VUYX_4444_32f:
-    case PK_PixelFormat_VUYP_4444_32f_709:
-    case PK_PixelFormat_VUYX_4444_32f_709:
-        return {destination, Scaled::kAll32};
-    case PK_PixelFormat_ARGB_4444_32f:
-    case PK_PixelFormat_PRGB_4444_32f:
-    case PK_PixelFormat_XRGB_4444_32f:
-    case PK_PixelFormat_ARGB_4444_32f_Linear:
-    case PK_PixelFormat_PRGB_4444_32f_Linear:
-    case PK_PixelFormat_XRGB_4444_32f_Linear:
-        return {PK_PixelFormat_BGRA_4444_32f, Scaled::kAll32};
-    case PK_PixelFormat_ARGB_4444_8u:
-    case PK_PixelFormat_PRGB_4444_8u:
-    case PK_PixelFormat_XRGB_4444_8u:
-    case PK_PixelFormat_BGRA_4444_15u:
-    case PK_PixelFormat_BGRP_4444_15u:
-    case PK_PixelFormat_BGRX_4444_15u:
-    case PK_PixelFormat_ARGB_4444_15u:
-    case PK_PixelFormat_PRGB_4444_15u:
-    case PK_PixelFormat_XRGB_4444_15u:
-    case PK_PixelFormat_RGB_444_10u:
-        return {PK_PixelFormat_BGRA_4444_8u, Scaled::kAlpha8};
-    case PK_PixelFormat_UYVY_422_32f:
-    case PK_PixelFormat_UYVY_422_32f_709:
-    case PK_PixelFormat_YUYV_422_32f:
-    case PK_PixelFormat_YUYV_422_32f_709:
-    case PK_PixelFormat_V210_422_10u:
-    case PK_PixelFormat_V210_422_10u_709:
-        if (quality >= 3) return {PK_PixelFormat_VUYP_4444_32f, Scaled::kAlpha32};
-        return {PK_PixelFormat_VUYP_4444_8u, Scaled::kAlpha8};
-    case PK_PixelFormat_UYVY_422_8u:
-    case PK_PixelFormat_UYVY_422_8u_709:
-    case PK_PixelFormat_YUYV_422_8u:
-    case PK_PixelFormat_YUYV_422_8u_709:
-        return {PK_PixelFormat_VUYP_4444_8u, Scaled::kAlpha8};
-    default:
-        ADD_FAILURE() << "no method for " << std::hex << destination;
-        return {destination, Scaled::kAll8};
-    }
-}
-
-uint8_t NearestByte(float value) {
-    return static_cast<uint8_t>(std::clamp(std::nearbyint(value), 0.0f, 255.0f));
-}
-
-void ScaleBytes(uint8_t* pixel, Scaled scaled, float gain) {
-    constexpr float kZeros[] = {128, 128, 16};
-    for (int channel = 0; channel < 3 && scaled != Scaled::kAlpha8; ++channel) {
-        const float zero = scaled == Scaled::kAllVUY8 ? kZeros[channel] : 0;
-        pixel[channel] = NearestByte((static_cast<float>(pixel[channel]) - zero) * gain + zero);
-    }
-    pixel[3] = NearestByte(static_cast<float>(pixel[3]) * gain);
-}
-
-void ScaleFloats(uint8_t* pixel, Scaled scaled, float gain) {
-    float samples[4];
-    std::memcpy(samples, pixel, sizeof samples);
-    for (int channel = scaled == Scaled::kAlpha32 ? 3 : 0; channel < 4; ++channel) samples[channel] *= gain;
-    std::memcpy(pixel, samples, sizeof samples);
-}
-
-AlignedPicture ReferenceGain(const AlignedPicture& source, PK_PixelFormat destination, float gain,
-                             int32_t quality) {
-    const Method method = MethodOf(destination, quality);
-    const bool isFloat = method.scaled == Scaled::kAlpha32 || method.scaled == Scaled::kAll32;
-    AlignedPicture working = RowsIn(method.working, source, quality);
-    for (int32_t row = 0; row < working.height; ++row)
-        for (int32_t column = 0; column < working.width; ++column)
-            if (isFloat)
-                ScaleFloats(working.Row(row) + 16 * column, method.scaled, gain);
-            else
-                ScaleBytes(working.Row(row) + 4 * column, method.scaled, gain);
-    return RowsIn(destination, working, quality);
 }
 
 class AlphaGain : public testing::Test {
@@ -425,51 +318,4 @@ TEST_F(AlphaGain, RefusesSizesAndNullPointersAndDoesNothingForNoPixels) {
     EXPECT_EQ(gain(pixels, nullptr, 1, 1), PK_ErrFailed);
     EXPECT_EQ(gain(nullptr, nullptr, 0, 1), PK_Success);
     EXPECT_EQ(gain(nullptr, nullptr, 1, 0), PK_Success);
-}
-
-TEST(OpacityNOP, IsOneInTheModesThatShowTheTopAlone) {
-    for (int32_t mode = -2; mode < 30; ++mode)
-        EXPECT_EQ(PK_IsOpacityNOP(mode, 1.0f), mode == PK_BlendMode_Dissolve || mode == PK_BlendMode_Normal)
-            << mode;
-    EXPECT_FALSE(PK_IsOpacityNOP(PK_BlendMode_Multiply, 1.0f));
-    EXPECT_TRUE(PK_IsOpacityNOP(6, 1.0f));
-    EXPECT_TRUE(PK_IsOpacityNOP(18, 1.0f));
-    EXPECT_FALSE(PK_IsOpacityNOP(INT32_MIN, 1.0f));
-}
-
-TEST(OpacityNOP, IsAsNearToOneAsDoesNotCount) {
-    for (const float opacity : {1.0f, 0.9999999f, 0.999993f, 1.000007f})
-        EXPECT_TRUE(PK_IsOpacityNOP(PK_BlendMode_Normal, opacity)) << opacity;
-    for (const float opacity : {0.99999f, 1.00001f, 0.0f, -1.0f, 2.0f, kNaN, kInfinity})
-        EXPECT_FALSE(PK_IsOpacityNOP(PK_BlendMode_Normal, opacity)) << opacity;
-}
-
-TEST(BlendModes, AreNumberedByName) {
-    EXPECT_EQ(PK_BlendMode_Color, 0);
-    EXPECT_EQ(PK_BlendMode_ColorBurn, 1);
-    EXPECT_EQ(PK_BlendMode_ColorDodge, 2);
-    EXPECT_EQ(PK_BlendMode_Darken, 3);
-    EXPECT_EQ(PK_BlendMode_DarkerColor, 4);
-    EXPECT_EQ(PK_BlendMode_Difference, 5);
-    EXPECT_EQ(PK_BlendMode_Dissolve, 6);
-    EXPECT_EQ(PK_BlendMode_Exclusion, 7);
-    EXPECT_EQ(PK_BlendMode_HardLight, 8);
-    EXPECT_EQ(PK_BlendMode_HardMix, 9);
-    EXPECT_EQ(PK_BlendMode_Hue, 10);
-    EXPECT_EQ(PK_BlendMode_Lighten, 11);
-    EXPECT_EQ(PK_BlendMode_LighterColor, 12);
-    EXPECT_EQ(PK_BlendMode_LinearBurn, 13);
-    EXPECT_EQ(PK_BlendMode_LinearDodge, 14);
-    EXPECT_EQ(PK_BlendMode_LinearLight, 15);
-    EXPECT_EQ(PK_BlendMode_Luminosity, 16);
-    EXPECT_EQ(PK_BlendMode_Multiply, 17);
-    EXPECT_EQ(PK_BlendMode_Normal, 18);
-    EXPECT_EQ(PK_BlendMode_Overlay, 19);
-    EXPECT_EQ(PK_BlendMode_PinLight, 20);
-    EXPECT_EQ(PK_BlendMode_Saturation, 21);
-    EXPECT_EQ(PK_BlendMode_Screen, 22);
-    EXPECT_EQ(PK_BlendMode_SoftLight, 23);
-    EXPECT_EQ(PK_BlendMode_VividLight, 24);
-    EXPECT_EQ(PK_BlendMode_Subtract, 25);
-    EXPECT_EQ(PK_BlendMode_Divide, 26);
 }
