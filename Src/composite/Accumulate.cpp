@@ -34,7 +34,7 @@ struct Summands {
 
     /// Those of the images whose formats are told.
     std::span<const PK_PixelFormat> Formats() const {
-        return {formats, formats == nullptr || count < 0 ? 0 : static_cast<size_t>(count)};
+        return {formats, formats == nullptr ? 0 : static_cast<size_t>(std::max(count, 0))};
     }
     bool HaveNull() const {
         if (count == 0) return false;
