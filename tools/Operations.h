@@ -9,6 +9,7 @@
 
 #include <array>
 #include <string>
+#include <vector>
 
 namespace tool {
 
@@ -35,6 +36,11 @@ struct Warp {
 };
 /// Composites the whole picture into a quadrilateral of the background, which has its format.
 void DrawWarped(const Frame& picture, const Warp& warp, Frame& background);
+
+/// The sum of pictures of one size, each times its weight.
+/// \param quality  5 sums light, less the codes of the samples.
+void AddUp(const std::vector<Frame>& pictures, const std::vector<double>& weights, int32_t quality,
+           Frame& sum);
 
 struct Stamp {
     int32_t number = 0;

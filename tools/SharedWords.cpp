@@ -23,6 +23,10 @@ void AddListing(Words& words, ListOptions& options) {
 
 void AddOutput(Words& words, PipeOptions& options) {
     words.Take("OUT", options.output, "PNG file, raw frames, or -").Required();
+    AddOutputForm(words, options);
+}
+
+void AddOutputForm(Words& words, PipeOptions& options) {
     words.Take("--png-depth", options.pngDepth, "Bits a sample of an output PNG, 8 or 16")
         .OneOf({8, 16})
         .ShowDefault();

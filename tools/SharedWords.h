@@ -17,6 +17,9 @@ void AddListing(Words& words, ListOptions& options);
 /// For commands that write frames.
 void AddOutput(Words& words, PipeOptions& options);
 
+/// The same for those that are told the name of the output in a way of their own.
+void AddOutputForm(Words& words, PipeOptions& options);
+
 /// For commands from frames to frames.
 void AddFrames(Words& words, PipeOptions& options);
 

@@ -18,7 +18,7 @@ enum class Shape : uint8_t {
     RowWithConstants,
     TwoRows,
     TwoRowsWithConstants,
-    SeveralRows, ///< Rows of planes.
+    SeveralRows, ///< Rows of planes, or rows that are summed.
     Area,        ///< Blocks, lines or spans of an image.
 };
 
@@ -93,8 +93,8 @@ inline constexpr Shape kShapeOf<TwoRowKernel> = Shape::TwoRows;
 template <class Constants>
 inline constexpr Shape kShapeOf<TwoRowKernelWith<Constants>> = Shape::TwoRowsWithConstants;
 
-/// What a pointer to the member of a family tells of the kernel.
-template <auto kMember>
+/// What a pointer to the member of a family tells of the kernel; of an array of kernels, with the place of one.
+template <auto kMember, size_t... kPlace>
 struct KernelOf;
 template <class Family, class Function, Function Family::*kMember>
 struct KernelOf<kMember> {
@@ -107,11 +107,23 @@ struct KernelOf<kMember> {
     }
 };
 
-/// The row of a kernel, given as the member of its family: Entry<&ALawKernels::toLinear16>("ALawToLinear16", ...).
-template <auto kMember>
+template <class Family, class Function, size_t kCount, Function (Family::*kMember)[kCount], size_t kPlace>
+struct KernelOf<kMember, kPlace> {
+    static constexpr Shape kShape = kShapeOf<Function>;
+    static constexpr Offer kOffer = Family::kOffer;
+    static constexpr const char* kFamily = Family::kFamily;
+
+    static AnyKernel Body(Target target) {
+        return reinterpret_cast<AnyKernel>((KernelsFor<Family>(target).*kMember)[kPlace]);
+    }
+};
+
+/// The row of a kernel, given as the member of its family: Entry<&ALawKernels::toLinear16>("ALawToLinear16", ...); and
+/// with a place for a member that is an array.
+template <auto kMember, size_t... kPlace>
 constexpr KernelRow Entry(const char* name, Operands operands = {}, Agreement agreement = {},
                           PlaceRule place = {}) {
-    using Member = KernelOf<kMember>;
+    using Member = KernelOf<kMember, kPlace...>;
     return {Member::kFamily, name, Member::kShape, Member::kOffer, Member::Body, operands, agreement, place};
 }
 

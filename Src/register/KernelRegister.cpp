@@ -3,11 +3,13 @@
 #include "register/KernelRegister.h"
 
 #include "colour/ColourKernels.h"
+#include "composite/AlphaGainKernels.h"
 #include "composite/BlackKernels.h"
 #include "composite/BlendKernels.h"
 #include "composite/MaskKernels.h"
 #include "composite/MatteKernels.h"
 #include "composite/OverKernels.h"
+#include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
@@ -25,11 +27,13 @@
 
 namespace PK {
 
-// Rows of planes, whatever their number.
+// Rows of planes, and rows that are summed, whatever their number.
 template <>
 inline constexpr Shape kShapeOf<PlanesRow> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<QuarterScaleKernels::Interleave> = Shape::SeveralRows;
+template <>
+inline constexpr Shape kShapeOf<SumKernels::Sum> = Shape::SeveralRows;
 
 namespace {
 
@@ -132,7 +136,7 @@ constexpr KernelRow kOperations[] = {
 constexpr Operand kVUYA8 = {Samples::Bytes, 4, 1, PK_PixelFormat_VUYA_4444_8u};
 
 // The order of top, back and destination.
-constexpr Operands kThreeOf(Operand pixel) {
+constexpr Operands ThreeOf(Operand pixel) {
     return {pixel, pixel, pixel};
 }
 // By fours from SSE2 on.
@@ -140,89 +144,117 @@ constexpr Agreement kByFours = DeclaredFrom(Target::sse2);
 constexpr PlaceRule kFromBoundary = {.headAlignment = 16};
 
 constexpr KernelRow kComposites[] = {
-    Entry<&OverKernels::straight8u_AA>("StraightOverRow_8u_AA", kThreeOf(kBGRA8), kByFours, kFromBoundary),
-    Entry<&OverKernels::straight8u_AX>("StraightOverRow_8u_AX", kThreeOf(kBGRA8), kByFours, kFromBoundary),
-    Entry<&OverKernels::straight8u_XA>("StraightOverRow_8u_XA", kThreeOf(kBGRA8), kByFours, kFromBoundary),
-    Entry<&OverKernels::straight8u_XX>("StraightOverRow_8u_XX", kThreeOf(kBGRA8), kByFours, kFromBoundary),
-    Entry<&OverKernels::premultiplied8u_AA>("PremultipliedOverRow_8u_AA", kThreeOf(kBGRA8), kByFours,
+    Entry<&OverKernels::straight8u_AA>("StraightOverRow_8u_AA", ThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::straight8u_AX>("StraightOverRow_8u_AX", ThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::straight8u_XA>("StraightOverRow_8u_XA", ThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::straight8u_XX>("StraightOverRow_8u_XX", ThreeOf(kBGRA8), kByFours, kFromBoundary),
+    Entry<&OverKernels::premultiplied8u_AA>("PremultipliedOverRow_8u_AA", ThreeOf(kBGRA8), kByFours,
                                             kFromBoundary),
-    Entry<&OverKernels::premultiplied8u_AX>("PremultipliedOverRow_8u_AX", kThreeOf(kBGRA8), kByFours,
+    Entry<&OverKernels::premultiplied8u_AX>("PremultipliedOverRow_8u_AX", ThreeOf(kBGRA8), kByFours,
                                             kFromBoundary),
-    Entry<&OverKernels::premultiplied8u_XA>("PremultipliedOverRow_8u_XA", kThreeOf(kBGRA8), kByFours,
+    Entry<&OverKernels::premultiplied8u_XA>("PremultipliedOverRow_8u_XA", ThreeOf(kBGRA8), kByFours,
                                             kFromBoundary),
-    Entry<&OverKernels::premultiplied8u_XX>("PremultipliedOverRow_8u_XX", kThreeOf(kBGRA8), kByFours,
+    Entry<&OverKernels::premultiplied8u_XX>("PremultipliedOverRow_8u_XX", ThreeOf(kBGRA8), kByFours,
                                             kFromBoundary),
-    Entry<&OverKernels::premultipliedYUV8u_AA>("PremultipliedYUVOverRow_8u_AA", kThreeOf(kVUYA8), kByFours,
+    Entry<&OverKernels::premultipliedYUV8u_AA>("PremultipliedYUVOverRow_8u_AA", ThreeOf(kVUYA8), kByFours,
                                                kFromBoundary),
-    Entry<&OverKernels::premultipliedYUV8u_AX>("PremultipliedYUVOverRow_8u_AX", kThreeOf(kVUYA8), kByFours,
+    Entry<&OverKernels::premultipliedYUV8u_AX>("PremultipliedYUVOverRow_8u_AX", ThreeOf(kVUYA8), kByFours,
                                                kFromBoundary),
-    Entry<&OverKernels::premultipliedYUV8u_XA>("PremultipliedYUVOverRow_8u_XA", kThreeOf(kVUYA8), kByFours,
+    Entry<&OverKernels::premultipliedYUV8u_XA>("PremultipliedYUVOverRow_8u_XA", ThreeOf(kVUYA8), kByFours,
                                                kFromBoundary),
-    Entry<&OverKernels::premultipliedYUV8u_XX>("PremultipliedYUVOverRow_8u_XX", kThreeOf(kVUYA8), kByFours,
+    Entry<&OverKernels::premultipliedYUV8u_XX>("PremultipliedYUVOverRow_8u_XX", ThreeOf(kVUYA8), kByFours,
                                                kFromBoundary),
-    Entry<&OverKernels::straight32f_AA>("StraightOverRow_32f_AA", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::straight32f_AX>("StraightOverRow_32f_AX", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::straight32f_XA>("StraightOverRow_32f_XA", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::straight32f_XX>("StraightOverRow_32f_XX", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::premultiplied32f_AA>("PremultipliedOverRow_32f_AA", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::premultiplied32f_AX>("PremultipliedOverRow_32f_AX", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::premultiplied32f_XA>("PremultipliedOverRow_32f_XA", kThreeOf(kBGRA32f)),
-    Entry<&OverKernels::premultiplied32f_XX>("PremultipliedOverRow_32f_XX", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::color>("BlendRow_Color", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::colorBurn>("BlendRow_ColorBurn", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::colorDodge>("BlendRow_ColorDodge", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::darken>("BlendRow_Darken", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::darkerColor>("BlendRow_DarkerColor", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::difference>("BlendRow_Difference", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::exclusion>("BlendRow_Exclusion", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::hardLight>("BlendRow_HardLight", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::hardMix>("BlendRow_HardMix", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::hue>("BlendRow_Hue", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::lighten>("BlendRow_Lighten", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::lighterColor>("BlendRow_LighterColor", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::linearBurn>("BlendRow_LinearBurn", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::linearDodge>("BlendRow_LinearDodge", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::linearLight>("BlendRow_LinearLight", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::luminosity>("BlendRow_Luminosity", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::multiply>("BlendRow_Multiply", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::normal>("BlendRow_Normal", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::overlay>("BlendRow_Overlay", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::pinLight>("BlendRow_PinLight", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::saturation>("BlendRow_Saturation", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::screen>("BlendRow_Screen", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::softLight>("BlendRow_SoftLight", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::vividLight>("BlendRow_VividLight", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::subtract>("BlendRow_Subtract", kThreeOf(kBGRA32f)),
-    Entry<&BlendKernels::divide>("BlendRow_Divide", kThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_AA>("StraightOverRow_32f_AA", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_AX>("StraightOverRow_32f_AX", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_XA>("StraightOverRow_32f_XA", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::straight32f_XX>("StraightOverRow_32f_XX", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_AA>("PremultipliedOverRow_32f_AA", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_AX>("PremultipliedOverRow_32f_AX", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_XA>("PremultipliedOverRow_32f_XA", ThreeOf(kBGRA32f)),
+    Entry<&OverKernels::premultiplied32f_XX>("PremultipliedOverRow_32f_XX", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::color>("BlendRow_Color", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::colorBurn>("BlendRow_ColorBurn", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::colorDodge>("BlendRow_ColorDodge", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::darken>("BlendRow_Darken", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::darkerColor>("BlendRow_DarkerColor", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::difference>("BlendRow_Difference", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::exclusion>("BlendRow_Exclusion", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::hardLight>("BlendRow_HardLight", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::hardMix>("BlendRow_HardMix", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::hue>("BlendRow_Hue", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::lighten>("BlendRow_Lighten", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::lighterColor>("BlendRow_LighterColor", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::linearBurn>("BlendRow_LinearBurn", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::linearDodge>("BlendRow_LinearDodge", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::linearLight>("BlendRow_LinearLight", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::luminosity>("BlendRow_Luminosity", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::multiply>("BlendRow_Multiply", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::normal>("BlendRow_Normal", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::overlay>("BlendRow_Overlay", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::pinLight>("BlendRow_PinLight", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::saturation>("BlendRow_Saturation", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::screen>("BlendRow_Screen", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::softLight>("BlendRow_SoftLight", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::vividLight>("BlendRow_VividLight", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::subtract>("BlendRow_Subtract", ThreeOf(kBGRA32f)),
+    Entry<&BlendKernels::divide>("BlendRow_Divide", ThreeOf(kBGRA32f)),
 };
 
-constexpr Operands kTwoOf(Operand pixel) {
+constexpr Operands TwoOf(Operand pixel) {
     return {pixel, pixel};
 }
 constexpr Operand kBGRA15 = {Samples::Words, 8, 1, PK_PixelFormat_BGRA_4444_15u};
 
 constexpr KernelRow kMattes[] = {
-    Entry<&BlackKernels::rgb8u>("OverBlackRow_RGB8u", kTwoOf(kBGRA8)),
-    Entry<&BlackKernels::rgb8uAlphaFirst>("OverBlackRow_RGB8u_AlphaFirst", kTwoOf(kBGRA8)),
-    Entry<&BlackKernels::yuv8u>("OverBlackRow_YUV8u", kTwoOf(kVUYA8), kByFours, kFromBoundary),
-    Entry<&BlackKernels::floats>("OverBlackRow_32f", kTwoOf(kBGRA32f)),
-    Entry<&BlackKernels::floatsAlphaFirst>("OverBlackRow_32f_AlphaFirst", kTwoOf(kBGRA32f)),
+    Entry<&BlackKernels::rgb8u>("OverBlackRow_RGB8u", TwoOf(kBGRA8)),
+    Entry<&BlackKernels::rgb8uAlphaFirst>("OverBlackRow_RGB8u_AlphaFirst", TwoOf(kBGRA8)),
+    Entry<&BlackKernels::yuv8u>("OverBlackRow_YUV8u", TwoOf(kVUYA8), kByFours, kFromBoundary),
+    Entry<&BlackKernels::floats>("OverBlackRow_32f", TwoOf(kBGRA32f)),
+    Entry<&BlackKernels::floatsAlphaFirst>("OverBlackRow_32f_AlphaFirst", TwoOf(kBGRA32f)),
     Entry<&AlphaTestKernels::codes>("TestAlphaRow_8u", {kBGRA8, Integers(1)}),
     Entry<&AlphaTestKernels::codesAlphaFirst>("TestAlphaRow_8u_AlphaFirst", {kBGRA8, Integers(1)}),
     Entry<&AlphaTestKernels::floats>("TestAlphaRow_32f", {kBGRA32f, Integers(1)}),
     Entry<&AlphaTestKernels::floatsAlphaFirst>("TestAlphaRow_32f_AlphaFirst", {kBGRA32f, Integers(1)}),
-    Entry<&MatteKernels::complement8u>("MatteComplementRow_8u", kTwoOf(kBGRA8)),
-    Entry<&MatteKernels::complement8uAlphaFirst>("MatteComplementRow_8u_AlphaFirst", kTwoOf(kBGRA8)),
-    Entry<&MatteKernels::complement15u>("MatteComplementRow_15u", kTwoOf(kBGRA15)),
-    Entry<&MatteKernels::complement15uAlphaFirst>("MatteComplementRow_15u_AlphaFirst", kTwoOf(kBGRA15)),
-    Entry<&MatteKernels::complement32f>("MatteComplementRow_32f", kTwoOf(kBGRA32f)),
-    Entry<&MatteKernels::complement32fAlphaFirst>("MatteComplementRow_32f_AlphaFirst", kTwoOf(kBGRA32f)),
-    Entry<&MatteKernels::remove8u>("RemoveMatteRow_8u", kThreeOf(kBGRA8)),
-    Entry<&MatteKernels::remove8uAlphaFirst>("RemoveMatteRow_8u_AlphaFirst", kThreeOf(kBGRA8)),
-    Entry<&MatteKernels::remove15u>("RemoveMatteRow_15u", kThreeOf(kBGRA15)),
-    Entry<&MatteKernels::remove15uAlphaFirst>("RemoveMatteRow_15u_AlphaFirst", kThreeOf(kBGRA15)),
-    Entry<&MatteKernels::remove32f>("RemoveMatteRow_32f", kThreeOf(kBGRA32f)),
-    Entry<&MatteKernels::remove32fAlphaFirst>("RemoveMatteRow_32f_AlphaFirst", kThreeOf(kBGRA32f)),
+    Entry<&MatteKernels::complement8u>("MatteComplementRow_8u", TwoOf(kBGRA8)),
+    Entry<&MatteKernels::complement8uAlphaFirst>("MatteComplementRow_8u_AlphaFirst", TwoOf(kBGRA8)),
+    Entry<&MatteKernels::complement15u>("MatteComplementRow_15u", TwoOf(kBGRA15)),
+    Entry<&MatteKernels::complement15uAlphaFirst>("MatteComplementRow_15u_AlphaFirst", TwoOf(kBGRA15)),
+    Entry<&MatteKernels::complement32f>("MatteComplementRow_32f", TwoOf(kBGRA32f)),
+    Entry<&MatteKernels::complement32fAlphaFirst>("MatteComplementRow_32f_AlphaFirst", TwoOf(kBGRA32f)),
+    Entry<&MatteKernels::remove8u>("RemoveMatteRow_8u", ThreeOf(kBGRA8)),
+    Entry<&MatteKernels::remove8uAlphaFirst>("RemoveMatteRow_8u_AlphaFirst", ThreeOf(kBGRA8)),
+    Entry<&MatteKernels::remove15u>("RemoveMatteRow_15u", ThreeOf(kBGRA15)),
+    Entry<&MatteKernels::remove15uAlphaFirst>("RemoveMatteRow_15u_AlphaFirst", ThreeOf(kBGRA15)),
+    Entry<&MatteKernels::remove32f>("RemoveMatteRow_32f", ThreeOf(kBGRA32f)),
+    Entry<&MatteKernels::remove32fAlphaFirst>("RemoveMatteRow_32f_AlphaFirst", ThreeOf(kBGRA32f)),
+};
+
+constexpr KernelRow kGainsAndSums[] = {
+    Entry<&AlphaGainKernels::straight8u>("AlphaGainRow_Straight8u", {Bytes(4), Bytes(4)}),
+    Entry<&AlphaGainKernels::straight32f>("AlphaGainRow_Straight32f", {Floats(4), Floats(4)}),
+    Entry<&AlphaGainKernels::premultipliedRGB8u>("AlphaGainRow_PremultipliedRGB8u", {Bytes(4), Bytes(4)}),
+    Entry<&AlphaGainKernels::premultipliedVUY8u>("AlphaGainRow_PremultipliedVUY8u", {Bytes(4), Bytes(4)}),
+    Entry<&AlphaGainKernels::premultiplied32f>("AlphaGainRow_Premultiplied32f", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 0>("StoreSumOfRows_1", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 1>("StoreSumOfRows_2", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 2>("StoreSumOfRows_3", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 3>("StoreSumOfRows_4", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 4>("StoreSumOfRows_5", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 5>("StoreSumOfRows_6", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 6>("StoreSumOfRows_7", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 7>("StoreSumOfRows_8", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 8>("StoreSumOfRows_9", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::store, 9>("StoreSumOfRows_10", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 0>("AddSumOfRows_1", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 1>("AddSumOfRows_2", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 2>("AddSumOfRows_3", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 3>("AddSumOfRows_4", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 4>("AddSumOfRows_5", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 5>("AddSumOfRows_6", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 6>("AddSumOfRows_7", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 7>("AddSumOfRows_8", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 8>("AddSumOfRows_9", {Floats(4), Floats(4)}),
+    Entry<&SumKernels::add, 9>("AddSumOfRows_10", {Floats(4), Floats(4)}),
 };
 
 constexpr KernelRow kColour[] = {
@@ -250,6 +282,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kOperations);
     add(kComposites);
     add(kMattes);
+    add(kGainsAndSums);
     add(kColour);
     return all;
 }

@@ -3,6 +3,7 @@
 /// \file
 /// The whole exported interface.
 
+#include <PixelKiln/Accumulate.h>
 #include <PixelKiln/BlendMode.h>
 #include <PixelKiln/BoxBlur.h>
 #include <PixelKiln/Buffers.h>

@@ -5,6 +5,7 @@
 #include "composite/BlackKernels.h"
 #include "composite/MaskKernels.h"
 #include "composite/MatteKernels.h"
+#include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "geometry/WarpSpan.h"
@@ -194,6 +195,25 @@ KernelTrial InterleaveTrial(const KernelRow& kernel, int32_t size, Random&) {
             })};
 }
 
+/// A gain, one in four at an end or beyond what bytes can show.
+float DrawGain(Random& random) {
+    constexpr float kEnds[] = {8e-6f, 1, 0.5f, 1e30f};
+    return random.Below(4) == 0 ? kEnds[random.Below(4)] : static_cast<float>(random.Next()) * 0x1p-31f;
+}
+
+/// As many rows as the name ends in.
+KernelTrial SumTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    std::vector<float> weights(std::stoul(std::strrchr(kernel.name, '_') + 1));
+    for (float& weight : weights) weight = DrawGain(random);
+    return {std::vector<TrialRow>(weights.size(), RowOf(kernel.operands.source, size)),
+            RowOf(kernel.operands.destination, size),
+            Typed<SumKernels::Sum>([=](SumKernels::Sum run, const Sources& sources, uint8_t* destination) {
+                std::vector<WeightedRow> rows;
+                for (size_t i = 0; i < weights.size(); ++i) rows.push_back({sources[i], weights[i]});
+                run(rows.data(), destination, size);
+            })};
+}
+
 KernelTrial FillTrial(const KernelRow& kernel, int32_t size, Random& random) {
     FillPattern pattern;
     random.Fill(pattern.bytes, FillPattern::kPeriod);
@@ -309,6 +329,8 @@ constexpr SpecialTrial kSpecial[] = {
     {"Matte", TwoRowTrial},
     {"Over", TwoRowTrialWith<float, DrawAmount>},
     {"Blend", TwoRowTrialWith<float, DrawAmount>},
+    {"AlphaGain", TrialWith<float, DrawGain>},
+    {"Sum", SumTrial},
     {"BoxBlur", BoxTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},

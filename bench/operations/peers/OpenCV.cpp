@@ -6,6 +6,8 @@
 #include <opencv2/core.hpp>
 #include <opencv2/imgproc.hpp>
 
+#include <vector>
+
 namespace OperationBench {
 namespace {
 
@@ -74,7 +76,33 @@ Run MaskedCopy(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+template <int kType>
+Run Scaled(const uint8_t* source, uint8_t* destination) {
+    return [from = Upright(source, kType), to = Upright(destination, kType)] {
+        from.convertTo(to, kType, 0.7F);
+    };
+}
+
+constexpr int kImages = 5;
+
+/// One after the other into a float image, as it has no sum of several.
+template <int kType>
+Run MeanOfFive(const uint8_t* source, uint8_t* destination) {
+    std::vector<cv::Mat> images;
+    const size_t bytes = CV_ELEM_SIZE(kType) * static_cast<size_t>(kPixels);
+    for (size_t i = 0; i < kImages; ++i) images.push_back(Upright(source + i * bytes, kType));
+    return [images, sum = cv::Mat(kHeight, kWidth, CV_32FC4), to = Upright(destination, kType)] {
+        images[0].convertTo(sum, CV_32F);
+        for (size_t i = 1; i < kImages; ++i) cv::accumulate(images[i], sum);
+        sum.convertTo(to, kType, 1.0 / kImages);
+    };
+}
+
 const AddPeers add = {
+    {"Gain of BGRP 8u", "OpenCV convertTo", true, Scaled<CV_8UC4>},
+    {"Gain of BGRP 32f", "OpenCV convertTo", false, Scaled<CV_32FC4>},
+    {"Mean of five BGRP 8u", "OpenCV accumulate", true, MeanOfFive<CV_8UC4>},
+    {"Mean of five BGRP 32f", "OpenCV accumulate", false, MeanOfFive<CV_32FC4>},
     {"Composite of two BGRA 8u by a one-bit mask", "OpenCV copyTo (mask of bytes)", false, MaskedCopy},
     {"RGB 8u to BGRA 8u", "OpenCV cvtColor", true, FromRGB},
     {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose<CV_8UC4>},
