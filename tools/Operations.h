@@ -36,6 +36,10 @@ struct Warp {
 /// Composites the whole picture into a quadrilateral of the background, which has its format.
 void DrawWarped(const Frame& picture, const Warp& warp, Frame& background);
 
+/// A mix of two pictures of one size in the format of the first.
+/// \param ratio  0 is the first alone, 1 the second.
+Frame Dissolved(const Frame& first, const Frame& second, float ratio, int32_t quality);
+
 struct Stamp {
     int32_t number = 0;
     PK_Point at = {};    ///< as fractions of width and height

@@ -3,6 +3,7 @@
 #include "register/KernelRegister.h"
 
 #include "colour/ColourKernels.h"
+#include "composite/DissolveKernels.h"
 #include "composite/MaskKernels.h"
 #include "convert/BridgeKernels.h"
 #include "convert/KernelTable.h"
@@ -125,6 +126,26 @@ constexpr KernelRow kOperations[] = {
     Entry<&WarpBilinearKernels::blendOther>("WarpSpan_BlendOther", {Bytes(4), Bytes(4)}),
 };
 
+constexpr Operands Mixed(Operand samples) {
+    return {samples, samples, samples};
+}
+
+constexpr KernelRow kDissolves[] = {
+    Entry<&DissolveKernels::opaque8u>("DissolveOpaqueRow_BGRX_8u", Mixed(Bytes(4))),
+    Entry<&DissolveKernels::opaque15u>("DissolveOpaqueRow_BGRX_15u", Mixed(Words(4))),
+    Entry<&DissolveKernels::opaque32f>("DissolveOpaqueRow_BGRX_32f", Mixed(Floats(4))),
+    Entry<&DissolveKernels::opaqueAlphaFirst8u>("DissolveOpaqueRow_XRGB_8u", Mixed(Bytes(4))),
+    Entry<&DissolveKernels::opaqueAlphaFirst15u>("DissolveOpaqueRow_XRGB_15u", Mixed(Words(4))),
+    Entry<&DissolveKernels::opaqueAlphaFirst32f>("DissolveOpaqueRow_XRGB_32f", Mixed(Floats(4))),
+    Entry<&DissolveKernels::straight8u>("DissolveStraightRow_8u", Mixed(Bytes(4))),
+    Entry<&DissolveKernels::straight15u>("DissolveStraightRow_15u", Mixed(Words(4))),
+    Entry<&DissolveKernels::straight32f>("DissolveStraightRow_32f", Mixed(Floats(4))),
+    Entry<&DissolveKernels::premultiplied8u>("DissolvePremultipliedRow_8u", Mixed(Bytes(4))),
+    Entry<&DissolveKernels::premultiplied15u>("DissolvePremultipliedRow_15u", Mixed(Words(4))),
+    Entry<&DissolveKernels::premultiplied32f>("DissolvePremultipliedRow_32f", Mixed(Floats(4))),
+    Entry<&DissolveKernels::v210>("DissolveRow_V210", Mixed(kV210)),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -148,6 +169,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kBridges);
     add(kPrimitives);
     add(kOperations);
+    add(kDissolves);
     add(kColour);
     return all;
 }

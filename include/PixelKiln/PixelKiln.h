@@ -8,6 +8,7 @@
 #include <PixelKiln/CodecBridges.h>
 #include <PixelKiln/ColorSpace.h>
 #include <PixelKiln/Convert.h>
+#include <PixelKiln/CrossDissolve.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Overlay.h>

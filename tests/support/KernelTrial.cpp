@@ -284,6 +284,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"W210", PlanesTrial<1>},
     {"QuarterScale", InterleaveTrial, "Interleave"},
     {"Mask", MaskTrial},
+    {"Dissolve", TwoRowTrialWith<float, DrawAmount>},
     {"BoxBlur", BoxTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},
