@@ -8,6 +8,7 @@
 #include "convert/BridgeKernels.h"
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
+#include "filters/DeinterlaceKernels.h"
 #include "geometry/WarpSpan.h"
 #include "primitives/ALaw.h"
 #include "primitives/BlockTransforms.h"
@@ -146,6 +147,15 @@ constexpr KernelRow kDissolves[] = {
     Entry<&DissolveKernels::v210>("DissolveRow_V210", Mixed(kV210)),
 };
 
+constexpr KernelRow kDeinterlacing[] = {
+    Entry<&DeinterlaceKernels::alphaLast8u>("InterpolateFieldRow_BGRP_8u", Mixed(Bytes(4))),
+    Entry<&DeinterlaceKernels::alphaLast15u>("InterpolateFieldRow_BGRP_15u", Mixed(Words(4))),
+    Entry<&DeinterlaceKernels::alphaLast32f>("InterpolateFieldRow_BGRP_32f", Mixed(Floats(4))),
+    Entry<&DeinterlaceKernels::alphaFirst8u>("InterpolateFieldRow_PRGB_8u", Mixed(Bytes(4))),
+    Entry<&DeinterlaceKernels::alphaFirst15u>("InterpolateFieldRow_PRGB_15u", Mixed(Words(4))),
+    Entry<&DeinterlaceKernels::alphaFirst32f>("InterpolateFieldRow_PRGB_32f", Mixed(Floats(4))),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -170,6 +180,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kPrimitives);
     add(kOperations);
     add(kDissolves);
+    add(kDeinterlacing);
     add(kColour);
     return all;
 }

@@ -9,6 +9,7 @@
 #include <PixelKiln/ColorSpace.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/CrossDissolve.h>
+#include <PixelKiln/Deinterlace.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Overlay.h>

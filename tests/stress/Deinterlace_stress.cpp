@@ -1,0 +1,60 @@
+// Fields rebuilt in place and beside, by both methods.
+
+#include "stress/Calls.h"
+#include "stress/Operation.h"
+
+#include <PixelKiln/Deinterlace.h>
+
+namespace {
+
+using namespace PKStress;
+
+struct Rebuilding {
+    PK_PixelFormat source, destination;
+    int32_t width = 97, height = 33; // odd: ends of rows take part
+};
+
+constexpr Rebuilding kRebuildings[] = {
+    {PK_PixelFormat_BGRP_4444_8u, PK_PixelFormat_BGRP_4444_8u},
+    {PK_PixelFormat_UYVY_422_8u, PK_PixelFormat_UYVY_422_8u},
+    {PK_PixelFormat_V210_422_10u, PK_PixelFormat_V210_422_10u},
+    {PK_PixelFormat_PRGB_4444_15u, PK_PixelFormat_BGRA_4444_8u},
+    {PK_PixelFormat_UYVY_422_8u, PK_PixelFormat_VUYP_4444_32f, 17001, 4}, // scratch rows of the recycler
+};
+
+int32_t RowBytes(PK_PixelFormat format, int32_t width) {
+    return PK_PixelFormatRowBytes(format, width);
+}
+
+Call Beside(const Rebuilding& rebuilding, int32_t quality, PKTest::Random& random) {
+    const auto [from, to, width, height] = rebuilding;
+    return {RandomImage(to, width, height, random),
+            [=, source = RandomImage(from, width, height, random), from = from, to = to, width = width,
+             height = height](uint8_t* image) {
+                return PK_DeinterlaceCopy(source.data(), RowBytes(from, width), from, image,
+                                          RowBytes(to, width), to, width, height, 1, quality);
+            }};
+}
+
+Call InPlace(const Rebuilding& rebuilding, int32_t quality, PKTest::Random& random) {
+    const auto [format, unused, width, height] = rebuilding;
+    return {RandomImage(format, width, height, random),
+            [=, format = format, width = width, height = height](uint8_t* image) {
+                return PK_Deinterlace(image, RowBytes(format, width), format, width, height, 0, quality);
+            }};
+}
+
+std::function<bool()> Prepare() {
+    PKTest::Random random(63);
+    std::vector<Call> calls;
+    for (const Rebuilding& rebuilding : kRebuildings)
+        for (const int32_t quality : {3, 4}) {
+            calls.push_back(Beside(rebuilding, quality, random));
+            calls.push_back(InPlace(rebuilding, quality, random));
+        }
+    return Repeat(calls);
+}
+
+const Operation sDeinterlace("deinterlace", Prepare);
+
+} // namespace
