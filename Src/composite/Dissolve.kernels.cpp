@@ -19,10 +19,18 @@ struct Codes : Layout {
     static Pixels Get(const uint8_t* source) { return Layout::LoadCodes(source); }
     static void Put(uint8_t* destination, Pixels pixels) { Layout::StoreCodes(destination, pixels); }
     static F32 Value(I32 code) { return ToFloat(code); }
-    static I32 FromValue(F32 value) { return NearestCode<kOpaque>(value); }
+    static I32 FromValue(F32 value) {
+        if constexpr (kOpaque == 255)
+            return Nearest(value); // which the store limits
+        else
+            return NearestCode<kOpaque>(value);
+    }
     static I32 Opaque() { return Ints(kOpaque); }
     static I32 IsClear(I32 alpha) { return Equal(alpha, Ints(0)); }
     static I32 AreEqual(I32 a, I32 b) { return Equal(a, b); }
+
+    /// Below 0 where two alphas differ or are 0.
+    static I32 IsUneven(I32 a, I32 b) { return (Ints(0) - (a ^ b)) | (a - Ints(1)); }
 };
 
 template <class Layout>
@@ -37,6 +45,7 @@ struct Floating : Layout {
     static F32 Opaque() { return Floats(1); }
     static I32 IsClear(F32 alpha) { return Less(alpha, Floats(kNegligible)); }
     static I32 AreEqual(F32 a, F32 b) { return Less(Max(a - b, b - a), Floats(kNegligible)); }
+    static I32 IsUneven(F32 a, F32 b) { return Not(AreEqual(a, b)) | IsClear(a) | IsClear(b); }
 };
 
 using Depth8u = Codes<Pixels8<>>;
@@ -103,11 +112,8 @@ struct Straight : Mixing<Depth> {
 
     void Group(const uint8_t* first, const uint8_t* second, uint8_t* destination) const {
         const auto a = Depth::Get(first), b = Depth::Get(second);
-        const Transparency<Depth> clear(a.c3, b.c3);
-        const I32 areEqual = Depth::AreEqual(a.c3, b.c3);
-        const I32 isPlain = areEqual & Not(clear.ofFirst | clear.ofSecond);
-        if (AnyNegative(Not(isPlain)))
-            Depth::Put(destination, Weighted(a, b, clear, areEqual));
+        if (AnyNegative(Depth::IsUneven(a.c3, b.c3)))
+            Depth::Put(destination, Weighted(a, b));
         else
             Depth::Put(destination, this->MixedColours(a, b, a.c3));
     }
@@ -116,7 +122,9 @@ private:
     using Sample = typename Depth::Sample;
     using Pixels = typename Depth::Pixels;
 
-    Pixels Weighted(const Pixels& a, const Pixels& b, const Transparency<Depth>& clear, I32 areEqual) const {
+    Pixels Weighted(const Pixels& a, const Pixels& b) const {
+        const Transparency<Depth> clear(a.c3, b.c3);
+        const I32 areEqual = Depth::AreEqual(a.c3, b.c3);
         const F32 firstAlpha = Depth::Value(a.c3) * this->w, secondAlpha = Depth::Value(b.c3) * this->r;
         const F32 sum = firstAlpha + secondAlpha;
         // A host may have unmasked exceptions, and the sum is 0 only where it is not used.

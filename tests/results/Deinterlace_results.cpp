@@ -65,11 +65,11 @@ void AddFormat(Lines& lines, PK_PixelFormat format) {
                 for (const Shape& shape : kShapes)
                     Rebuilding{format, format, field, quality}.MakeInPlace(line, shape);
             });
-            lines.Add(name + "/copies", [&](Line& line) {
-                for (const PK_PixelFormat source : sources)
+            for (const PK_PixelFormat source : sources)
+                lines.Add(name + "/" + NameOf(source), [&](Line& line) {
                     for (const Shape& shape : kShapes)
                         Rebuilding{source, format, field, quality}.Make(line, shape);
-            });
+                });
             lines.Add(name + "/down", [&](Line& line) {
                 for (const Shape& shape : kShapes)
                     Rebuilding{format, format, field, quality, Content::kOrdinary, RoundingMode::kDown}
