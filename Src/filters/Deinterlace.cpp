@@ -74,12 +74,12 @@ private:
 };
 
 PK_Result RebuildByMeans(const SourceImage& source, const DestinationImage& destination, int32_t field) {
-    const auto [kernel, working] =
+    const DissolveChoice choice =
         ChooseDissolve({source.format, source.format, destination.format}, kConversionQuality);
     FieldPlan plan;
-    if (!plan.Build(source.format, working, destination.format)) return PK_ErrFailed;
-    const auto mean = [kernel = kernel](const uint8_t* above, const uint8_t* below, uint8_t* row,
-                                        int32_t width) { kernel(above, below, row, width, kHalf); };
+    if (!plan.Build(source.format, choice.working, destination.format)) return PK_ErrFailed;
+    const auto mean = [mix = choice.kernel](const uint8_t* above, const uint8_t* below, uint8_t* row,
+                                            int32_t width) { mix(above, below, row, width, kHalf); };
     return plan.Run(FieldsOf(source, destination, field != 0), mean);
 }
 

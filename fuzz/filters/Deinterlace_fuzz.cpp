@@ -65,7 +65,7 @@ void FuzzDeinterlace(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
     const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const Request request = {DrawSize(stream), stream.BetweenOrAny(0, 2, 8), stream.BetweenOrAny(0, 5, 8)};
-    const auto [width, height] = request.size;
+    const Size size = request.size;
     const PK_PixelFormat format = DrawFormat(stream);
     const bool isInPlace = stream.Bool();
     const PK_PixelFormat from = isInPlace || stream.Bool() ? format : DrawFormat(stream);
@@ -77,12 +77,12 @@ void FuzzDeinterlace(ByteStream& stream) {
             Words(format) + ", " + Words(request.size) + ", field " + std::to_string(request.field) +
             ", quality " + std::to_string(request.quality));
 
-    const PK_Result result = CallIn(state, [&, width = width, height = height] {
+    const PK_Result result = CallIn(state, [&] {
         if (isInPlace)
-            return PK_Deinterlace(pixels, image.RowBytes(), format, width, height, request.field,
+            return PK_Deinterlace(pixels, image.RowBytes(), format, size.width, size.height, request.field,
                                   request.quality);
         return PK_DeinterlaceCopy(source.Pixels(), source.RowBytes(), from, pixels, image.RowBytes(), format,
-                                  width, height, request.field, request.quality);
+                                  size.width, size.height, request.field, request.quality);
     });
     PK_Result expected = ResultOfRows(request.size, isNull);
     if (!IsTaken(format)) expected = PK_ErrBadDstFormat;

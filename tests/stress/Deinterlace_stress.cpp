@@ -22,25 +22,23 @@ constexpr Rebuilding kRebuildings[] = {
     {PK_PixelFormat_UYVY_422_8u, PK_PixelFormat_VUYP_4444_32f, 17001, 4}, // scratch rows of the recycler
 };
 
-int32_t RowBytes(PK_PixelFormat format, int32_t width) {
-    return PK_PixelFormatRowBytes(format, width);
-}
-
 Call Beside(const Rebuilding& rebuilding, int32_t quality, PKTest::Random& random) {
-    const auto [from, to, width, height] = rebuilding;
-    return {RandomImage(to, width, height, random),
-            [=, source = RandomImage(from, width, height, random), from = from, to = to, width = width,
-             height = height](uint8_t* image) {
-                return PK_DeinterlaceCopy(source.data(), RowBytes(from, width), from, image,
-                                          RowBytes(to, width), to, width, height, 1, quality);
+    return {RandomImage(rebuilding.destination, rebuilding.width, rebuilding.height, random),
+            [=, source = RandomImage(rebuilding.source, rebuilding.width, rebuilding.height, random)](
+                uint8_t* image) {
+                const auto rowBytes = [&](PK_PixelFormat format) {
+                    return PK_PixelFormatRowBytes(format, rebuilding.width);
+                };
+                return PK_DeinterlaceCopy(source.data(), rowBytes(rebuilding.source), rebuilding.source,
+                                          image, rowBytes(rebuilding.destination), rebuilding.destination,
+                                          rebuilding.width, rebuilding.height, 1, quality);
             }};
 }
 
 Call InPlace(const Rebuilding& rebuilding, int32_t quality, PKTest::Random& random) {
-    const auto [format, unused, width, height] = rebuilding;
-    return {RandomImage(format, width, height, random),
-            [=, format = format, width = width, height = height](uint8_t* image) {
-                return PK_Deinterlace(image, RowBytes(format, width), format, width, height, 0, quality);
+    return {RandomImage(rebuilding.source, rebuilding.width, rebuilding.height, random), [=](uint8_t* image) {
+                return PK_Deinterlace(image, PK_PixelFormatRowBytes(rebuilding.source, rebuilding.width),
+                                      rebuilding.source, rebuilding.width, rebuilding.height, 0, quality);
             }};
 }
 
