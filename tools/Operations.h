@@ -42,6 +42,13 @@ void DrawWarped(const Frame& picture, const Warp& warp, Frame& background);
 void AddUp(const std::vector<Frame>& pictures, const std::vector<double>& weights, int32_t quality,
            Frame& sum);
 
+/// A mix of two pictures of one size in the format of the first.
+/// \param ratio  0 is the first alone, 1 the second.
+Frame Dissolved(const Frame& first, const Frame& second, float ratio, int32_t quality);
+
+/// Rebuilds one field from the other; field and quality as PK_Deinterlace has them.
+void Deinterlace(Frame& frame, int32_t field, int32_t quality);
+
 struct Stamp {
     int32_t number = 0;
     PK_Point at = {};    ///< as fractions of width and height

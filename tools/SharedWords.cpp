@@ -9,6 +9,22 @@ without it is BGRA, with 16 bits a sample as float. Directions and places are th
 one sees it, from its top left corner.
 )";
 
+void AddRawFrames(Words& words, PipeOptions& options) {
+    words.Take("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
+    words.Flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+}
+
+void AddFormats(Words& words, PipeOptions& options) {
+    AddQuality(words, options.quality);
+    words.Take("--from", options.from, "Format to start from; needed for raw frames");
+}
+
+void AddFormatsOfOperation(Words& words, PipeOptions& options) {
+    AddFormats(words, options);
+    words.Take("--to", options.to, "Format to end in; without it, raw frames keep that of --from");
+    words.Notes(kNotes);
+}
+
 } // namespace
 
 void AddQuality(Words& words, int32_t& quality) {
@@ -36,20 +52,25 @@ void AddOutputForm(Words& words, PipeOptions& options) {
 void AddFrames(Words& words, PipeOptions& options) {
     words.Take("IN", options.input, "PNG file, raw frames, or -").Required();
     AddOutput(words, options);
-    words.Take("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
-    words.Flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+    AddRawFrames(words, options);
 }
 
 void AddPipe(Words& words, PipeOptions& options) {
     AddFrames(words, options);
-    AddQuality(words, options.quality);
-    words.Take("--from", options.from, "Format to start from; needed for raw frames");
+    AddFormats(words, options);
 }
 
 void AddOperation(Words& words, PipeOptions& options) {
-    AddPipe(words, options);
-    words.Take("--to", options.to, "Format to end in; without it, raw frames keep that of --from");
-    words.Notes(kNotes);
+    AddFrames(words, options);
+    AddFormatsOfOperation(words, options);
+}
+
+void AddMix(Words& words, PipeOptions& options, std::string& second) {
+    words.Take("A", options.input, "PNG file, raw frames, or -").Required();
+    words.Take("B", second, "PNG file of the same size").Required();
+    AddOutput(words, options);
+    AddRawFrames(words, options);
+    AddFormatsOfOperation(words, options);
 }
 
 } // namespace tool

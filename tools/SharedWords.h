@@ -29,4 +29,7 @@ void AddPipe(Words& words, PipeOptions& options);
 /// For commands that do something to the picture: AddPipe, --to as they take it, and notes.
 void AddOperation(Words& words, PipeOptions& options);
 
+/// The same with a second picture, which the frames meet in their format.
+void AddMix(Words& words, PipeOptions& options, std::string& second);
+
 } // namespace tool

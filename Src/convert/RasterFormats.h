@@ -3,6 +3,8 @@
 // The plain raster formats of the catalogue: the only ones that rows can be converted between. Any other
 // number has no layout that a row kernel could rely on.
 
+#include "frame/PixelFormat.h"
+
 #include <PixelKiln/PixelFormat.h>
 
 #include <algorithm>
@@ -39,6 +41,15 @@ inline constexpr PK_PixelFormat kRasterFormats[] = {
 
 constexpr bool IsRasterFormat(PK_PixelFormat format) {
     return std::ranges::find(kRasterFormats, format) != std::end(kRasterFormats);
+}
+
+/// The 4:4:4 format of a format's colour and order, for an operation to work in. What there is none of is 32f: 10 bits, VUY
+/// of 15 bits, linear light of integers. VUY has one order.
+constexpr PK_PixelFormat Packed4444(PK_PixelFormat format, uint32_t alpha, uint32_t depth) {
+    const uint32_t order = IsYUV(format) ? kOrderBGRA : OrderOf(format);
+    const PK_PixelFormat packed = With(format, kStructureMask | kAlphaMask | kDepthMask | kOrderMask,
+                                       kStructure444 | alpha | depth | order);
+    return IsRasterFormat(packed) ? packed : WithDepth(packed, kDepth32f);
 }
 
 } // namespace PK

@@ -6,6 +6,7 @@
 #include "composite/AlphaGainKernels.h"
 #include "composite/BlackKernels.h"
 #include "composite/BlendKernels.h"
+#include "composite/DissolveKernels.h"
 #include "composite/MaskKernels.h"
 #include "composite/MatteKernels.h"
 #include "composite/OverKernels.h"
@@ -13,6 +14,7 @@
 #include "convert/BridgeKernels.h"
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
+#include "filters/DeinterlaceKernels.h"
 #include "geometry/WarpSpan.h"
 #include "primitives/ALaw.h"
 #include "primitives/BlockTransforms.h"
@@ -257,6 +259,31 @@ constexpr KernelRow kGainsAndSums[] = {
     Entry<&SumKernels::add, 9>("AddSumOfRows_10", {Floats(4), Floats(4)}),
 };
 
+constexpr KernelRow kDissolves[] = {
+    Entry<&DissolveKernels::opaque8u>("DissolveOpaqueRow_BGRX_8u", ThreeOf(Bytes(4))),
+    Entry<&DissolveKernels::opaque15u>("DissolveOpaqueRow_BGRX_15u", ThreeOf(Words(4))),
+    Entry<&DissolveKernels::opaque32f>("DissolveOpaqueRow_BGRX_32f", ThreeOf(Floats(4))),
+    Entry<&DissolveKernels::opaqueAlphaFirst8u>("DissolveOpaqueRow_XRGB_8u", ThreeOf(Bytes(4))),
+    Entry<&DissolveKernels::opaqueAlphaFirst15u>("DissolveOpaqueRow_XRGB_15u", ThreeOf(Words(4))),
+    Entry<&DissolveKernels::opaqueAlphaFirst32f>("DissolveOpaqueRow_XRGB_32f", ThreeOf(Floats(4))),
+    Entry<&DissolveKernels::straight8u>("DissolveStraightRow_8u", ThreeOf(Bytes(4))),
+    Entry<&DissolveKernels::straight15u>("DissolveStraightRow_15u", ThreeOf(Words(4))),
+    Entry<&DissolveKernels::straight32f>("DissolveStraightRow_32f", ThreeOf(Floats(4))),
+    Entry<&DissolveKernels::premultiplied8u>("DissolvePremultipliedRow_8u", ThreeOf(Bytes(4))),
+    Entry<&DissolveKernels::premultiplied15u>("DissolvePremultipliedRow_15u", ThreeOf(Words(4))),
+    Entry<&DissolveKernels::premultiplied32f>("DissolvePremultipliedRow_32f", ThreeOf(Floats(4))),
+    Entry<&DissolveKernels::v210>("DissolveRow_V210", ThreeOf(kV210)),
+};
+
+constexpr KernelRow kDeinterlacing[] = {
+    Entry<&DeinterlaceKernels::alphaLast8u>("InterpolateFieldRow_BGRP_8u", ThreeOf(Bytes(4))),
+    Entry<&DeinterlaceKernels::alphaLast15u>("InterpolateFieldRow_BGRP_15u", ThreeOf(Words(4))),
+    Entry<&DeinterlaceKernels::alphaLast32f>("InterpolateFieldRow_BGRP_32f", ThreeOf(Floats(4))),
+    Entry<&DeinterlaceKernels::alphaFirst8u>("InterpolateFieldRow_PRGB_8u", ThreeOf(Bytes(4))),
+    Entry<&DeinterlaceKernels::alphaFirst15u>("InterpolateFieldRow_PRGB_15u", ThreeOf(Words(4))),
+    Entry<&DeinterlaceKernels::alphaFirst32f>("InterpolateFieldRow_PRGB_32f", ThreeOf(Floats(4))),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -283,6 +310,8 @@ std::vector<KernelRow> KernelRegister() {
     add(kComposites);
     add(kMattes);
     add(kGainsAndSums);
+    add(kDissolves);
+    add(kDeinterlacing);
     add(kColour);
     return all;
 }

@@ -11,6 +11,8 @@
 #include <PixelKiln/ColorSpace.h>
 #include <PixelKiln/Composite.h>
 #include <PixelKiln/Convert.h>
+#include <PixelKiln/CrossDissolve.h>
+#include <PixelKiln/Deinterlace.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Matte.h>

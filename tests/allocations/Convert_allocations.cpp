@@ -1,4 +1,4 @@
-// Conversions, and the composite that converts rows on its way.
+// Conversions, and the mixes of two images that convert rows on their way.
 
 #include "allocations/Call.h"
 
@@ -77,6 +77,28 @@ void AddMaskComposites(Calls& calls) {
                                   TakesOrRefuses("rows that are converted")));
 }
 
+Call CrossDissolve(PK_PixelFormat first, PK_PixelFormat second, PK_PixelFormat to, Memory memory,
+                   float ratio = 0.3f) {
+    return {{"PK_CrossDissolve"},
+            memory,
+            std::vector<uint8_t>(Image(to).bytes.size()),
+            [a = Image(first), b = Image(second), to, ratio](uint8_t* block) {
+                return PK_CrossDissolve(a.bytes.data(), a.rowBytes, a.format, b.bytes.data(), b.rowBytes,
+                                        b.format, block, PK_PixelFormatRowBytes(to, kWidth), to, kWidth,
+                                        kHeight, ratio, 4);
+            }};
+}
+
+void AddCrossDissolves(Calls& calls) {
+    constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u, kUYVY = PK_PixelFormat_UYVY_422_8u;
+    calls.push_back(CrossDissolve(kBGRA, kBGRA, kBGRA, TakesNone("its images are of one format")));
+    calls.push_back(CrossDissolve(kBGRA, kUYVY, kBGRA, TakesNone("a copy of the first image"), 0));
+    calls.push_back(CrossDissolve(kUYVY, kUYVY, kUYVY, TakesOrRefuses("rows that are converted")));
+    calls.push_back(CrossDissolve(PK_PixelFormat_V210_422_10u, PK_PixelFormat_ARGB_4444_15u, kBGRA,
+                                  TakesOrRefuses("rows that are converted")));
+}
+
+const Family sCrossDissolves(AddCrossDissolves);
 const Family sConversions(AddConversions), sStreams(AddStreams), sMaskComposites(AddMaskComposites);
 
 } // namespace

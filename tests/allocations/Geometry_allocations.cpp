@@ -1,4 +1,4 @@
-// Images that are turned, warped, blurred and stamped.
+// Images that are turned, deinterlaced, warped, blurred and stamped.
 
 #include "allocations/Call.h"
 
@@ -28,6 +28,39 @@ void AddTurns(Calls& calls) {
                              return PK_RotateImage(source.bytes.data(), source.rowBytes, block, rowBytes,
                                                    kWidth, kHeight, kBGRA, degrees);
                          }});
+}
+
+void AddFields(Calls& calls) {
+    struct Rebuilding {
+        PK_PixelFormat format;
+        int32_t quality;
+        Memory memory;
+    };
+    constexpr Rebuilding kRebuildings[] = {
+        {PK_PixelFormat_BGRP_4444_8u, 4, TakesNone("works on the rows themselves")},
+        {PK_PixelFormat_BGRP_4444_8u, 3, TakesNone("mixes the rows themselves")},
+        {PK_PixelFormat_UYVY_422_8u, 4, TakesOrRefuses("rows that are converted")},
+        {PK_PixelFormat_UYVY_422_8u, 3, TakesOrRefuses("rows that are converted")},
+    };
+    for (const Rebuilding& rebuilding : kRebuildings) {
+        const Image image(rebuilding.format);
+        calls.push_back({{"PK_Deinterlace"},
+                         rebuilding.memory,
+                         image.bytes,
+                         [=, rowBytes = image.rowBytes](uint8_t* block) {
+                             return PK_Deinterlace(block, rowBytes, rebuilding.format, kWidth, kHeight, 0,
+                                                   rebuilding.quality);
+                         }});
+        calls.push_back(
+            {{"PK_DeinterlaceCopy"},
+             TakesOrRefuses("rows that are converted"),
+             image.bytes,
+             [=, source = Image(PK_PixelFormat_V210_422_10u), rowBytes = image.rowBytes](uint8_t* block) {
+                 return PK_DeinterlaceCopy(source.bytes.data(), source.rowBytes, source.format, block,
+                                           rowBytes, rebuilding.format, kWidth, kHeight, 1,
+                                           rebuilding.quality);
+             }});
+    }
 }
 
 void AddWarps(Calls& calls) {
@@ -75,6 +108,6 @@ void AddStamps(Calls& calls) {
                      }});
 }
 
-const Family sTurns(AddTurns), sWarps(AddWarps), sBlurs(AddBlurs), sStamps(AddStamps);
+const Family sTurns(AddTurns), sFields(AddFields), sWarps(AddWarps), sBlurs(AddBlurs), sStamps(AddStamps);
 
 } // namespace

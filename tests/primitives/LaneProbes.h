@@ -17,6 +17,7 @@ struct LaneProbes {
     LayoutProbe floatsAlphaLast, floatsAlphaFirst;
     PK::RowKernel vote;        ///< Masks of a lane each to masks of groups.
     PK::TwoRowKernel products; ///< Bytes in lanes to nearest(a x b / 255).
+    PK::TwoRowKernel lesserBytes, greaterBytes;
 
     static constexpr PK::Offer kOffer = PK::Offer::flags;
     template <PK::Target>

@@ -35,6 +35,13 @@ struct Products : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
     }
 };
 
+template <I32 (*kOperation)(I32, I32)>
+struct OfBytes : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
+    static void Group(const uint8_t* a, const uint8_t* b, uint8_t* destination) {
+        Store(destination, kOperation(LoadInts(a), LoadInts(b)));
+    }
+};
+
 template <class Layout>
 constexpr PKTest::LayoutProbe kProbe = {Row<LoadLayout<Layout>>, Row<StoreLayout<Layout>>};
 
@@ -54,6 +61,8 @@ const PKTest::LaneProbes& PKTest::LaneProbes::For<PK::Target::PK_TARGET>() {
         .floatsAlphaFirst = kProbe<Pixels32f<first>>,
         .vote = Row<Vote>,
         .products = TwoRows<Products>,
+        .lesserBytes = TwoRows<OfBytes<MinBytes>>,
+        .greaterBytes = TwoRows<OfBytes<MaxBytes>>,
     };
     return probes;
 }

@@ -115,6 +115,21 @@ TEST_P(PixelLanes, ProductsBy255thsAreTheNearestOfAllPairsOfBytes) {
     EXPECT_EQ(products, expected);
 }
 
+TEST_P(PixelLanes, BytesAreComparedWithoutSign) {
+    std::vector<uint8_t> a, b, lesser, greater;
+    for (uint32_t i = 0; i < 65536; ++i) {
+        a.push_back(static_cast<uint8_t>(i >> 8));
+        b.push_back(static_cast<uint8_t>(i));
+        lesser.push_back(std::min(a.back(), b.back()));
+        greater.push_back(std::max(a.back(), b.back()));
+    }
+    std::vector<uint8_t> out(a.size());
+    probes.lesserBytes(a.data(), b.data(), out.data(), static_cast<int32_t>(a.size() / 4));
+    EXPECT_EQ(out, lesser);
+    probes.greaterBytes(a.data(), b.data(), out.data(), static_cast<int32_t>(a.size() / 4));
+    EXPECT_EQ(out, greater);
+}
+
 INSTANTIATE_TEST_SUITE_P(Targets, PixelLanes, PKTest::EveryTarget(), PKTest::TargetOf);
 
 } // namespace

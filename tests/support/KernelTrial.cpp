@@ -331,6 +331,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"Blend", TwoRowTrialWith<float, DrawAmount>},
     {"AlphaGain", TrialWith<float, DrawGain>},
     {"Sum", SumTrial},
+    {"Dissolve", TwoRowTrialWith<float, DrawAmount>},
     {"BoxBlur", BoxTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},

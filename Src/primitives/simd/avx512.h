@@ -316,6 +316,13 @@ inline I32 AddBytes(I32 a, I32 b) {
 inline I32 MinHalves(I32 a, I32 b) {
     return {_mm512_min_epi16(a.v, b.v)};
 }
+/// The lesser and the greater of each byte and its counterpart, both without sign.
+inline I32 MinBytes(I32 a, I32 b) {
+    return {_mm512_min_epu8(a.v, b.v)};
+}
+inline I32 MaxBytes(I32 a, I32 b) {
+    return {_mm512_max_epu8(a.v, b.v)};
+}
 /// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
 inline I32 LookUpBytes(I32 table, I32 places) {
     return {_mm512_shuffle_epi8(table.v, places.v)};

@@ -325,6 +325,22 @@ inline I32 AddBytes(I32 a, I32 b) {
 inline I32 MinHalves(I32 a, I32 b) {
     return MapHalves(a, b, [](uint32_t x, uint32_t y) { return x < y ? x : y; });
 }
+/// The operation on the four bytes of each lane.
+template <class Operation>
+inline I32 MapBytes(I32 a, I32 b, Operation operation) {
+    uint8_t x[16], y[16];
+    Store(x, a);
+    Store(y, b);
+    for (int i = 0; i < 16; ++i) x[i] = operation(x[i], y[i]);
+    return LoadInts(x);
+}
+/// The lesser and the greater of each byte and its counterpart, both without sign.
+inline I32 MinBytes(I32 a, I32 b) {
+    return MapBytes(a, b, [](uint8_t x, uint8_t y) { return x < y ? x : y; });
+}
+inline I32 MaxBytes(I32 a, I32 b) {
+    return MapBytes(a, b, [](uint8_t x, uint8_t y) { return x > y ? x : y; });
+}
 /// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
 inline I32 LookUpBytes(I32 table, I32 places) {
     uint8_t from[16], bytes[16];

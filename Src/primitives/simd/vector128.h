@@ -301,6 +301,13 @@ inline I32 AddBytes(I32 a, I32 b) {
 inline I32 MinHalves(I32 a, I32 b) {
     return {_mm_min_epi16(a.v, b.v)};
 }
+/// The lesser and the greater of each byte and its counterpart, both without sign.
+inline I32 MinBytes(I32 a, I32 b) {
+    return {_mm_min_epu8(a.v, b.v)};
+}
+inline I32 MaxBytes(I32 a, I32 b) {
+    return {_mm_max_epu8(a.v, b.v)};
+}
 /// In each block of 16 bytes, the bytes of `table` that the bytes of `places`, 0 to 15, point to.
 inline I32 LookUpBytes(I32 table, I32 places) {
     if constexpr (kHasByteShuffle) {

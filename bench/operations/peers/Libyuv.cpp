@@ -1,5 +1,6 @@
 // libyuv. Its "ARGB" is BGRA in memory, and its "RAW" RGB.
 
+#include "operations/OpaqueImages.h"
 #include "operations/Operation.h"
 
 #include <libyuv.h>
@@ -54,9 +55,18 @@ Run Blend(const uint8_t* source, uint8_t* back) {
     };
 }
 
+Run Interpolate(const uint8_t* source, uint8_t* destination) {
+    return [images = MakeOpaqueImages(source), destination] {
+        constexpr auto kFraction = static_cast<int>(256 * kDissolveRatio);
+        libyuv::ARGBInterpolate(images->First(), kBGRARowBytes, images->Second(), kBGRARowBytes, destination,
+                                kBGRARowBytes, kWidth, kHeight, kFraction);
+    };
+}
+
 const AddPeers add = {
     {"Premultiplied BGRA 8u over opaque at full opacity", "libyuv ARGBBlend", false, Blend},
     {"Premultiplied BGRA 8u over premultiplied at full opacity", "libyuv ARGBBlend", false, Blend},
+    {"Dissolve of opaque BGRA 8u", "libyuv ARGBInterpolate", true, Interpolate},
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},

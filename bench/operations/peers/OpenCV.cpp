@@ -1,5 +1,6 @@
 // OpenCV, on one thread.
 
+#include "operations/OpaqueImages.h"
 #include "operations/Operation.h"
 #include "operations/WarpQuad.h"
 
@@ -98,11 +99,19 @@ Run MeanOfFive(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+Run WeightedSum(const uint8_t* source, uint8_t* destination) {
+    return [images = MakeOpaqueImages(source), to = Upright(destination)] {
+        cv::addWeighted(Upright(images->First()), 1 - kDissolveRatio, Upright(images->Second()),
+                        kDissolveRatio, 0, to);
+    };
+}
+
 const AddPeers add = {
     {"Gain of BGRP 8u", "OpenCV convertTo", true, Scaled<CV_8UC4>},
     {"Gain of BGRP 32f", "OpenCV convertTo", false, Scaled<CV_32FC4>},
     {"Mean of five BGRP 8u", "OpenCV accumulate", true, MeanOfFive<CV_8UC4>},
     {"Mean of five BGRP 32f", "OpenCV accumulate", false, MeanOfFive<CV_32FC4>},
+    {"Dissolve of opaque BGRA 8u", "OpenCV addWeighted", true, WeightedSum},
     {"Composite of two BGRA 8u by a one-bit mask", "OpenCV copyTo (mask of bytes)", false, MaskedCopy},
     {"RGB 8u to BGRA 8u", "OpenCV cvtColor", true, FromRGB},
     {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose<CV_8UC4>},

@@ -15,9 +15,9 @@
 namespace PKTest {
 
 /// Expansion to 15 bits rounds by where a pixel lies to a boundary of 16 bytes; here all rows lie alike.
-class AlignedPicture {
+class RowPicture {
 public:
-    AlignedPicture(PK_PixelFormat pixelFormat, int32_t columns, int32_t rows)
+    RowPicture(PK_PixelFormat pixelFormat, int32_t columns, int32_t rows)
         : format(pixelFormat), width(columns), height(rows),
           rowLength(static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, width))),
           fUnits((rowLength + sizeof(Unit) - 1) / sizeof(Unit)),
@@ -38,7 +38,7 @@ public:
     }
 
     /// Where the rows first differ from expected ones; empty if they agree.
-    std::string DifferenceFrom(const AlignedPicture& expected) const {
+    std::string DifferenceFrom(const RowPicture& expected) const {
         for (int32_t row = 0; row < height; ++row) {
             const std::string difference = FirstDifference(format, rowLength, expected.Row(row), Row(row));
             if (!difference.empty()) return "row " + std::to_string(row) + ", " + difference;
@@ -60,8 +60,8 @@ private:
 };
 
 /// Each row of a picture in another format, where it was: a conversion of several rows might turn them.
-inline AlignedPicture RowsIn(PK_PixelFormat format, const AlignedPicture& picture, int32_t quality) {
-    AlignedPicture converted(format, picture.width, picture.height);
+inline RowPicture RowsIn(PK_PixelFormat format, const RowPicture& picture, int32_t quality) {
+    RowPicture converted(format, picture.width, picture.height);
     for (int32_t row = 0; row < picture.height; ++row)
         EXPECT_EQ(PK_Convert(picture.Row(row), 0, picture.format, converted.Row(row), 0, format,
                              picture.width, 1, quality),

@@ -1,0 +1,36 @@
+// Fields rebuilt in place.
+
+#include "operations/Operation.h"
+
+#include <PixelKiln/Deinterlace.h>
+
+namespace OperationBench {
+namespace {
+
+constexpr size_t kCount = kPixels;
+
+template <PK_PixelFormat kFormat, int32_t kRowBytes, int32_t kQuality>
+Run Rebuild(const uint8_t*, uint8_t* image) {
+    return [=] { PK_Deinterlace(image, kRowBytes, kFormat, kWidth, kHeight, 0, kQuality); };
+}
+
+// Half of the frame is read and half is written; a copy of the frame reads and writes all.
+// clang-format off: one row an operation
+const AddOperations add = {
+    {"Deinterlacing of BGRP 8u along edges", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Nothing, 0,
+     Rebuild<PK_PixelFormat_BGRP_4444_8u, kBGRARowBytes, 4>},
+    {"Deinterlacing of BGRP 15u along edges", 8 * kCount, 8 * kCount, Samples::Bytes, Against::Nothing, 0,
+     Rebuild<PK_PixelFormat_BGRP_4444_15u, 2 * kBGRARowBytes, 4>},
+    {"Deinterlacing of BGRP 32f along edges", 16 * kCount, 16 * kCount, Samples::Floats, Against::Nothing, 0,
+     Rebuild<PK_PixelFormat_BGRP_4444_32f, 4 * kBGRARowBytes, 4>},
+    {"Deinterlacing of UYVY 8u along edges", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Nothing, 0,
+     Rebuild<PK_PixelFormat_UYVY_422_8u, 2 * kWidth, 4>},
+    {"Deinterlacing of BGRP 8u by means", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Nothing, 0,
+     Rebuild<PK_PixelFormat_BGRP_4444_8u, kBGRARowBytes, 3>},
+    {"Deinterlacing of UYVY 8u by means", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Nothing, 0,
+     Rebuild<PK_PixelFormat_UYVY_422_8u, 2 * kWidth, 3>},
+};
+// clang-format on
+
+} // namespace
+} // namespace OperationBench
