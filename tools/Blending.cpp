@@ -3,6 +3,7 @@
 #include "Failure.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <iterator>
 #include <utility>
 
@@ -37,11 +38,19 @@ Frame Blended(const Frame& top, const Frame& back, const Blend& blend) {
                                        ", the back one " + SizeText(back));
     Frame result(blend.inLinear ? PK_PixelFormat_BGRA_4444_32f_Linear : back.Format(), back.Width(),
                  back.Height());
-    Require(PK_CompositeWithBlendMode(top.Pixels(), top.RowBytes(), top.Format(), back.Pixels(),
-                                      back.RowBytes(), back.Format(), result.Pixels(), result.RowBytes(),
-                                      result.Format(), back.Width(), back.Height(), blend.opacity, blend.mode,
-                                      kDefaultQuality, blend.inLinear),
-            "composite", back);
+    const auto lay = [&](const uint8_t* from, const uint8_t* behind, uint8_t* to, int32_t rows) {
+        Require(PK_CompositeWithBlendMode(from, top.RowBytes(), top.Format(), behind, back.RowBytes(),
+                                          back.Format(), to, result.RowBytes(), result.Format(), back.Width(),
+                                          rows, blend.opacity, blend.mode, kDefaultQuality, blend.inLinear),
+                "composite", back);
+    };
+    if (blend.mode == PK_BlendMode_Dissolve) { // row by row it draws the same numbers each time
+        std::srand(1);
+        for (int32_t row = 0; row < back.Height(); ++row)
+            lay(top.Row(row), back.Row(row), result.Row(row), 1);
+    } else {
+        lay(top.Pixels(), back.Pixels(), result.Pixels(), back.Height());
+    }
     return blend.inLinear ? Converted(result, back.Format(), kDefaultQuality) : std::move(result);
 }
 

@@ -30,7 +30,7 @@ TEST(OpacityNOP, IsAsNearToOneAsDoesNotCount) {
         EXPECT_FALSE(PK_IsOpacityNOP(PK_BlendMode_Normal, opacity)) << opacity;
 }
 
-TEST(BlendModes, AreNumberedByName) {
+TEST(BlendModeNumbers, AreNumberedByName) {
     EXPECT_EQ(PK_BlendMode_Color, 0);
     EXPECT_EQ(PK_BlendMode_ColorBurn, 1);
     EXPECT_EQ(PK_BlendMode_ColorDodge, 2);
