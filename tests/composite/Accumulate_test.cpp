@@ -78,7 +78,7 @@ float SampleOf(const RowPicture& picture, int32_t rowFromTop, int32_t sample) {
 
 /// Row by row from the top, in groups of ten.
 RowPicture ReferenceSum(const std::vector<Summand>& summands, PK_PixelFormat destination, int32_t width,
-                            int32_t height, int32_t quality) {
+                        int32_t height, int32_t quality) {
     const PK_PixelFormat working =
         quality < 5 ? PK_PixelFormat_BGRP_4444_32f : PK_PixelFormat_BGRP_4444_32f_Linear;
     // The working format is stored bottom-up; its rows are told from the top in both.

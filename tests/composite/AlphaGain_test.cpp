@@ -137,8 +137,7 @@ TEST_F(AlphaGain, ScalesAlphaAloneOfBytesInReversedOrder) {
 
 TEST_F(AlphaGain, LeavesWhatHasNoAlphaAsItIs) {
     EXPECT_EQ(Gained(PK_PixelFormat_UYVY_422_8u, Bytes4{90, 50, 150, 200}, 0.5f)[1], 50);
-    RowPicture source(PK_PixelFormat_V210_422_10u, 12, 1),
-        destination(PK_PixelFormat_V210_422_10u, 12, 1);
+    RowPicture source(PK_PixelFormat_V210_422_10u, 12, 1), destination(PK_PixelFormat_V210_422_10u, 12, 1);
     source.FillOrdinary(fRandom);
     for (const int32_t quality : {2, 3}) {
         RowPicture unscaled(source.format, 12, 1);

@@ -103,7 +103,7 @@ inline void ScaleFloats(uint8_t* pixel, Scaled scaled, float gain) {
 }
 
 inline RowPicture ReferenceGain(const RowPicture& source, PK_PixelFormat destination, float gain,
-                                    int32_t quality) {
+                                int32_t quality) {
     const Method method = MethodOf(destination, quality);
     const bool isFloat = method.scaled == Scaled::kAlpha32 || method.scaled == Scaled::kAll32;
     RowPicture working = RowsIn(method.working, source, quality);
