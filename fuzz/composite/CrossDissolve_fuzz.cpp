@@ -4,7 +4,7 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/Formats.h"
-#include "support/ImageMemory.h"
+#include "support/Input.h"
 #include "support/Size.h"
 #include "support/Switches.h"
 
@@ -29,22 +29,6 @@ Size DrawSize(ByteStream& stream) {
 float DrawRatio(ByteStream& stream) {
     return static_cast<float>(1 + stream.Below(99)) / 100;
 }
-
-struct Input {
-    PK_PixelFormat format;
-    SourceImage memory;
-    bool isNull;
-
-    Input(ByteStream& stream, PK_PixelFormat pixelFormat, Size size)
-        : format(pixelFormat),
-          memory(DrawLayout(stream, int64_t{PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0))},
-                            size),
-                 stream),
-          isNull(stream.OneIn(64)) {}
-
-    uint8_t* Pixels() const { return isNull ? nullptr : memory.Pixels(); }
-    int32_t RowBytes() const { return memory.RowBytes(); }
-};
 
 /// Opaque pixels or clear ones, each channel is a mean; roundings may be off by one.
 void CheckMeans(const Input& first, const Input& second, const Input& destination) {

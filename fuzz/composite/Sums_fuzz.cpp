@@ -4,7 +4,7 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/Formats.h"
-#include "support/ImageMemory.h"
+#include "support/Input.h"
 #include "support/Size.h"
 #include "support/Switches.h"
 
@@ -27,22 +27,6 @@ Size DrawSize(ByteStream& stream) {
     if (stream.OneIn(64)) return {stream.Between(16380, 16390), 1}; // rows that do not fit the stack
     return {stream.Between(-1, 90), stream.Between(0, 20)};
 }
-
-struct Input {
-    PK_PixelFormat format;
-    SourceImage memory;
-    bool isNull;
-
-    Input(ByteStream& stream, PK_PixelFormat pixelFormat, Size size)
-        : format(pixelFormat),
-          memory(DrawLayout(stream, int64_t{PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0))},
-                            size),
-                 stream),
-          isNull(stream.OneIn(64)) {}
-
-    uint8_t* Pixels() const { return isNull ? nullptr : memory.Pixels(); }
-    int32_t RowBytes() const { return memory.RowBytes(); }
-};
 
 /// What both say of sizes and pointers, once the formats are good.
 PK_Result ResultOfPixels(Size size, bool hasNull) {

@@ -4,7 +4,7 @@
 #include "support/Family.h"
 #include "support/FloatState.h"
 #include "support/Formats.h"
-#include "support/ImageMemory.h"
+#include "support/Input.h"
 #include "support/Size.h"
 #include "support/Switches.h"
 
@@ -23,10 +23,6 @@ Size DrawSize(ByteStream& stream) {
     if (stream.OneIn(16)) return {stream.AnyI32(), stream.Between(-3, 0)};
     if (stream.OneIn(64)) return {stream.Between(5450, 5470), 4}; // about where rows no longer fit the stack
     return {stream.Between(-1, 100), stream.Between(-1, 20)};
-}
-
-RowsLayout DrawRaster(ByteStream& stream, PK_PixelFormat format, Size size) {
-    return DrawLayout(stream, int64_t{PK_PixelFormatPackedRowBytes(format, std::max(size.width, 0))}, size);
 }
 
 bool IsTaken(PK_PixelFormat format) {

@@ -201,7 +201,8 @@ TEST_F(BlendModes, ClearOverClearIsClear) {
 // The back is of less luma by BT.709, of more by BT.601.
 TEST_F(BlendModes, TheLumaOfWidthsUpTo720IsThatOf601) {
     const Pixel top = {0, 0.45f, 0.3f, 1}, back = {0, 0.3f, 0.6f, 1}; // 0.386, 0.342 and 0.354, 0.356
-    for (const auto& [width, topIsDarker] : {std::pair{719, true}, {720, true}, {721, false}}) {
+    for (const int32_t width : {719, 720, 721}) {
+        const bool topIsDarker = width <= 720;
         std::vector<Pixel> tops(static_cast<size_t>(width), top), backs(tops.size(), back),
             result(tops.size());
         const auto blend = [&](PK_BlendMode mode) {
