@@ -76,6 +76,9 @@ struct Planes {
     }
 
 private:
+    Planes() = default;
+    friend Depth;
+
     template <class Sample>
     static F32 Square(Sample p, Sample q) {
         const F32 difference = Depth::Value(p) - Depth::Value(q);

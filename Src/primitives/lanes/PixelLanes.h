@@ -47,6 +47,10 @@ struct CodesAsFloats {
         Layout::StoreCodes(destination, {NearestCode<kFullCode>(c.c0), NearestCode<kFullCode>(c.c1),
                                          NearestCode<kFullCode>(c.c2), NearestCode<kFullCode>(c.c3)});
     }
+
+private:
+    CodesAsFloats() = default;
+    friend Layout;
 };
 
 template <AlphaPlace kAlpha = AlphaPlace::last>
