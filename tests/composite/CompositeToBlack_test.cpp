@@ -27,6 +27,7 @@ using namespace PKTest;
 constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u, kVUYA = PK_PixelFormat_VUYA_4444_8u,
                          kFloats = PK_PixelFormat_BGRA_4444_32f;
 using Codes = std::vector<uint8_t>;
+constexpr float kPart = 0x1.010102p-8f; // nearest to 1 / 255, whatever the rounding mode
 
 size_t RowLength(PK_PixelFormat format, int32_t width) {
     return static_cast<size_t>(PK_PixelFormatPackedRowBytes(format, width));
@@ -71,7 +72,7 @@ void YUVByIntegers(const uint8_t* p, float opacity, uint8_t* result) {
 }
 
 void YUVByFloats(const uint8_t* p, float opacity, bool passes, uint8_t* result) {
-    const float w = static_cast<float>(p[3]) * opacity * (1.0f / 255);
+    const float w = static_cast<float>(p[3]) * opacity * kPart;
     for (int i = 0; i < 3; ++i) {
         const auto zero = static_cast<float>(ZeroOf(i));
         result[i] = passes ? p[i] : Sat((static_cast<float>(p[i]) - zero) * w + zero);

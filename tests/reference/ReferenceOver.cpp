@@ -12,6 +12,7 @@ namespace {
 using Pixel = std::array<uint8_t, 4>;
 
 constexpr float kSmall = 8e-6f;
+constexpr float kPart = 0x1.010102p-8f; // nearest to 1 / 255, whatever the rounding mode
 
 Pixel PixelAt(const uint8_t* row, int64_t x, bool isOpaque) {
     Pixel pixel;
@@ -76,8 +77,7 @@ Pixel InMixedFour(const OverRule& rule, Pixel s, Pixel b, float o) {
     const Pixel nothing = rule.isYUV ? Pixel{128, 128, 16, 0} : Pixel{};
     if (s[3] == 0) s = nothing;
     if (b[3] == 0) b = nothing;
-    const float k = 1.0f / 255, as = static_cast<float>(s[3]) * o, a = rule.topIsOpaque ? o : as * k,
-                rest = 1 - a;
+    const float k = kPart, as = static_cast<float>(s[3]) * o, a = rule.topIsOpaque ? o : as * k, rest = 1 - a;
     const float ba = b[3], alpha = both ? (a + rest) * 255 : as + ba * rest;
     return Channelwise(
         [&](size_t i) {
@@ -95,7 +95,7 @@ void Four(const OverRule& rule, const uint8_t* top, const uint8_t* back, uint8_t
     for (int i = 0; i < 4; ++i) {
         s[i] = PixelAt(top, x + i, rule.topIsOpaque);
         b[i] = PixelAt(back, x + i, rule.backIsOpaque);
-        const float a = rule.topIsOpaque ? o : static_cast<float>(s[i][3]) * o * (1.0f / 255);
+        const float a = rule.topIsOpaque ? o : static_cast<float>(s[i][3]) * o * kPart;
         allNone = allNone && a == 0;
         allFull = allFull && a >= 0.99999237f;
         allClear = allClear && b[i][3] == 0;
