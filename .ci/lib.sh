@@ -19,7 +19,8 @@ run_tests() {
     for ((shard = 0; shard < shards; shard++)); do
         rm -f "$bodies/$name.$shard"
         GTEST_TOTAL_SHARDS=$shards GTEST_SHARD_INDEX=$shard PIXELKILN_BODIES_RUN=$bodies/$name.$shard \
-            PIXELKILN_TEST_STRIDE=17 timeout 15m "$@" "${tested:-build/release}/tests/pixelkiln_tests" --gtest_brief=1 --gtest_filter="$filter" \
+            PIXELKILN_TEST_STRIDE=17 timeout 15m "$@" "${tested:-build/release}/tests/pixelkiln_tests" --gtest_brief=1 \
+            --gtest_filter="$filter" \
             >"$bodies/$name.$shard.log" 2>&1 &
         processes+=($!)
     done
