@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <functional>
 #include <ostream>
+#include <random>
 
 namespace PKTest {
 namespace {

@@ -5,18 +5,23 @@
 
 #include <cstdint>
 #include <cstdlib>
-#include <random>
 #include <vector>
 
 namespace PKTest {
 
 class Random {
 public:
-    explicit Random(uint64_t seed) : fSeed(ChosenSeed(seed)), fEngine(fSeed) {}
+    explicit Random(uint64_t seed) : fSeed(ChosenSeed(seed)), fState(fSeed) {}
 
     uint64_t Seed() const { return fSeed; }
 
-    uint32_t Next() { return static_cast<uint32_t>(fEngine() >> 32); }
+    /// By SplitMix64 (Steele, Lea and Flood, 2014): the engines of the standard library took a quarter of all tests' time.
+    uint32_t Next() {
+        uint64_t x = fState += 0x9e3779b97f4a7c15;
+        x = (x ^ (x >> 30)) * 0xbf58476d1ce4e5b9;
+        x = (x ^ (x >> 27)) * 0x94d049bb133111eb;
+        return static_cast<uint32_t>((x ^ (x >> 31)) >> 32);
+    }
 
     /// A number from 0 to \p count - 1.
     uint32_t Below(uint32_t count) { return static_cast<uint32_t>((uint64_t{Next()} * count) >> 32); }
@@ -38,7 +43,7 @@ private:
     }
 
     uint64_t fSeed;
-    std::mt19937_64 fEngine;
+    uint64_t fState;
 };
 
 } // namespace PKTest
