@@ -79,10 +79,11 @@ Pixel InMixedFour(const OverRule& rule, Pixel s, Pixel b, float o) {
     if (b[3] == 0) b = nothing;
     const float k = kPart, as = static_cast<float>(s[3]) * o, a = rule.topIsOpaque ? o : as * k, rest = 1 - a;
     const float ba = b[3], alpha = both ? (a + rest) * 255 : as + ba * rest;
+    const float shown = rule.backIsOpaque ? 1 : ba * k; // 255 * k is 1 to the nearest only
     return Channelwise(
         [&](size_t i) {
             const float x = s[i], y = b[i], zero = ZeroOf(rule, static_cast<int>(i));
-            if (rule.isStraight) return (x * a + y * rest * (ba * k)) * Inverse(alpha);
+            if (rule.isStraight) return (x * a + y * rest * shown) * Inverse(alpha);
             return (x - zero) * o + zero + (y - zero) * rest;
         },
         alpha);
