@@ -46,7 +46,9 @@ PK_Result ToBlack(const SourceImage& from, const DestinationImage& to, float opa
         return PK_FillWithOpaqueBlack(to.pixels, static_cast<int32_t>(to.rowBytes), to.width, to.height,
                                       to.format);
     if (const auto result = ResultOutsideCatalogue(from.format, to.format)) return *result;
-    if (const auto result = ResultWithoutWork(to.width, to.height, {from.pixels, to.pixels})) return *result;
+    if (const auto result =
+            ResultWithoutWork(to.width, to.height, {from.pixels, to.pixels}, BelowZero::Refused))
+        return *result;
     const bool isFull = kNegligible + opacity > 1;
     const float amount = isFull ? 1 : opacity;
     BlackPlan plan;
@@ -102,7 +104,8 @@ PK_Result ToBlackAndTest(const SourceImage& from, const DestinationImage& to, ui
     if (const auto result = ResultOfStreams(from.format, to.format)) return *result;
     if (const auto result = ResultOutsideCatalogue(from.format, to.format)) return *result;
     if (told == nullptr) return PK_ErrFailed;
-    if (const auto result = ResultWithoutWork(to.width, to.height, {from.pixels, to.pixels})) {
+    if (const auto result =
+            ResultWithoutWork(to.width, to.height, {from.pixels, to.pixels}, BelowZero::Refused)) {
         if (*result == PK_Success) *told = static_cast<uint32_t>(AlphaTest::opaque);
         return *result;
     }

@@ -27,9 +27,9 @@ PK_Result Dissolve(const MixImages& images, float ratio, int32_t quality) {
     if (!IsRasterFormat(given.first) || !IsRasterFormat(given.second)) return PK_ErrBadSrcFormat;
     if (!IsRasterFormat(given.destination)) return PK_ErrBadDstFormat;
     const DestinationImage& destination = images.destination;
-    if (const auto result =
-            ResultWithoutWork(destination.width, destination.height,
-                              {images.first.pixels, images.second.pixels, destination.pixels}))
+    if (const auto result = ResultWithoutWork(destination.width, destination.height,
+                                              {images.first.pixels, images.second.pixels, destination.pixels},
+                                              BelowZero::Refused))
         return *result;
 
     const auto [kernel, working] = ChooseDissolve(given, quality);

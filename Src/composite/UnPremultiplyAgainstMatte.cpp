@@ -81,7 +81,9 @@ PK_Result UnPremultiply(const SourceImage& from, const DestinationImage& to, con
     MattePixel pixel = {};
     const PK_Result converted = PK_Convert(matte, 0, matteFormat, pixel.bytes, 0, format, 1, 1, quality);
     if (converted != PK_Success) return converted;
-    if (const auto result = ResultWithoutWork(to.width, to.height, {from.pixels, to.pixels})) return *result;
+    if (const auto result =
+            ResultWithoutWork(to.width, to.height, {from.pixels, to.pixels}, BelowZero::Refused))
+        return *result;
     MattePlan plan;
     if (!plan.Build(format, pixel, quality)) return PK_ErrNotSupported;
     return plan.Run(from, to);

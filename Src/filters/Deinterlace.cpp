@@ -120,8 +120,8 @@ PK_Result Rebuild(const SourceImage& source, const DestinationImage& destination
                   int32_t quality) {
     if (!CanBeDeinterlaced(source.format)) return PK_ErrBadSrcFormat;
     if (!CanBeDeinterlaced(destination.format)) return PK_ErrBadDstFormat;
-    if (const auto result =
-            ResultWithoutWork(source.width, source.height, {source.pixels, destination.pixels}))
+    if (const auto result = ResultWithoutWork(source.width, source.height,
+                                              {source.pixels, destination.pixels}, BelowZero::Refused))
         return *result;
     if (source.height < 2) return PK_Success;
 

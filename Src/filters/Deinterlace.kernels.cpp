@@ -44,8 +44,6 @@ struct Bytes {
     static I32 Average(I32 p, I32 q) { return (p | q) - (ShiftRight<1>(p ^ q) & Ints(0x7f7f7f7f)); }
 
     static I32 Median(I32 a, I32 b, I32 v) { return MinBytes(MaxBytes(a, MinBytes(b, v)), MaxBytes(b, v)); }
-
-    static I32 Choose(I32 mask, I32 a, I32 b) { return Select(mask, a, b); }
 };
 
 /// One vector a channel.
@@ -68,11 +66,6 @@ struct Planes {
     static Pixels Median(const Pixels& a, const Pixels& b, const Pixels& v) {
         return {MedianOf(a.c0, b.c0, v.c0), MedianOf(a.c1, b.c1, v.c1), MedianOf(a.c2, b.c2, v.c2),
                 MedianOf(a.c3, b.c3, v.c3)};
-    }
-
-    static Pixels Choose(I32 mask, const Pixels& a, const Pixels& b) {
-        return {Select(mask, a.c0, b.c0), Select(mask, a.c1, b.c1), Select(mask, a.c2, b.c2),
-                Select(mask, a.c3, b.c3)};
     }
 
 private:
@@ -138,8 +131,8 @@ struct AlongEdge : Groups<kLanes, Each<Depth::kPixelBytes>, WithBothNeighbours<D
                   right = Depth::Distance(aboveRight, belowLeft);
         const I32 isLeft = NotGreater(left, centre) & NotGreater(left, right);
         const I32 isRight = Less(right, left) & Less(right, centre);
-        const auto from = Depth::Choose(isLeft, aboveLeft, Depth::Choose(isRight, aboveRight, a));
-        const auto to = Depth::Choose(isLeft, belowRight, Depth::Choose(isRight, belowLeft, b));
+        const auto from = Select(isLeft, aboveLeft, Select(isRight, aboveRight, a));
+        const auto to = Select(isLeft, belowRight, Select(isRight, belowLeft, b));
         PutBetween<Depth>(a, b, Depth::Average(from, to), destination);
     }
 };

@@ -25,9 +25,8 @@ extern "C" {
 /// | 32f 4:2:2 and V210, where the quality is 3 or more  | VUYP_4444_32f  | alpha                                |
 /// | any other YUV: 4:2:2                                | VUYP_4444_8u   | alpha                                |
 ///
-/// Linear formats count as the 32f that they are. In the last four rows the pairing looks reversed: a straight W has
-/// all samples scaled and a premultiplied one its alpha alone. Callers rely on it. So a 4:2:2 destination, which has
-/// no alpha, gets the source unscaled.
+/// Linear formats count as the 32f that they are. In the last four rows what is scaled does not follow from the alpha
+/// kind of W: callers rely on that. So a 4:2:2 destination, which has no alpha, gets the source unscaled.
 ///
 /// With g the gain, c a sample and K its zero (128, 16, or 0 for alpha and RGB), an 8-bit result is the integer
 /// nearest to (c - K) x g + K, computed in float, rounded by the current mode (ties to even unless the caller changed
@@ -59,7 +58,7 @@ extern "C" {
 /// \param destFormat      a raster format; one that has alpha (A or P) where the gain is below 8e-6.
 /// \param width           pixels in a row, 0 to 134217727.
 /// \param height          rows, not negative.
-/// \param gain            any number; 1 changes nothing.
+/// \param gain            any number. With 1 rows still go by way of W.
 /// \param quality         render quality of the conversions, 0 to 5; it also decides on W, as told above.
 /// \return
 ///  - PK_Success: done. A width or height of 0 does nothing.

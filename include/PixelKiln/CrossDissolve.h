@@ -66,16 +66,16 @@ extern "C" {
 /// \param destRowBytes    bytes from one row of it to the next.
 /// \param destFormat      a raster format.
 /// \param width           pixels in a row, 0 to 134217727.
-/// \param height          rows; below 1 there are none.
-/// \param ratio           0 to 1; what lies below or above counts as 0 or 1. Not-a-number gives samples of 0,
-///                        or not-a-number in floats.
+/// \param height          rows, not negative.
+/// \param ratio           0 to 1; what lies below or above counts as 0 or 1. Of not-a-number the products
+///                        above are 0 in integers and not-a-number in floats; what is no product stays.
 /// \param quality         render quality of the conversions, 0 to 5; 2 also keeps the destination's depth.
 /// \return
 ///  - What PK_Convert returns, if ratio is at an end.
 ///  - PK_ErrBadSrcFormat: one of the images is of no raster format.
 ///  - PK_ErrBadDstFormat: the destination is of no raster format.
-///  - PK_Success: done. A width or height of 0 does nothing, nor does a negative height.
-///  - PK_ErrFailed: a negative width, a width too great, or a null pointer where there are pixels.
+///  - PK_Success: done. A width or height of 0 does nothing.
+///  - PK_ErrFailed: a negative width or height, a width too great, or a null pointer where there are pixels.
 ///  - PK_ErrOutOfMemory: no memory for rows that are converted and together take more than 256 KiB.
 ///
 /// Arguments are checked in this order, before memory is touched; nothing is written after a failure.

@@ -43,14 +43,14 @@ extern "C" {
 ///
 /// That is done in the premultiplied 4:4:4 format of the image's colour and order: of 8 bits for formats of 8
 /// bits, of 15 for those of 15, else of 32f; rows of any other format are converted to it and back at quality
-/// 4.
+/// 4. So a flat image that is straight and not opaque may come back a code away.
 ///
 /// Memory: row bytes may be of either sign; no alignment is asked for. Of each row exactly the pixels are read
 /// or written, to the end of the last pair or group of six where the format has these.
 ///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on different
 /// images. PK_Initialize must have been called. From quality 4 on, denormal results become 0, as in
-/// conversions. Below, the floating-point mode is the caller's but for the row that is copied. On return it is
+/// conversions, though not the samples of kept rows that limit them. Below, the floating-point mode is the caller's but for the row that is copied. On return it is
 /// as it was; results are rounded by it. The exception flags of MXCSR are as before from quality 4 on, and else
 /// as the arithmetic left them.
 ///
@@ -59,14 +59,13 @@ extern "C" {
 /// \param format    a 4:2:2 format, V210 among them, or a 4:4:4 format of four channels: all raster formats but
 ///                  RGB_444_10u.
 /// \param width     pixels in a row, 0 to 134217727.
-/// \param height    rows; below 2 there is nothing to do.
+/// \param height    rows, not negative; of fewer than 2 there is nothing to do.
 /// \param field     which field is rebuilt, see above.
 /// \param quality   the method, see above.
 /// \return
 ///  - PK_ErrBadSrcFormat: none of these formats.
-///  - PK_Success: done. A width of 0 does nothing.
-///  - PK_ErrFailed: a negative width or a width too great, where there are rows, or a null pointer where there
-///    are pixels.
+///  - PK_Success: done. A width or height of 0 does nothing.
+///  - PK_ErrFailed: a negative width or height, a width too great, or a null pointer where there are pixels.
 ///  - PK_ErrOutOfMemory: no memory for rows that are converted and together take more than 256 KiB.
 ///
 /// Arguments are checked in this order, before memory is touched; nothing is written after a failure.
@@ -91,7 +90,7 @@ PK_API PK_Result PK_Deinterlace(void* buffer, int32_t rowBytes, PK_PixelFormat f
 /// \param destRowBytes    bytes from one row of it to the next.
 /// \param destFormat      a format that PK_Deinterlace takes.
 /// \param width           pixels in a row, 0 to 134217727.
-/// \param height          rows of both images; below 2 there is nothing to do.
+/// \param height          rows of both images, not negative; of fewer than 2 there is nothing to do.
 /// \param field           which field is rebuilt, as for PK_Deinterlace.
 /// \param quality         the method, as for PK_Deinterlace.
 /// \return

@@ -39,7 +39,7 @@ extern "C" {
 /// \param destRowBytes    bytes from one row of it to the next.
 /// \param destFormat      a raster format.
 /// \param width           pixels in a row, 0 to 134217727.
-/// \param height          rows; below 1 nothing is done.
+/// \param height          rows, not negative.
 /// \param opacity         of the image, 0 to 1; above 1 - 8e-6 it is full.
 /// \param quality         render quality, 0 to 5.
 /// \return
@@ -47,8 +47,8 @@ extern "C" {
 ///  - PK_ErrBadDstFormat: the destination format is.
 ///  - what PK_FillWithOpaqueBlack returns, where the opacity is below 8e-6: the source is not read then.
 ///  - PK_ErrBadSrcFormat, PK_ErrBadDstFormat: a format is outside the catalogue.
-///  - PK_Success: done; with a width of 0 or a height below 1 nothing was to do.
-///  - PK_ErrFailed: a negative width, a width too great, or a null pointer where there are pixels.
+///  - PK_Success: done; with a width or height of 0 nothing was to do.
+///  - PK_ErrFailed: a negative width or height, a width too great, or a null pointer where there are pixels.
 ///  - PK_ErrOutOfMemory: no memory for rows of a wide image that are converted.
 ///
 /// Arguments are checked in this order, before memory is touched; nothing is written after a failure.
@@ -72,8 +72,8 @@ PK_API PK_Result PK_CompositeToBlack(const void* source, int32_t sourceRowBytes,
 /// \return
 ///  - PK_ErrBadSrcFormat, PK_ErrBadDstFormat: a format is compressed or planar, else outside the catalogue.
 ///  - PK_ErrFailed: no place for the test result.
-///  - PK_Success: done; with a width of 0 or a height below 1 nothing was to do.
-///  - PK_ErrFailed: a negative width, a width too great, or a null pointer where there are pixels.
+///  - PK_Success: done; with a width or height of 0 nothing was to do.
+///  - PK_ErrFailed: a negative width or height, a width too great, or a null pointer where there are pixels.
 ///  - PK_ErrOutOfMemory: no memory for rows of a wide image that are converted.
 PK_API PK_Result PK_CompositeToBlackAndTestSourceAlpha(const void* source, int32_t sourceRowBytes,
                                                        PK_PixelFormat sourceFormat, void* dest,
@@ -96,15 +96,15 @@ PK_API PK_Result PK_CompositeToBlackAndTestSourceAlpha(const void* source, int32
 /// \param destRowBytes    bytes from one row of it to the next.
 /// \param format          of both images: RGB with straight or premultiplied alpha, at 8u, 15u or 32f.
 /// \param width           pixels in a row, 0 to 134217727.
-/// \param height          rows; below 1 nothing is done.
+/// \param height          rows, not negative.
 /// \param matteColor      one pixel.
 /// \param matteFormat     of that pixel, any that PK_Convert converts from.
 /// \param quality         render quality of the conversions, 0 to 5.
 /// \return
 ///  - PK_ErrBadSrcFormat: any other format.
 ///  - what PK_Convert returns, where it cannot convert the pixel of the matte.
-///  - PK_Success: done; with a width of 0 or a height below 1 nothing was to do.
-///  - PK_ErrFailed: a negative width, a width too great, or a null pointer where there are pixels.
+///  - PK_Success: done; with a width or height of 0 nothing was to do.
+///  - PK_ErrFailed: a negative width or height, a width too great, or a null pointer where there are pixels.
 ///  - PK_ErrNotSupported: no way from straight to premultiplied or back.
 ///  - PK_ErrOutOfMemory: no memory for the rows of a wide image.
 PK_API PK_Result PK_UnPremultiplyAgainstMatteColor(const void* source, int32_t sourceRowBytes, void* dest,

@@ -1,9 +1,9 @@
 // PK_Accumulate: weighted sums in premultiplied floats, in a stated order, of pictures that stand upright.
 
-#include "composite/RowPicture.h"
 #include "convert/RasterFormats.h"
 #include "frame/Capabilities.h"
 #include "frame/DebugSwitches.h"
+#include "support/AlignedPicture.h"
 #include "support/Allocations.h"
 #include "support/FlagScope.h"
 #include "support/FloatEnvironment.h"
@@ -41,7 +41,7 @@ struct Sources {
         formats.push_back(format);
         weights.push_back(weight);
     }
-    void Add(const RowPicture& picture, double weight) {
+    void Add(const AlignedPicture& picture, double weight) {
         Add(picture.Pixels(), picture.RowBytes(), picture.format, weight);
     }
     int32_t Count() const { return static_cast<int32_t>(pixels.size()); }
@@ -51,7 +51,7 @@ struct Sources {
         return PK_Accumulate(pixels.data(), rowBytes.data(), formats.data(), weights.data(), Count(),
                              destination, step, format, width, height, quality);
     }
-    PK_Result SumTo(RowPicture& to, int32_t quality) const {
+    PK_Result SumTo(AlignedPicture& to, int32_t quality) const {
         return SumTo(to.Pixels(), to.RowBytes(), to.format, to.width, to.height, quality);
     }
 };
@@ -66,32 +66,32 @@ Floats4 SumOf(const std::vector<std::pair<Floats4, double>>& summands) {
 }
 
 struct Summand {
-    RowPicture picture;
+    AlignedPicture picture;
     double weight;
 };
 
-float SampleOf(const RowPicture& picture, int32_t rowFromTop, int32_t sample) {
+float SampleOf(const AlignedPicture& picture, int32_t rowFromTop, int32_t sample) {
     float value;
     std::memcpy(&value, picture.RowFromTop(rowFromTop) + 4 * sample, sizeof value);
     return value;
 }
 
 /// Row by row from the top, in groups of ten.
-RowPicture ReferenceSum(const std::vector<Summand>& summands, PK_PixelFormat destination, int32_t width,
-                        int32_t height, int32_t quality) {
+AlignedPicture ReferenceSum(const std::vector<Summand>& summands, PK_PixelFormat destination, int32_t width,
+                            int32_t height, int32_t quality) {
     const PK_PixelFormat working =
         quality < 5 ? PK_PixelFormat_BGRP_4444_32f : PK_PixelFormat_BGRP_4444_32f_Linear;
     // The working format is stored bottom-up; its rows are told from the top in both.
-    std::deque<RowPicture> rows;
+    std::deque<AlignedPicture> rows;
     for (const Summand& summand : summands) {
-        const RowPicture& from = summand.picture;
-        RowPicture& to = rows.emplace_back(working, width, height);
+        const AlignedPicture& from = summand.picture;
+        AlignedPicture& to = rows.emplace_back(working, width, height);
         for (int32_t row = 0; row < height; ++row)
             EXPECT_EQ(PK_Convert(from.RowFromTop(row), 0, from.format, to.RowFromTop(row), 0, working, width,
                                  1, quality),
                       PK_Success);
     }
-    RowPicture sums(working, width, height), result(destination, width, height);
+    AlignedPicture sums(working, width, height), result(destination, width, height);
     for (int32_t row = 0; row < height; ++row) {
         for (int32_t sample = 0; sample < 4 * width; ++sample) {
             float total = 0;
@@ -129,7 +129,7 @@ protected:
         std::vector<Summand> summands;
         for (int32_t i = 0; i < count; ++i) {
             summands.push_back(
-                {RowPicture(format == 0 ? DrawFormat() : format, width, height), DrawWeight()});
+                {AlignedPicture(format == 0 ? DrawFormat() : format, width, height), DrawWeight()});
             summands.back().picture.FillOrdinary(fRandom);
         }
         return summands;
@@ -141,7 +141,7 @@ protected:
                                         << ", quality " << quality << ", seed " << fRandom.Seed());
         Sources sources;
         for (const Summand& summand : summands) sources.Add(summand.picture, summand.weight);
-        RowPicture sum(to, width, height);
+        AlignedPicture sum(to, width, height);
         ASSERT_EQ(sources.SumTo(sum, quality), PK_Success);
         EXPECT_EQ("", sum.DifferenceFrom(ReferenceSum(summands, to, width, height, quality)));
     }
@@ -277,12 +277,12 @@ TEST_F(Accumulate, MixesFormatsAtEveryTarget) {
 
 TEST_F(Accumulate, OfNothingIsTransparentBlack) {
     for (const PK_PixelFormat format : PK::kRasterFormats) {
-        RowPicture sum(format, 12, 2);
+        AlignedPicture sum(format, 12, 2);
         sum.FillOrdinary(fRandom);
         ASSERT_EQ(PK_Accumulate(nullptr, nullptr, nullptr, nullptr, 0, sum.Pixels(), sum.RowBytes(), format,
                                 12, 2, 4),
                   PK_Success);
-        EXPECT_EQ("", sum.DifferenceFrom(RowsIn(format, RowPicture(kSumFormat, 12, 2), 4)))
+        EXPECT_EQ("", sum.DifferenceFrom(RowsIn(format, AlignedPicture(kSumFormat, 12, 2), 4)))
             << std::hex << format;
     }
 }
@@ -295,10 +295,10 @@ TEST_F(Accumulate, WritesIntoAnyOfItsSources) {
                 SCOPED_TRACE(testing::Message() << std::hex << format << std::dec << ", " << place << " of "
                                                 << count << ", seed " << fRandom.Seed());
                 std::vector<Summand> summands = Draw(count, format, 13, 3);
-                const RowPicture expected = ReferenceSum(summands, format, 13, 3, 4);
+                const AlignedPicture expected = ReferenceSum(summands, format, 13, 3, 4);
                 Sources sources;
                 for (const Summand& summand : summands) sources.Add(summand.picture, summand.weight);
-                RowPicture& own = summands[static_cast<size_t>(place)].picture;
+                AlignedPicture& own = summands[static_cast<size_t>(place)].picture;
                 ASSERT_EQ(sources.SumTo(own, 4), PK_Success);
                 EXPECT_EQ("", own.DifferenceFrom(expected));
             }
@@ -361,7 +361,7 @@ TEST_F(Accumulate, AllocatesNothingForShortRows) {
     const std::vector<Summand> summands = Draw(5, PK_PixelFormat_BGRA_4444_8u, 1920, 1);
     Sources sources;
     for (const Summand& summand : summands) sources.Add(summand.picture, summand.weight);
-    RowPicture sum(PK_PixelFormat_BGRA_4444_8u, 1920, 1);
+    AlignedPicture sum(PK_PixelFormat_BGRA_4444_8u, 1920, 1);
     const int before = AllocationCount();
     ASSERT_EQ(sources.SumTo(sum, 4), PK_Success);
     EXPECT_EQ(AllocationCount(), before);

@@ -36,7 +36,7 @@ Pixel Gained(PK_PixelFormat format, Pixel pixel, float gain) {
     return out;
 }
 
-PK_Result Gain(const RowPicture& from, RowPicture& to, float gain, int32_t quality) {
+PK_Result Gain(const AlignedPicture& from, AlignedPicture& to, float gain, int32_t quality) {
     return PK_AlphaGain(from.Pixels(), from.RowBytes(), from.format, to.Pixels(), to.RowBytes(), to.format,
                         to.width, to.height, gain, quality);
 }
@@ -48,7 +48,7 @@ protected:
     void ExpectReference(PK_PixelFormat from, PK_PixelFormat to, float gain, int32_t quality) {
         SCOPED_TRACE(testing::Message() << std::hex << "0x" << from << " to 0x" << to << std::dec << ", gain "
                                         << gain << ", quality " << quality << ", seed " << fRandom.Seed());
-        RowPicture source(from, kWidth, kHeight), destination(to, kWidth, kHeight);
+        AlignedPicture source(from, kWidth, kHeight), destination(to, kWidth, kHeight);
         source.FillOrdinary(fRandom);
         ASSERT_EQ(Gain(source, destination, gain, quality), PK_Success);
         EXPECT_EQ("", destination.DifferenceFrom(ReferenceGain(source, to, gain, quality)));
@@ -137,10 +137,11 @@ TEST_F(AlphaGain, ScalesAlphaAloneOfBytesInReversedOrder) {
 
 TEST_F(AlphaGain, LeavesWhatHasNoAlphaAsItIs) {
     EXPECT_EQ(Gained(PK_PixelFormat_UYVY_422_8u, Bytes4{90, 50, 150, 200}, 0.5f)[1], 50);
-    RowPicture source(PK_PixelFormat_V210_422_10u, 12, 1), destination(PK_PixelFormat_V210_422_10u, 12, 1);
+    AlignedPicture source(PK_PixelFormat_V210_422_10u, 12, 1),
+        destination(PK_PixelFormat_V210_422_10u, 12, 1);
     source.FillOrdinary(fRandom);
     for (const int32_t quality : {2, 3}) {
-        RowPicture unscaled(source.format, 12, 1);
+        AlignedPicture unscaled(source.format, 12, 1);
         ASSERT_EQ(Gain(source, destination, 0.3f, quality), PK_Success);
         ASSERT_EQ(Gain(source, unscaled, 1.0f, quality), PK_Success);
         EXPECT_EQ("", destination.DifferenceFrom(unscaled));
@@ -247,9 +248,9 @@ TEST_F(AlphaGain, PairsRowsInMemoryWhateverTheirOrigin) {
 TEST_F(AlphaGain, WorksInPlace) {
     for (const PK_PixelFormat format : PK::kRasterFormats) {
         SCOPED_TRACE(testing::Message() << std::hex << format << ", seed " << fRandom.Seed());
-        RowPicture picture(format, 37, 3);
+        AlignedPicture picture(format, 37, 3);
         picture.FillOrdinary(fRandom);
-        RowPicture expected(format, 37, 3);
+        AlignedPicture expected(format, 37, 3);
         ASSERT_EQ(Gain(picture, expected, 0.6f, 4), PK_Success);
         ASSERT_EQ(Gain(picture, picture, 0.6f, 4), PK_Success);
         EXPECT_EQ("", picture.DifferenceFrom(expected));
@@ -282,7 +283,7 @@ TEST_F(AlphaGain, TouchesItsRowsAlone) {
 
 TEST_F(AlphaGain, ConvertsRowsTooLongForTheStack) {
     constexpr int32_t kLong = 16400;
-    RowPicture source(PK_PixelFormat_V210_422_10u, kLong, 1),
+    AlignedPicture source(PK_PixelFormat_V210_422_10u, kLong, 1),
         destination(PK_PixelFormat_ARGB_4444_32f, kLong, 1);
     source.FillOrdinary(fRandom);
     ASSERT_EQ(Gain(source, destination, 0.4f, 4), PK_Success);

@@ -21,9 +21,9 @@ constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u, kV210 = PK_PixelFo
 
 PK_Result Dissolve(AlignedPicture& first, AlignedPicture& second, AlignedPicture& out, int32_t width,
                    int32_t height, float ratio, int32_t quality = 4) {
-    return PK_CrossDissolve(first.Pixels(), first.RowBytes(), first.Format(), second.Pixels(),
-                            second.RowBytes(), second.Format(), out.Pixels(), out.RowBytes(), out.Format(),
-                            width, height, ratio, quality);
+    return PK_CrossDissolve(first.Pixels(), first.RowBytes(), first.format, second.Pixels(),
+                            second.RowBytes(), second.format, out.Pixels(), out.RowBytes(), out.format, width,
+                            height, ratio, quality);
 }
 
 PK_PixelFormat InCatalogue(PK_PixelFormat format) {
@@ -71,33 +71,33 @@ protected:
         const bool hasSSE2 = PK::sCPUHasSSE2 != 0;
         AlignedPicture first(firstFormat, kWidth, kHeight), second(secondFormat, kWidth, kHeight),
             out(format, kWidth, kHeight);
-        first.Fill(fRandom);
-        second.Fill(fRandom);
+        first.FillOrdinary(fRandom);
+        second.FillOrdinary(fRandom);
         ASSERT_EQ(Dissolve(first, second, out, kWidth, kHeight, ratio, quality), PK_Success);
 
         const bool isV210 = (format & ~0x200u) == kV210 && firstFormat == format && secondFormat == format;
         const Expectation expected = Expected(firstFormat, secondFormat, format, quality, hasSSE2);
         AlignedPicture a(expected.working, kWidth, 1), b(expected.working, kWidth, 1),
             mixed(expected.working, kWidth, 1), wanted(format, kWidth, 1);
-        const auto depth = static_cast<SampleDepth>(a.RowLength() / kWidth / 4);
+        const auto depth = static_cast<SampleDepth>(a.rowLength / kWidth / 4);
         for (int32_t row = 0; row < kHeight; ++row) {
             if (isV210 && hasSSE2) {
-                for (size_t at = 0; at < out.RowLength(); at += 4) {
+                for (size_t at = 0; at < out.rowLength; at += 4) {
                     uint32_t one, other;
-                    std::memcpy(&one, first.Row(row) + at, 4);
-                    std::memcpy(&other, second.Row(row) + at, 4);
+                    std::memcpy(&one, first.RowFromTop(row) + at, 4);
+                    std::memcpy(&other, second.RowFromTop(row) + at, 4);
                     const uint32_t word = ReferenceDissolveV210(one, other, 1 - ratio);
                     std::memcpy(wanted.Pixels() + at, &word, 4);
                 }
             } else {
-                ConvertRow(first.Row(row), firstFormat, a.Pixels(), a.Format(), kWidth, quality);
-                ConvertRow(second.Row(row), secondFormat, b.Pixels(), b.Format(), kWidth, quality);
+                ConvertRow(first.RowFromTop(row), firstFormat, a.Pixels(), a.format, kWidth, quality);
+                ConvertRow(second.RowFromTop(row), secondFormat, b.Pixels(), b.format, kWidth, quality);
                 const bool alphaFirst = (expected.working & 0x1000) != 0;
                 ReferenceDissolveRow(expected.rule, depth, alphaFirst, a.Pixels(), b.Pixels(), mixed.Pixels(),
                                      kWidth, 1 - ratio);
-                ConvertRow(mixed.Pixels(), mixed.Format(), wanted.Pixels(), format, kWidth, quality);
+                ConvertRow(mixed.Pixels(), mixed.format, wanted.Pixels(), format, kWidth, quality);
             }
-            ASSERT_EQ("", FirstDifference(format, out.RowLength(), wanted.Pixels(), out.Row(row)))
+            ASSERT_EQ("", FirstDifference(format, out.rowLength, wanted.Pixels(), out.RowFromTop(row)))
                 << std::hex << "0x" << firstFormat << ", 0x" << secondFormat << " to 0x" << format << " in 0x"
                 << expected.working << std::dec << ", row " << row << ", quality " << quality << ", ratio "
                 << ratio << ", SSE2 " << hasSSE2 << ", seed " << fRandom.Seed();

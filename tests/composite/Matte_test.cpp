@@ -179,5 +179,6 @@ TEST_F(Matte, RefusesSizesAndNullPointersAndDoesNothingForNoPixels) {
     EXPECT_EQ(result(pixels, nullptr, 1, 1, pixels), PK_ErrFailed);
     EXPECT_EQ(result(pixels, pixels, 1, 1, nullptr), PK_ErrFailed);
     EXPECT_EQ(result(nullptr, nullptr, 0, 1, pixels), PK_Success);
-    EXPECT_EQ(result(nullptr, nullptr, 1, -1, pixels), PK_Success);
+    EXPECT_EQ(result(nullptr, nullptr, 1, 0, pixels), PK_Success);
+    EXPECT_EQ(result(pixels, pixels, 1, -1, pixels), PK_ErrFailed);
 }

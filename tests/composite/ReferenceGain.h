@@ -2,7 +2,7 @@
 
 // The gain of an image restated slowly: the table of formats one by one, and a pixel at a time.
 
-#include "composite/RowPicture.h"
+#include "support/AlignedPicture.h"
 
 #include <algorithm>
 #include <cmath>
@@ -102,11 +102,11 @@ inline void ScaleFloats(uint8_t* pixel, Scaled scaled, float gain) {
     std::memcpy(pixel, samples, sizeof samples);
 }
 
-inline RowPicture ReferenceGain(const RowPicture& source, PK_PixelFormat destination, float gain,
-                                int32_t quality) {
+inline AlignedPicture ReferenceGain(const AlignedPicture& source, PK_PixelFormat destination, float gain,
+                                    int32_t quality) {
     const Method method = MethodOf(destination, quality);
     const bool isFloat = method.scaled == Scaled::kAlpha32 || method.scaled == Scaled::kAll32;
-    RowPicture working = RowsIn(method.working, source, quality);
+    AlignedPicture working = RowsIn(method.working, source, quality);
     for (int32_t row = 0; row < working.height; ++row)
         for (int32_t column = 0; column < working.width; ++column)
             if (isFloat)

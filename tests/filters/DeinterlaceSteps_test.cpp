@@ -18,8 +18,8 @@ namespace {
 
 PK_Result Copy(AlignedPicture& source, AlignedPicture& out, int32_t width, int32_t height, int32_t field,
                int32_t quality) {
-    return PK_DeinterlaceCopy(source.Pixels(), source.RowBytes(), source.Format(), out.Pixels(),
-                              out.RowBytes(), out.Format(), width, height, field, quality);
+    return PK_DeinterlaceCopy(source.Pixels(), source.RowBytes(), source.format, out.Pixels(), out.RowBytes(),
+                              out.format, width, height, field, quality);
 }
 
 bool IsTaken(PK_PixelFormat format) {
@@ -37,9 +37,10 @@ public:
         if (field != 0) CopyRow(1, 0);
         int32_t kept = first;
         for (int32_t round = 0; round < fHeight / 2 - 1; ++round, kept += 2)
-            ASSERT_EQ(PK_CrossDissolve(fSource.Row(kept), 0, fSource.Format(), fSource.Row(kept + 2), 0,
-                                       fSource.Format(), fDestination.Row(kept + 1), 0, fDestination.Format(),
-                                       fWidth, 1, 0.5f, 4),
+            ASSERT_EQ(PK_CrossDissolve(fSource.RowFromTop(kept), 0, fSource.format,
+                                       fSource.RowFromTop(kept + 2), 0, fSource.format,
+                                       fDestination.RowFromTop(kept + 1), 0, fDestination.format, fWidth, 1,
+                                       0.5f, 4),
                       PK_Success);
         if (field == 0) CopyRow(kept, kept + 1);
     }
@@ -56,14 +57,14 @@ private:
         ASSERT_EQ(PK_Convert(from, 0, fromFormat, to, 0, toFormat, fWidth, 1, 4), PK_Success);
     }
     void CopyRow(int32_t from, int32_t to) {
-        Convert(fSource.Row(from), fSource.Format(), fDestination.Row(to), fDestination.Format());
+        Convert(fSource.RowFromTop(from), fSource.format, fDestination.RowFromTop(to), fDestination.format);
     }
 
     PK_PixelFormat Working() const {
-        uint32_t depth = fDestination.Format() & 0x1c0;
+        uint32_t depth = fDestination.format & 0x1c0;
         if (depth == 0x40) depth = 0x80;
-        if ((fSource.Format() & 0x1c0) != (fDestination.Format() & 0x1c0)) depth = 0x100;
-        PK_PixelFormat working = (fDestination.Format() & ~0x1fcu) | 8 | depth;
+        if ((fSource.format & 0x1c0) != (fDestination.format & 0x1c0)) depth = 0x100;
+        PK_PixelFormat working = (fDestination.format & ~0x1fcu) | 8 | depth;
         if ((working & 1) != 0) working &= ~0x1000u; // VUY has one order
         return PK::IsRasterFormat(working) ? working : (working & ~0x1c0u) | 0x100;
     }
@@ -71,12 +72,12 @@ private:
     void Interpolate(int32_t row) {
         AlignedPicture above(Working(), fWidth, 1), below(Working(), fWidth, 1),
             between(Working(), fWidth, 1);
-        Convert(fSource.Row(row - 1), fSource.Format(), above.Pixels(), above.Format());
-        Convert(fSource.Row(row + 1), fSource.Format(), below.Pixels(), below.Format());
-        const auto depth = static_cast<SampleDepth>(above.RowLength() / static_cast<size_t>(fWidth) / 4);
+        Convert(fSource.RowFromTop(row - 1), fSource.format, above.Pixels(), above.format);
+        Convert(fSource.RowFromTop(row + 1), fSource.format, below.Pixels(), below.format);
+        const auto depth = static_cast<SampleDepth>(above.rowLength / static_cast<size_t>(fWidth) / 4);
         ReferenceInterpolateRow(depth, (Working() & 0x1000) != 0, above.Pixels(), below.Pixels(),
                                 between.Pixels(), fWidth);
-        Convert(between.Pixels(), between.Format(), fDestination.Row(row), fDestination.Format());
+        Convert(between.Pixels(), between.format, fDestination.RowFromTop(row), fDestination.format);
     }
 
     AlignedPicture &fSource, &fDestination;
@@ -90,14 +91,14 @@ protected:
     void CheckPair(PK_PixelFormat from, PK_PixelFormat to, int32_t width, int32_t height, int32_t field,
                    int32_t quality) {
         AlignedPicture source(from, width, height), out(to, width, height);
-        source.Fill(fRandom);
-        out.Fill(fRandom);
+        source.FillOrdinary(fRandom);
+        out.FillOrdinary(fRandom);
         AlignedPicture expected = out;
         ASSERT_EQ(Copy(source, out, width, height, field, quality), PK_Success);
         Steps steps(source, expected, width, height);
         quality < 4 ? steps.Average(field) : steps.AlongEdges(field);
         for (int32_t row = 0; row < height; ++row)
-            ASSERT_EQ("", FirstDifference(to, out.RowLength(), expected.Row(row), out.Row(row)))
+            ASSERT_EQ("", FirstDifference(to, out.rowLength, expected.RowFromTop(row), out.RowFromTop(row)))
                 << std::hex << "0x" << from << " to 0x" << to << std::dec << ", row " << row << " of "
                 << height << ", width " << width << ", field " << field << ", quality " << quality
                 << ", seed " << fRandom.Seed();

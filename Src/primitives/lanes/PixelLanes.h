@@ -97,7 +97,12 @@ struct Pixels32f {
     }
 };
 
-inline Channels Select(I32 mask, const Channels& a, const Channels& b) {
+/// Of Channels or IntChannels.
+template <class Four>
+requires requires(Four four) {
+    four.c3;
+}
+inline Four Select(I32 mask, const Four& a, const Four& b) {
     return {Select(mask, a.c0, b.c0), Select(mask, a.c1, b.c1), Select(mask, a.c2, b.c2),
             Select(mask, a.c3, b.c3)};
 }
