@@ -1,13 +1,16 @@
-// What it costs to hand a task to the pool: empty parts, so that nothing is measured but the way there and back.
+// What it costs to hand a task to the pool: empty parts, so that nothing is measured but the way there and back. And what
+// bands bring: composites of 1080 lines, to be held beside the same on one processor (taskset -c 1).
 
 #include "frame/Task.h"
 
+#include <PixelKiln/Composite.h>
 #include <PixelKiln/Lifecycle.h>
 
 #include <benchmark/benchmark.h>
 
 #include <chrono>
 #include <thread>
+#include <vector>
 
 namespace {
 
@@ -42,6 +45,27 @@ void AfterAPause(benchmark::State& state) {
     }
 }
 
+constexpr int32_t kWidth = 1920, kHeight = 1080;
+
+template <PK_PixelFormat kFormat, PK_BlendMode kMode>
+void CompositeBands(benchmark::State& state) {
+    const int32_t rowBytes = PK_PixelFormatPackedRowBytes(kFormat, kWidth);
+    const std::vector<uint8_t> top(static_cast<size_t>(rowBytes) * kHeight, 60);
+    std::vector<uint8_t> back = top;
+    for (auto _ : state)
+        PK_CompositeWithBlendMode(top.data(), rowBytes, kFormat, back.data(), rowBytes, kFormat, back.data(),
+                                  rowBytes, kFormat, kWidth, kHeight, 0.6f, kMode, 4, false);
+}
+
+BENCHMARK(CompositeBands<PK_PixelFormat_BGRP_4444_8u, PK_BlendMode_Normal>)
+    ->UseRealTime()
+    ->Unit(benchmark::kMicrosecond);
+BENCHMARK(CompositeBands<PK_PixelFormat_BGRA_4444_8u, PK_BlendMode_Normal>)
+    ->UseRealTime()
+    ->Unit(benchmark::kMicrosecond);
+BENCHMARK(CompositeBands<PK_PixelFormat_BGRA_4444_32f, PK_BlendMode_Multiply>)
+    ->UseRealTime()
+    ->Unit(benchmark::kMicrosecond);
 BENCHMARK(BackToBack)->Arg(1)->Arg(64)->UseRealTime()->Unit(benchmark::kMicrosecond);
 BENCHMARK(AfterAPause)->Arg(1)->Arg(64)->UseManualTime()->Iterations(2000)->Unit(benchmark::kMicrosecond);
 

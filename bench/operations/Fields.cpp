@@ -1,4 +1,4 @@
-// Fields rebuilt in place.
+// Fields rebuilt, in place and beside a copy of those that are kept.
 
 #include "operations/Operation.h"
 
@@ -12,6 +12,14 @@ constexpr size_t kCount = kPixels;
 template <PK_PixelFormat kFormat, int32_t kRowBytes, int32_t kQuality>
 Run Rebuild(const uint8_t*, uint8_t* image) {
     return [=] { PK_Deinterlace(image, kRowBytes, kFormat, kWidth, kHeight, 0, kQuality); };
+}
+
+template <PK_PixelFormat kFormat, int32_t kRowBytes>
+Run RebuildBesideCopy(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        PK_DeinterlaceCopy(source, kRowBytes, kFormat, destination, kRowBytes, kFormat, kWidth, kHeight, 0,
+                           4);
+    };
 }
 
 // Half of the frame is read and half is written; a copy of the frame reads and writes all.
@@ -29,6 +37,10 @@ const AddOperations add = {
      Rebuild<PK_PixelFormat_BGRP_4444_8u, kBGRARowBytes, 3>},
     {"Deinterlacing of UYVY 8u by means", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Nothing, 0,
      Rebuild<PK_PixelFormat_UYVY_422_8u, 2 * kWidth, 3>},
+    {"Deinterlacing of BGRP 8u along edges, copied", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Peer, 1,
+     RebuildBesideCopy<PK_PixelFormat_BGRP_4444_8u, kBGRARowBytes>},
+    {"Deinterlacing of UYVY 8u along edges, copied", 2 * kCount, 2 * kCount, Samples::Bytes, Against::Peer, 1,
+     RebuildBesideCopy<PK_PixelFormat_UYVY_422_8u, 2 * kWidth>},
 };
 // clang-format on
 

@@ -12,8 +12,11 @@
 
 namespace OperationBench {
 
-inline constexpr int32_t kWidth = 1920;
-inline constexpr int32_t kHeight = 1080;
+#ifndef OPERATION_BENCH_LINES
+#define OPERATION_BENCH_LINES 1080
+#endif
+inline constexpr int32_t kHeight = OPERATION_BENCH_LINES;
+inline constexpr int32_t kWidth = kHeight / 9 * 16;
 inline constexpr int32_t kPixels = kWidth * kHeight;
 inline constexpr int32_t kBGRARowBytes = 4 * kWidth;
 inline constexpr int32_t kTurnedRowBytes = 4 * kHeight;
