@@ -26,7 +26,7 @@ PK_Result Composite(const MixImages& images, float opacity, int32_t quality, boo
         return ShowAlone(top, destination, quality);
 
     if (const auto result = ResultWithoutWork(images)) return *result;
-    const CompositeChoice choice = ChooseComposite(images.Formats(), inLinear);
+    const CompositeChoice choice = ChooseComposite(images, inLinear);
     MixPlan plan;
     if (!plan.Build(images.Formats(), choice.working, choice.kernel, opacity, quality)) return PK_ErrFailed;
     return RunInFourBands(plan, images);

@@ -47,9 +47,16 @@ PK_PixelFormat WorkingFormat(PK_PixelFormat destination, bool is8u) {
     return HasNoAlphaMeaning(format) ? WithAlpha(format, kAlphaPremultiplied) : format;
 }
 
+bool BeginLikeTemporaryRows(const DestinationImage& image) {
+    constexpr uintptr_t kBoundary = 16; // that kernels count from
+    return (reinterpret_cast<uintptr_t>(image.pixels) | static_cast<uintptr_t>(image.rowBytes)) % kBoundary ==
+           0;
+}
+
 } // namespace
 
-CompositeChoice ChooseComposite(const MixFormats& given, bool inLinear) {
+CompositeChoice ChooseComposite(const MixImages& images, bool inLinear) {
+    const MixFormats given = images.Formats();
     const bool is8u = DepthOf(given.destination) == kDepth8u;
     const bool topIsOpaque = HasNoAlphaMeaning(given.first), backIsOpaque = HasNoAlphaMeaning(given.second);
     const OverKernels& kernels = Best<OverKernels>();
@@ -64,14 +71,18 @@ CompositeChoice ChooseComposite(const MixFormats& given, bool inLinear) {
         working = WorkingFormat(given.destination, is8u);
         kernel = MembersFor(is8u, isStraight, IsYUV(given.destination)).Of(topIsOpaque, backIsOpaque);
     }
-    if (!inLinear) {
-        working = With(working, kLightMask, kLightGamma);
-        return {{working, working, working}, kernels.*kernel};
-    }
-    const auto asRead = [working](bool isOpaque) {
-        return isOpaque ? WithAlpha(working, kAlphaMeaningless) : working;
+    if (!inLinear) working = With(working, kLightMask, kLightGamma);
+    // What is opaque to the kernel needs no alpha written before, and over an opaque back codes of 8 bits need none behind.
+    // Kernels round by where a row begins: without its own row the result must begin like one.
+    const PK_PixelFormat opaque = WithAlpha(working, kAlphaMeaningless);
+    const auto asRead = [=](PK_PixelFormat format, bool isOpaque) {
+        return isOpaque && (inLinear || format == opaque) ? opaque : working;
     };
-    return {{asRead(topIsOpaque), asRead(backIsOpaque), working}, kernels.*kernel};
+    const bool staysOpaque =
+        is8u && backIsOpaque && given.destination == opaque && BeginLikeTemporaryRows(images.destination);
+    return {{asRead(given.first, topIsOpaque), asRead(given.second, backIsOpaque),
+             staysOpaque ? opaque : working},
+            kernels.*kernel};
 }
 
 } // namespace PK

@@ -11,8 +11,8 @@ struct CompositeChoice {
     MixKernel kernel;
 };
 
-/// \param given     raster formats.
+/// \param images    of raster formats.
 /// \param inLinear  whether a destination in linear light is composited in linear light.
-CompositeChoice ChooseComposite(const MixFormats& given, bool inLinear);
+CompositeChoice ChooseComposite(const MixImages& images, bool inLinear);
 
 } // namespace PK

@@ -9,6 +9,8 @@
 #include "primitives/lanes/PixelLanes.h"
 #include "primitives/lanes/RowDriver.h"
 
+#include <type_traits>
+
 namespace PK::PK_TARGET {
 namespace {
 
@@ -92,7 +94,7 @@ inline Cover CoverOf(I32 top, I32 back, F32 opacity) {
 
 /// (s x a + b x (1 - a) x ba / 255) x 255 / A. Over a clear back the top keeps its colour.
 template <class Rule, Opaque kOpaque>
-inline I32 MixStraight(I32 top, I32 back, const Cover& c, F32) {
+inline I32 MixStraight(I32 top, I32 back, const Cover& c) {
     const IntChannels s = ByteChannels(top), b = ByteChannels(back);
     const F32 backPart = Rule::Part(c.back), inverse = Rule::Inverse(c.both);
     const auto mix = [&](I32 x, I32 y) {
@@ -109,18 +111,19 @@ inline I32 MixStraight(I32 top, I32 back, const Cover& c, F32) {
 template <bool kIsYUV>
 inline constexpr int32_t kZeros = kIsYUV ? 0x00108080 : 0;
 
-/// A pixel without alpha has no colour, whatever stands there.
+/// A pixel without alpha has no colour, whatever stands there, but where it shows alone.
 template <bool kIsYUV, bool kIsOpaque>
-inline I32 WithoutStaleColour(I32 pixels) {
+inline I32 WithoutStaleColour(I32 pixels, I32 showsAlone = Ints(0)) {
     if constexpr (kIsOpaque) return pixels;
-    return Select(Equal(AlphaOf(pixels), Ints(0)), Ints(kZeros<kIsYUV>), pixels);
+    const I32 isStale = Equal(AlphaOf(pixels), Ints(0)) & Not(showsAlone);
+    return Select(isStale, Ints(kZeros<kIsYUV>), pixels);
 }
 
 /// s x o + b x (1 - a), about the zeros of the samples.
 template <bool kIsYUV, Opaque kOpaque>
-inline I32 MixPremultiplied(I32 top, I32 back, const Cover& c, F32 opacity) {
+inline I32 MixPremultiplied(I32 top, I32 back, const Cover& c, F32 opacity, I32 isNone) {
     const IntChannels s = ByteChannels(WithoutStaleColour<kIsYUV, kOpaque.top>(top));
-    const IntChannels b = ByteChannels(WithoutStaleColour<kIsYUV, kOpaque.back>(back));
+    const IntChannels b = ByteChannels(WithoutStaleColour<kIsYUV, kOpaque.back>(back, isNone));
     const auto mix = [&]<int32_t kZero>(I32 x, I32 y) {
         if constexpr (kZero == 0) return ToFloat(x) * opacity + ToFloat(y) * c.rest;
         const F32 zero = Floats(kZero);
@@ -128,7 +131,7 @@ inline I32 MixPremultiplied(I32 top, I32 back, const Cover& c, F32 opacity) {
     };
     constexpr int32_t kChroma = kIsYUV ? 128 : 0, kLuma = kIsYUV ? 16 : 0;
     return Rounded(mix.template operator()<kChroma>(s.c0, b.c0), mix.template operator()<kChroma>(s.c1, b.c1),
-                   mix.template operator()<kLuma>(s.c2, b.c2), c.both);
+                   mix.template operator()<kLuma>(s.c2, b.c2), kOpaque.back ? Floats(255) : c.both);
 }
 
 template <Colour kColour, Opaque kOpaque, class Rule>
@@ -141,16 +144,23 @@ struct OverCodes : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
         const I32 opaqueTop = LoadInts(top) | full, s = kOpaque.top ? opaqueTop : LoadInts(top);
         const Cover cover = CoverOf<Rule, kOpaque>(s, b, opacity);
         const I32 isNone = Rule::IsNone(cover.part), isFull = Rule::IsFull(cover.part);
+        if constexpr (kMixesAll) return Store(destination, Mix(s, b, cover, isNone));
         I32 shown = opaqueTop;
-        if (!All(isNone | isFull)) shown = Select(isFull, opaqueTop, Mix(s, b, cover));
+        if (!All(isNone | isFull)) shown = Select(isFull, opaqueTop, Mix(s, b, cover, isNone));
         Store(destination, Select(isNone, b, shown));
     }
 
-    I32 Mix(I32 top, I32 back, const Cover& cover) const {
+    /// Four that a clear top leaves as they are come out so anyway. None is full, a being below 1 - 2^-17 where the opacity is
+    /// not 1, and at 1 OverFully does the work.
+    static constexpr bool kMixesAll =
+        kColour == Colour::premultiplied && !kOpaque.top && std::is_same_v<Rule, ByFours>;
+
+    I32 Mix(I32 top, I32 back, const Cover& cover, I32 isNone) const {
         if constexpr (kColour == Colour::straight)
-            return MixStraight<Rule, kOpaque>(top, back, cover, opacity);
+            return MixStraight<Rule, kOpaque>(top, back, cover);
         else
-            return MixPremultiplied<kColour == Colour::premultipliedYUV, kOpaque>(top, back, cover, opacity);
+            return MixPremultiplied<kColour == Colour::premultipliedYUV, kOpaque>(top, back, cover, opacity,
+                                                                                  isNone);
     }
 
     F32 opacity;
@@ -165,9 +175,8 @@ struct OverFully : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
         const I32 b = kOpaque.back ? LoadInts(back) | full : LoadInts(back);
         const I32 s = kOpaque.top ? LoadInts(top) | full : LoadInts(top), alpha = AlphaOf(s);
         const I32 isNone = Rule::Agreed(Equal(alpha, Ints(0)));
-        const I32 rest = ScaleBytes(WithoutStaleColour<false, kOpaque.back>(b), Ints(255) - alpha);
-        const I32 sum = AddBytes(WithoutStaleColour<false, kOpaque.top>(s), rest);
-        Store(destination, Select(isNone, b, sum));
+        const I32 rest = ScaleBytes(WithoutStaleColour<false, kOpaque.back>(b, isNone), Ints(255) - alpha);
+        Store(destination, AddBytes(WithoutStaleColour<false, kOpaque.top>(s), rest));
     }
 };
 

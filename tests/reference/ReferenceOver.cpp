@@ -57,7 +57,10 @@ Pixel Alone(const OverRule& rule, const Pixel& s, const Pixel& b, float o) {
             },
             alpha);
     }
-    const float alpha = both ? (o + (1 - o)) * 255 : b[3] == 0 ? as : as + ba * rest;
+    const float alpha = rule.backIsOpaque ? 255
+                        : both            ? (o + (1 - o)) * 255
+                        : b[3] == 0       ? as
+                                          : as + ba * rest;
     return Channelwise(
         [&](size_t i) {
             const float zero = ZeroOf(rule, static_cast<int>(i)), x = s[i], y = b[i];
@@ -86,7 +89,7 @@ Pixel InMixedFour(const OverRule& rule, Pixel s, Pixel b, float o) {
             if (rule.isStraight) return (x * a + y * rest * shown) * Inverse(alpha);
             return (x - zero) * o + zero + (y - zero) * rest;
         },
-        alpha);
+        rule.backIsOpaque && !rule.isStraight ? 255 : alpha);
 }
 
 void Four(const OverRule& rule, const uint8_t* top, const uint8_t* back, uint8_t* destination, int64_t x,
