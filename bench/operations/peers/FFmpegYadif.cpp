@@ -45,9 +45,10 @@ public:
         fFrame->format = format;
         fFrame->width = kWidth;
         fFrame->height = kHeight;
+        fFrame->pts = 0;
         Check(av_frame_get_buffer(fFrame.get(), 64));
         for (int plane = 0; plane < av_pix_fmt_count_planes(format); ++plane)
-            std::copy_n(bytes, fFrame->buf[plane]->size, fFrame->data[plane]);
+            std::copy_n(bytes, fFrame->linesize[plane] * kHeight, fFrame->data[plane]);
         Push(); // the filter is one frame behind
     }
 
