@@ -61,7 +61,7 @@ void FuzzCrossDissolve(ByteStream& stream) {
                                 second.RowBytes(), second.format, destination.Pixels(),
                                 destination.RowBytes(), format, size.width, size.height, ratio, quality);
     });
-    PK_Result expected = ResultOfRows(size, first.isNull || second.isNull || destination.isNull);
+    PK_Result expected = ResultOfPixels(size, first.isNull || second.isNull || destination.isNull);
     if (!PK::IsRasterFormat(format)) expected = PK_ErrBadDstFormat;
     if (!PK::IsRasterFormat(first.format) || !PK::IsRasterFormat(second.format))
         expected = PK_ErrBadSrcFormat;

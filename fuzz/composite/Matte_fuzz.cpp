@@ -31,19 +31,13 @@ float DrawOpacity(ByteStream& stream) {
     return std::fpclassify(any) == FP_SUBNORMAL ? 0 : any;
 }
 
-/// Where there are pixels to write.
-PK_Result ExpectedOfSize(Size size, bool hasNull) {
-    if (size.height < 1 || size.width == 0) return PK_Success;
-    return size.width < 0 || hasNull ? PK_ErrFailed : PK_Success;
-}
-
 PK_Result ExpectedToBlack(const Input& source, const Input& destination, Size size) {
     for (const auto isRefused : {+[](PK_PixelFormat format) { return PK::IsStream(format); },
                                  +[](PK_PixelFormat format) { return !PK::IsRasterFormat(format); }}) {
         if (isRefused(source.format)) return PK_ErrBadSrcFormat;
         if (isRefused(destination.format)) return PK_ErrBadDstFormat;
     }
-    return ExpectedOfSize(size, source.isNull || destination.isNull);
+    return ResultOfPixels(size, source.isNull || destination.isNull);
 }
 
 void FuzzToBlack(ByteStream& stream, uint32_t state) {
@@ -91,7 +85,7 @@ void FuzzMatte(ByteStream& stream, uint32_t state) {
     const bool hasMatte = !matte.isNull;
     CheckResult(!isServed   ? PK_ErrBadSrcFormat
                 : !hasMatte ? PK_ErrFailed
-                            : ExpectedOfSize(size, source.isNull || destination.isNull),
+                            : ResultOfPixels(size, source.isNull || destination.isNull),
                 result);
     source.memory.CheckStays();
     matte.memory.CheckStays();

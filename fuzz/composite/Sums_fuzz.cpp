@@ -28,13 +28,6 @@ Size DrawSize(ByteStream& stream) {
     return {stream.Between(-1, 90), stream.Between(0, 20)};
 }
 
-/// What both say of sizes and pointers, once the formats are good.
-PK_Result ResultOfPixels(Size size, bool hasNull) {
-    if (size.width < 0 || size.height < 0) return PK_ErrFailed;
-    if (size.width == 0 || size.height == 0) return PK_Success;
-    return size.HasPixels() && !hasNull ? PK_Success : PK_ErrFailed;
-}
-
 /// Expansion to 15 bits goes by where a pixel lies.
 bool IsPlaceFree(PK_PixelFormat destination) {
     return PK::DepthOf(destination) != PK::kDepth15u;

@@ -80,7 +80,7 @@ void FuzzDeinterlace(ByteStream& stream) {
         return PK_DeinterlaceCopy(source.Pixels(), source.RowBytes(), from, pixels, image.RowBytes(), format,
                                   size.width, size.height, request.field, request.quality);
     });
-    PK_Result expected = ResultOfRows(request.size, isNull);
+    PK_Result expected = ResultOfPixels(request.size, isNull);
     if (!IsTaken(format)) expected = PK_ErrBadDstFormat;
     if (!IsTaken(from)) expected = PK_ErrBadSrcFormat;
     CheckResult(expected, result);

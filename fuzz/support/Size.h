@@ -28,4 +28,10 @@ inline PK_Result ResultOfRows(Size size, bool hasNull) {
     return size.HasPixels() && !hasNull ? PK_Success : PK_ErrFailed;
 }
 
+/// What operations say that refuse every negative size.
+inline PK_Result ResultOfPixels(Size size, bool hasNull) {
+    if (size.width < 0 || size.height < 0) return PK_ErrFailed;
+    return ResultOfRows(size, hasNull);
+}
+
 } // namespace PKFuzz
