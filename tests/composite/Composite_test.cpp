@@ -294,6 +294,21 @@ TEST_F(Composite, RandomSizesAtEveryTarget) {
     });
 }
 
+// With widths of whole fours the rows begin where temporary ones would, and no alpha is written before or behind.
+TEST_F(Composite, OpaqueImagesAreMixedWhereTheyLie) {
+    constexpr PK_PixelFormat kVUYP = PK_PixelFormat_VUYP_4444_8u, kVUYX = PK_PixelFormat_VUYX_4444_8u;
+    AtEveryTarget([&] {
+        for (const Formats& formats :
+             {Formats{kBGRP, kBGRX, kBGRX}, Formats{kBGRX, kBGRX, kBGRX}, Formats{kBGRX, kBGRP, kBGRX},
+              Formats{kVUYP, kVUYX, kVUYX}, Formats{kBGRP, kVUYX, kBGRX}})
+            for (const int32_t width : {4, 8, 12, 16, 20, 33, 64, 68}) {
+                Check(formats, width, 3, 0.3f, false, fRandom);
+                Check(formats, width, 3, IsOpaque(formats.top) ? 0.9f : 1, false, fRandom);
+                if (HasFatalFailure()) return;
+            }
+    });
+}
+
 // 64 rows stay on the calling thread, 65 make bands of 16, 16, 16 and 17.
 TEST_F(Composite, TallImagesAreCutIntoBands) {
     for (const int32_t height : {63, 64, 65, 66, 131})
