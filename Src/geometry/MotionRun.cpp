@@ -9,12 +9,13 @@
 #include "geometry/MotionBlur.h"
 #include "geometry/MotionFields.h"
 #include "geometry/MotionJob.h"
-#include "geometry/MotionSampleChoice.h"
+#include "geometry/MotionSample.h"
 #include "primitives/Thresholds.h"
 
 #include <PixelKiln/Accumulate.h>
 #include <PixelKiln/Convert.h>
 
+#include <algorithm>
 #include <cmath>
 #include <memory>
 #include <optional>
@@ -98,11 +99,6 @@ struct SourceRows {
 struct Walk {
     PK_Point start, column, row;
     bool isExact; ///< unscaled, not turned, and on whole columns
-
-    PK_Point StartOfRow(int32_t row_) const {
-        const auto rows = static_cast<float>(row_);
-        return {start.x + row.x * rows, start.y + row.y * rows};
-    }
 };
 
 PK_Point operator-(PK_Point a, PK_Point b) {
@@ -127,6 +123,118 @@ Walk ChooseWalk(const MotionPlacement& placement, const PK_Rect& box, bool isInt
     }
     return walk;
 }
+
+/// A place in pixels that is whole; none where it is between pixels, or far from all of them.
+std::optional<int32_t> WholePlace(float x) {
+    constexpr float kFar = 1e9f;
+    if (!(std::abs(x) < kFar) || !IsWhole(x)) return std::nullopt;
+    return static_cast<int32_t>(x);
+}
+
+/// What is drawn of a row: pixels of a format from some column of the destination on.
+struct DrawnSpan {
+    const uint8_t* pixels;
+    const ConversionChain* chain; ///< from their format
+    int32_t column, count;
+};
+
+class SampledRows {
+public:
+    SampledRows(const MotionJob& job, const DestinationImage& destination, const PK_Rect& box, const Walk& walk,
+                PK_PixelFormat sampled, bool isRotated, const ResampleTable& kernelX, const ResampleTable& kernelY)
+        : fJob(job), fDrawer(job), fDestination(destination), fBox(box), fWalk(walk), fIsRotated(isRotated),
+          fKernelX(kernelX), fKernelY(kernelY), fSample(ChooseMotionSampler(sampled, job.quality)),
+          fScale(MotionLineScale(job.source.format)),
+          fLineFormat(Packed4444(With(job.source.format, kOrderMask, kOrderBGRA), kAlphaPremultiplied, kDepth32f)) {}
+
+    /// Whether there are ways to the destination's format.
+    bool Build() {
+        const PK_PixelFormat to = fDestination.format;
+        return fDirect.Build(fJob.source.format, to, fJob.quality) && fLine.Build(fLineFormat, to, fJob.quality);
+    }
+
+    /// All rows of the box, or those of a field.
+    /// \param start  of the first row in the source's rows.
+    PK_Result Render(const SourceRows& source, PK_Point start, int32_t field) const {
+        const int32_t height = fBox.bottom - fBox.top;
+        const auto bands = Bands::OfRows(kBandRows).AsTaskIf(height > kBandRows);
+        return RunInBands(height, bands, [&](int32_t first, int32_t end) {
+            const auto rows = static_cast<float>(first);
+            const PK_Point at = {start.x + fWalk.row.x * rows, start.y + fWalk.row.y * rows};
+            return RenderBand(source, at, fBox.top + first, fBox.top + end, field);
+        });
+    }
+
+private:
+    int32_t Columns() const { return fBox.right - fBox.left; }
+
+    PK_Result RenderBand(const SourceRows& source, PK_Point at, int32_t first, int32_t end, int32_t field) const {
+        RowMemory memory(Columns());
+        memory.AddRow(fLineFormat);
+        memory.AddChain(fDirect);
+        memory.AddChain(fLine);
+        return memory.With([&](TemporaryRows& rows) {
+            auto* const line = reinterpret_cast<float*>(rows.Take(uint64_t{16} * static_cast<uint32_t>(Columns())));
+            for (int32_t row = first; row < end; ++row, at.x += fWalk.row.x, at.y += fWalk.row.y) {
+                if (!IsOfField(row, field)) continue;
+                const DrawnSpan span = SpanOfRow(source, at, line);
+                if (span.count < 1) continue;
+                if (const PK_Result result = Draw(span, row, rows.Scratch())) return result;
+            }
+            return PK_Success;
+        });
+    }
+
+    bool IsOfField(int32_t row, int32_t field) const {
+        return !IsInterlaced(fJob.destinationField) || field == 0 || (row % 2 == 0) == (field == 1);
+    }
+
+    DrawnSpan SpanOfRow(const SourceRows& source, PK_Point at, float* line) const {
+        if (fWalk.isExact) {
+            const auto column = WholePlace(at.x), row = WholePlace(at.y);
+            if (column && row) return ExactSpan(source, *column, *row);
+        }
+        const auto& [left, top, right, bottom] = source.rectangle;
+        const MotionRow row = {source.pixels, source.rowBytes, left, top, right, bottom, at.x, at.y, fWalk.column.x,
+                               fWalk.column.y, Columns(), fIsRotated, fJob.smoothEdges, fKernelX, fKernelY};
+        const MotionSpan span = fSample(row, line);
+        if (span.count < 1) return {};
+        float* const pixels = line + int64_t{4} * span.first;
+        if (fScale) ScaleMotionLine(*fScale, pixels, span.count);
+        return {reinterpret_cast<const uint8_t*>(pixels), &fLine, fBox.left + span.first, span.count};
+    }
+
+    /// The pixels themselves from a column of the source on, without those beside the rectangle.
+    DrawnSpan ExactSpan(const SourceRows& source, int32_t column, int32_t row) const {
+        const PK_Rect& rectangle = source.rectangle;
+        if (row < rectangle.top || row >= rectangle.bottom) return {};
+        const int32_t skipped = std::max(0, rectangle.left - column);
+        const int32_t count = std::min(Columns(), rectangle.right - column) - skipped;
+        const uint8_t* const pixels =
+            source.pixels + row * source.rowBytes + (int64_t{column} + skipped) * BytesOfRow(source.format, 1);
+        return {pixels, &fDirect, fBox.left + skipped, count};
+    }
+
+    PK_Result Draw(const DrawnSpan& span, int32_t row, const ChainScratch& scratch) const {
+        uint8_t* const to = fDestination.Row(row) + BytesOfRow(fDestination.format, span.column);
+        if (!fDrawer.IsConversion())
+            return fDrawer.Draw(span.pixels, 0, span.chain->source, to, 0, span.count, 1);
+        span.chain->ConvertRow(span.pixels, to, span.count, scratch);
+        return PK_Success;
+    }
+
+    const MotionJob& fJob;
+    RowDrawer fDrawer;
+    DestinationImage fDestination;
+    PK_Rect fBox;
+    Walk fWalk;
+    bool fIsRotated;
+    ResampleTable fKernelX, fKernelY;
+    SampleMotionRow fSample;
+    std::optional<LineScale> fScale;
+    PK_PixelFormat fLineFormat;
+    ConversionChain fDirect, fLine;
+};
 
 } // namespace
 } // namespace PK
