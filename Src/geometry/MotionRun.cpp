@@ -6,6 +6,7 @@
 #include "frame/Bands.h"
 #include "frame/DebugSwitches.h"
 #include "frame/FloatMode.h"
+#include "frame/TransientMemory.h"
 #include "geometry/MotionBlur.h"
 #include "geometry/MotionFields.h"
 #include "geometry/MotionJob.h"
@@ -236,5 +237,143 @@ private:
     ConversionChain fDirect, fLine;
 };
 
+/// Those of a source that is walked from its top. The crop's rows count in both fields.
+/// \param left, top  the place that the pixels are those of.
+SourceRows ChooseRows(const MotionJob& job, const SourceImage& source, int32_t left, int32_t top, int32_t pass) {
+    const int64_t column = int64_t{left} * BytesOfRow(source.format, 1);
+    if (!IsInterlaced(job.sourceField))
+        return {source.Row(top) + column, source.rowBytes, source.format, job.crop, true};
+    const FieldOfSource field = ChooseFieldOfSource(job.sourceField, job.destinationField, pass);
+    const PK_Rect& crop = job.crop;
+    return {source.pixels + field.RowFrom(top) * source.rowBytes + column,
+            2 * source.rowBytes,
+            source.format,
+            {crop.left, crop.top / 2, crop.right, crop.bottom / 2},
+            field.isSameLine};
+}
+
+PK_Result DrawSharp(const MotionJob& job, const SourceImage& source, const Walk& walk, const SampledRows& rows) {
+    const auto draw = [&](int32_t pass) {
+        const SourceRows from = ChooseRows(job, source, 0, 0, pass);
+        const PK_Point start = {walk.start.x, from.isSameLine ? walk.start.y : walk.start.y - 0.5f};
+        return rows.Render(from, start, pass);
+    };
+    if (!IsInterlaced(job.destinationField) || job.renderField != 0) return draw(job.renderField);
+    if (const PK_Result result = draw(1)) return result;
+    return draw(2);
+}
+
+/// A crop of the source, blurred, as if it lay where the source lies.
+class BlurredSource {
+public:
+    BlurredSource(const MotionJob& job, const SourceImage& source, const MotionBlur& blur, PK_PixelFormat format,
+                  int32_t marginX, int32_t marginY)
+        : fJob(job), fSource(source), fBlur(blur), fMarginX(marginX), fMarginY(marginY),
+          fWidth(job.crop.right - job.crop.left + 2 * marginX),
+          fHeight(RowsOfCrop() + 2 * marginY), fFormat(format), fBuffer(format, fWidth, fHeight) {}
+
+    bool HasMemory() const { return fBuffer.Pixels() != nullptr; }
+
+    /// Blurs the rows of a pass anew.
+    PK_Result Blur(int32_t pass, SourceRows& blurred) const {
+        const PK_Rect& crop = fJob.crop;
+        const SourceRows from = ChooseRows(fJob, fSource, crop.left, crop.top, pass);
+        const int32_t width = crop.right - crop.left, height = HeightOf(from);
+        const int32_t direction = (fBlur.x > 0 ? 1 : 0) + (fBlur.y > 0 ? 2 : 0);
+        if (const PK_Result result = BlurForMotion(
+                from.pixels, static_cast<int32_t>(from.rowBytes), width, height, fJob.source.format, fBuffer.Pixels(),
+                fBuffer.RowBytes(), fWidth, fHeight, fFormat, fBlur.x, fBlur.y, !fJob.smoothEdges,
+                sMotionBlurLinear != 0, true, direction, fJob.quality))
+            return result;
+        const PK_Rect& lies = from.rectangle;
+        const int64_t above = lies.top - (fHeight - height) / 2, before = lies.left - (fWidth - width) / 2;
+        blurred = {fBuffer.Pixels() - above * fBuffer.RowBytes() - before * BytesOfRow(fFormat, 1),
+                   fBuffer.RowBytes(),
+                   fFormat,
+                   {lies.left - fMarginX, lies.top - fMarginY, lies.right + fMarginX, lies.bottom + fMarginY},
+                   from.isSameLine};
+        return PK_Success;
+    }
+
+private:
+    int32_t RowsOfCrop() const {
+        const PK_Rect& crop = fJob.crop;
+        return IsInterlaced(fJob.sourceField) ? crop.bottom / 2 - crop.top / 2 : crop.bottom - crop.top;
+    }
+
+    /// The later field of a crop may have one row less.
+    int32_t HeightOf(const SourceRows& rows) const {
+        if (rows.rowBytes == fSource.rowBytes) return RowsOfCrop();
+        const int64_t first = (rows.pixels - fSource.pixels) / fSource.rowBytes;
+        return static_cast<int32_t>(std::min<int64_t>(RowsOfCrop(), (fJob.crop.bottom - first + 1) / 2));
+    }
+
+    const MotionJob& fJob;
+    const SourceImage& fSource;
+    MotionBlur fBlur;
+    int32_t fMarginX, fMarginY, fWidth, fHeight;
+    PK_PixelFormat fFormat;
+    TransientPixelBuffer fBuffer;
+};
+
+PK_Result DrawBlurred(const MotionJob& job, const BlurredSource& source, const Walk& walk, const SampledRows& rows) {
+    const auto draw = [&](int32_t pass, bool isOneOfTwo) {
+        SourceRows from;
+        if (const PK_Result result = source.Blur(pass, from)) return result;
+        return rows.Render(from, isOneOfTwo && !from.isSameLine ? walk.start - walk.row : walk.start, pass);
+    };
+    if (!IsInterlaced(job.sourceField) || job.renderField != 0 || !IsInterlaced(job.destinationField))
+        return draw(job.renderField, false);
+    if (const PK_Result result = draw(1, true)) return result;
+    return draw(2, true);
+}
+
+void Scale(ResampleKernel& kernel, float scale) {
+    if (scale > 1)
+        kernel.ScaleForUpSample(scale);
+    else
+        kernel.ScaleForDownSample(scale, scale);
+}
+
+ResampleTable TableOf(const ResampleKernel& kernel) {
+    return {kernel.Weights(), kernel.Width()};
+}
+
+PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, const MotionBlur& blur, bool needsBlur) {
+    ResampleKernel kernelX(kKeysCubic), kernelY(kKeysCubic);
+    if (job.quality == kCubicQuality) {
+        Scale(kernelX, placement.Scale().x);
+        Scale(kernelY, placement.Scale().y);
+        if (kernelX.Width() < 1 || kernelY.Width() < 1) return PK_ErrOutOfMemory;
+    }
+    const int32_t marginX = job.smoothEdges && blur.x > 0 ? kSoftMargin : 0;
+    const int32_t marginY = job.smoothEdges && blur.y > 0 ? kSoftMargin : 0;
+    const PK_Rect box = placement.Reach(job.crop, marginX, marginY);
+    if (box.left == box.right) return PK_Success;
+
+    const SourceImage source = Reversed(job.source); // four channels are stored from the bottom
+    const Walk walk = ChooseWalk(placement, box, IsInterlaced(job.sourceField));
+    const PK_PixelFormat sampled =
+        needsBlur ? WithAlpha(job.source.format, kAlphaPremultiplied) : job.source.format;
+    SampledRows rows(job, FromTop(job.destination), box, walk, sampled, placement.IsRotated(), TableOf(kernelX),
+                     TableOf(kernelY));
+    if (!rows.Build()) return PK_ErrFailed;
+    if (!needsBlur) return DrawSharp(job, source, walk, rows);
+    const BlurredSource blurred(job, source, blur, sampled, marginX, marginY);
+    if (!blurred.HasMemory()) return PK_ErrOutOfMemory;
+    return DrawBlurred(job, blurred, walk, rows);
+}
+
 } // namespace
+
+PK_Result RunMotion(const MotionJob& job) {
+    const FloatMode mode;
+    const MotionPlacement placement(job.geometry);
+    const MotionBlur blur =
+        ChooseMotionBlur(placement, job.softness, job.sourceField, job.destinationField, job.quality);
+    const bool needsBlur = blur.IsAny() && job.quality != kCubicQuality;
+    if (IsPureCopy(job, placement, needsBlur)) return CopyWhole(job);
+    return DrawSampled(job, placement, blur, needsBlur);
+}
+
 } // namespace PK
