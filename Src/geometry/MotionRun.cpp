@@ -94,6 +94,7 @@ struct SourceRows {
     PK_PixelFormat format;
     PK_Rect rectangle;
     bool isSameLine;
+    int32_t firstRow; ///< of the source, that `pixels` stand in
 };
 
 /// The steps over the source with which the destination is walked.
@@ -242,14 +243,16 @@ private:
 SourceRows ChooseRows(const MotionJob& job, const SourceImage& source, int32_t left, int32_t top, int32_t pass) {
     const int64_t column = int64_t{left} * BytesOfRow(source.format, 1);
     if (!IsInterlaced(job.sourceField))
-        return {source.Row(top) + column, source.rowBytes, source.format, job.crop, true};
+        return {source.Row(top) + column, source.rowBytes, source.format, job.crop, true, top};
     const FieldOfSource field = ChooseFieldOfSource(job.sourceField, job.destinationField, pass);
     const PK_Rect& crop = job.crop;
-    return {source.pixels + field.RowFrom(top) * source.rowBytes + column,
+    const int32_t firstRow = field.RowFrom(top);
+    return {source.pixels + firstRow * source.rowBytes + column,
             2 * source.rowBytes,
             source.format,
             {crop.left, crop.top / 2, crop.right, crop.bottom / 2},
-            field.isSameLine};
+            field.isSameLine,
+            firstRow};
 }
 
 PK_Result DrawSharp(const MotionJob& job, const SourceImage& source, const Walk& walk, const SampledRows& rows) {
@@ -291,7 +294,7 @@ public:
                    fBuffer.RowBytes(),
                    fFormat,
                    {lies.left - fMarginX, lies.top - fMarginY, lies.right + fMarginX, lies.bottom + fMarginY},
-                   from.isSameLine};
+                   from.isSameLine, from.firstRow};
         return PK_Success;
     }
 
@@ -303,9 +306,8 @@ private:
 
     /// The later field of a crop may have one row less.
     int32_t HeightOf(const SourceRows& rows) const {
-        if (rows.rowBytes == fSource.rowBytes) return RowsOfCrop();
-        const int64_t first = (rows.pixels - fSource.pixels) / fSource.rowBytes;
-        return static_cast<int32_t>(std::min<int64_t>(RowsOfCrop(), (fJob.crop.bottom - first + 1) / 2));
+        if (!IsInterlaced(fJob.sourceField)) return RowsOfCrop();
+        return std::min(RowsOfCrop(), (fJob.crop.bottom - rows.firstRow + 1) / 2);
     }
 
     const MotionJob& fJob;
