@@ -1,0 +1,26 @@
+#pragma once
+
+// A picture placed in another, as motion does it.
+
+#include "Frame.h"
+
+namespace tool {
+
+struct Placing {
+    PK_Point position = {0.5f, 0.5f}, anchor = {0.5f, 0.5f}, scale = {1, 1}; ///< y from the top
+    double rotation = 0;
+    double opacity = 1;
+    double softness = 0;
+    bool smoothEdges = false;
+    PK_BlendMode mode = PK_BlendMode_Normal;
+    int32_t sourceField = 0, destinationField = 0;
+    int32_t quality = kDefaultQuality;
+};
+
+/// Between two placings, a fraction of the way from the first; what is no number is that of the first.
+Placing Between(const Placing& from, const Placing& to, double way);
+
+/// Over a back of any raster format. The picture is taken to what is sampled at the quality.
+void Place(const Frame& picture, const Placing& placing, Frame& back);
+
+} // namespace tool
