@@ -7,7 +7,8 @@ namespace PK::PK_TARGET {
 namespace {
 
 constexpr int32_t kPhases = 128, kMostTaps = 20, kPixelFloats = 4, kPixelBytes = 16;
-constexpr int32_t kTogether = 4; // taps that are added up side by side, in an order that no vector's width changes
+constexpr int32_t kTogether =
+    4; // taps that are added up side by side, in an order that no vector's width changes
 constexpr int32_t kVectors = kTogether * kPixelFloats / kLanes;
 
 /// The weights of an axis as floats, which show all of them.
@@ -57,8 +58,8 @@ struct TapSums {
 
     void AddFour(const float* pixels, const float* weights) {
         for (int32_t i = 0; i < kVectors; ++i)
-            sums[i] = sums[i] + LoadFloats(pixels + i * kLanes) *
-                                    LoadOnePerBlock(weights + i * kLanes / kPixelFloats);
+            sums[i] = sums[i] +
+                      LoadFloats(pixels + i * kLanes) * LoadOnePerBlock(weights + i * kLanes / kPixelFloats);
     }
 
     F32 Total() const {
@@ -113,19 +114,21 @@ struct HighQuality {
         const bool sharesRows = !row.rotated && width <= int64_t{count} * weightsX.Taps();
         if (!sharesRows) {
             for (int32_t i = 0; i < count; ++i)
-                Put(out + 4 * i, SumOfArea(first[i], phases[i],
-                                           Reach(places.y[i], row.top, row.bottom, weightsY.Taps())));
+                Put(out + 4 * i,
+                    SumOfArea(first[i], phases[i], Reach(places.y[i], row.top, row.bottom, weightsY.Taps())));
             return;
         }
         alignas(64) float sums[kBlock * kMostTaps * kPixelFloats];
-        AddRows(Reach(places.y[0], row.top, row.bottom, weightsY.Taps()), least, static_cast<int32_t>(width), sums);
+        AddRows(Reach(places.y[0], row.top, row.bottom, weightsY.Taps()), least, static_cast<int32_t>(width),
+                sums);
         for (int32_t i = 0; i < count; ++i)
-            Put(out + 4 * i, SumOfTaps(sums + int64_t{first[i] - least} * kPixelFloats, weightsX.Phase(phases[i]),
-                                       weightsX.Taps()));
+            Put(out + 4 * i, SumOfTaps(sums + int64_t{first[i] - least} * kPixelFloats,
+                                       weightsX.Phase(phases[i]), weightsX.Taps()));
     }
 
     const float* PixelAt(int32_t column, int32_t line) const {
-        return reinterpret_cast<const float*>(row.pixels + line * row.rowBytes + int64_t{column} * kPixelBytes);
+        return reinterpret_cast<const float*>(row.pixels + line * row.rowBytes +
+                                              int64_t{column} * kPixelBytes);
     }
 
     /// Those of the columns from `first` on that lie in the source: some in the middle, or none.
@@ -154,7 +157,8 @@ struct HighQuality {
         int32_t at = begin;
         for (; at + kLanes <= end; at += kLanes) {
             F32 sum = Zero();
-            for (int32_t i = 0; i < count; ++i) sum = sum + LoadFloats(sources[i] + (at - begin)) * weights[i];
+            for (int32_t i = 0; i < count; ++i)
+                sum = sum + LoadFloats(sources[i] + (at - begin)) * weights[i];
             Store(sums + at, sum);
         }
         if (at < end) { // less than a vector is left of each row

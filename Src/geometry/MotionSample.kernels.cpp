@@ -139,9 +139,8 @@ struct Bilinear {
                 factor = Layout::kFull == 1 ? share : share * Floats(1 / Layout::kFull);
             const Channels part = {c.c0 * factor, c.c1 * factor, c.c2 * factor, share};
             Channels& sum = result.sum;
-            sum = i == 0
-                      ? part
-                      : Channels{sum.c0 + part.c0, sum.c1 + part.c1, sum.c2 + part.c2, sum.c3 + part.c3};
+            sum = i == 0 ? part
+                         : Channels{sum.c0 + part.c0, sum.c1 + part.c1, sum.c2 + part.c2, sum.c3 + part.c3};
         }
         return result;
     }

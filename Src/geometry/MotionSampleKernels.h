@@ -21,8 +21,8 @@ struct MotionRow {
     float x, y;                       // where the first column lies in the source
     float stepX, stepY;               // from one column to the next
     int32_t columns;
-    bool rotated;     // else y is the same for all columns
-    bool smoothEdges; // what lies outside is transparent; else the nearest pixel stands for it
+    bool rotated;                   // else y is the same for all columns
+    bool smoothEdges;               // what lies outside is transparent; else the nearest pixel stands for it
     ResampleTable kernelX, kernelY; // only read at the highest quality
 };
 

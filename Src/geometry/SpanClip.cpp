@@ -15,7 +15,8 @@ struct Crossing {
 
     /// Whether a line that keeps the coordinate is inside.
     bool IsInside() const {
-        return !(at - static_cast<float>(low) < kNegligible) && !(at - static_cast<float>(high) >= -kNegligible);
+        return !(at - static_cast<float>(low) < kNegligible) &&
+               !(at - static_cast<float>(high) >= -kNegligible);
     }
     bool IsKept() const { return std::abs(step) < kNegligible; }
     double TimeOf(int32_t side) const {

@@ -80,7 +80,8 @@ void ExpectShape(const ResampleKernel& kernel, Shape shape, int reach, int first
         const Row row = RowOf(kernel, phase);
         for (int k = 0; k < width; ++k) {
             const double exact = shape(k - centre - phase / 128.0) * 16384 / sum;
-            EXPECT_NEAR(row[static_cast<size_t>(k)], std::trunc(exact), 1) << "phase " << phase << ", tap " << k;
+            EXPECT_NEAR(row[static_cast<size_t>(k)], std::trunc(exact), 1)
+                << "phase " << phase << ", tap " << k;
             EXPECT_LE(std::abs(row[static_cast<size_t>(k)]), std::abs(exact) + 1e-6);
             EXPECT_GT(std::abs(row[static_cast<size_t>(k)]), std::abs(exact) - 1 - 1e-6);
         }
@@ -132,7 +133,8 @@ TEST(ResampleKernel, EnlargesByACubicOfFourTaps) {
     EXPECT_EQ(RowOf(kernel, 64), (Row{-1536, 9728, 9728, -1536}));
     // A quarter: -0.10546875, 0.87890625, 0.26171875, -0.03515625.
     EXPECT_EQ(RowOf(kernel, 32), (Row{-1728, 14400, 4288, -576}));
-    ExpectShape(kernel, [](double x) { return Cubic(x, -0.75); }, 3);
+    ExpectShape(
+        kernel, [](double x) { return Cubic(x, -0.75); }, 3);
 }
 
 TEST(ResampleKernel, EnlargesByWiderShapesOfEachKind) {
@@ -144,7 +146,8 @@ TEST(ResampleKernel, EnlargesByWiderShapesOfEachKind) {
         SCOPED_TRACE(testing::Message() << "kind " << kind);
         const ResampleKernel kernel = Enlarged(kind);
         ASSERT_EQ(kernel.Width(), 6);
-        ExpectShape(kernel, [s = stretch, p = a](double x) { return Cubic(x / s, p); }, 3);
+        ExpectShape(
+            kernel, [s = stretch, p = a](double x) { return Cubic(x / s, p); }, 3);
     }
     ASSERT_EQ(Enlarged(6).Width(), 6);
     ExpectShape(Enlarged(6), Spline, 4);
@@ -188,7 +191,8 @@ TEST(ResampleKernel, HalfScaleIsTrimmedToEightTaps) {
     ASSERT_EQ(kernel.Width(), 8);
     const Row row = RowOf(kernel, 0);
     EXPECT_EQ(*std::max_element(row.begin(), row.end()), row[3]) << "the pixel of the sample";
-    ExpectShape(kernel, [](double x) { return Cubic(x * 0.5, -0.75); }, 6);
+    ExpectShape(
+        kernel, [](double x) { return Cubic(x * 0.5, -0.75); }, 6);
 }
 
 TEST(ResampleKernel, GrowsWithTheReductionAndNoFurtherThanAQuarter) {
@@ -198,7 +202,8 @@ TEST(ResampleKernel, GrowsWithTheReductionAndNoFurtherThanAQuarter) {
     EXPECT_LE(Reduced(2, 0.1f).Width(), 16);
     EXPECT_EQ(Table(Reduced(2, 0.1f)), Table(Reduced(2, 0.25f)));
     EXPECT_EQ(Table(Reduced(2, -3)), Table(Reduced(2, 0.25f)));
-    ExpectShape(Reduced(2, 0.25f), [](double x) { return Cubic(x * 0.25, -0.75); }, 10);
+    ExpectShape(
+        Reduced(2, 0.25f), [](double x) { return Cubic(x * 0.25, -0.75); }, 10);
 }
 
 TEST(ResampleKernel, WidthsAreEvenAndTheCentreStays) {
@@ -214,17 +219,22 @@ TEST(ResampleKernel, WidthsAreEvenAndTheCentreStays) {
 
 TEST(ResampleKernel, SlidesTheCubicAndStretchesIt) {
     // At a quarter the far parameter applies, at 1 the near one and no stretch.
-    ExpectShape(Reduced(3, 0.25f), [](double x) { return Cubic(x * (0.25f / 1.15f), -1.0); }, 12);
-    ExpectShape(Reduced(3, 1), [](double x) { return Cubic(x, -0.625f); }, 4, 1);
+    ExpectShape(
+        Reduced(3, 0.25f), [](double x) { return Cubic(x * (0.25f / 1.15f), -1.0); }, 12);
+    ExpectShape(
+        Reduced(3, 1), [](double x) { return Cubic(x, -0.625f); }, 4, 1);
     EXPECT_EQ(RowOf(Reduced(3, 1), 0)[4], 16384);
     // Half way between 1 and a quarter lies 0.625, and so does the parameter.
     const double half = -1.0f + 0.5f * (-2.2f + 1.0f);
-    ExpectShape(Reduced(4, 0.625f), [half](double x) { return Cubic(x * (0.625f / 1.05f), half); }, 6);
-    ExpectShape(Reduced(5, 0.25f), [](double x) { return Cubic(x * (0.25f / 1.2f), -0.5); }, 12);
+    ExpectShape(
+        Reduced(4, 0.625f), [half](double x) { return Cubic(x * (0.625f / 1.05f), half); }, 6);
+    ExpectShape(
+        Reduced(5, 0.25f), [](double x) { return Cubic(x * (0.25f / 1.2f), -0.5); }, 12);
     // What is decimated already is stretched for one scale and shaped for another.
     ResampleKernel kernel(3);
     kernel.ScaleForDownSample(0.5f, 0.25f);
-    ExpectShape(kernel, [](double x) { return Cubic(x * (0.5f / 1.15f), -1.0); }, 8);
+    ExpectShape(
+        kernel, [](double x) { return Cubic(x * (0.5f / 1.15f), -1.0); }, 8);
 }
 
 TEST(ResampleKernel, KeepsATableForScalesThatHardlyDiffer) {

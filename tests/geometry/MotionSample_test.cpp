@@ -1,11 +1,11 @@
 // Motion's sampling of rows: every body against the restatement, and what a caller relies on by hand.
 
-#include "geometry/MotionSample.h"
+#include "convert/RasterFormats.h"
 #include "filters/ResampleKernel.h"
 #include "frame/PixelFormat.h"
+#include "geometry/MotionSample.h"
 #include "geometry/MotionSampleKernels.h"
 #include "reference/ReferenceMotionSample.h"
-#include "convert/RasterFormats.h"
 #include "support/Allocations.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
@@ -79,8 +79,11 @@ private:
 struct FloatImage {
     FloatImage(int32_t columns, std::vector<Pixel> from) : width(columns), pixels(std::move(from)) {}
     MotionSource Source(PK_PixelFormat format, bool smoothEdges) const {
-        return {reinterpret_cast<const uint8_t*>(pixels.data()), 16 * width,
-                {0, 0, width, static_cast<int32_t>(pixels.size()) / width}, format, smoothEdges};
+        return {reinterpret_cast<const uint8_t*>(pixels.data()),
+                16 * width,
+                {0, 0, width, static_cast<int32_t>(pixels.size()) / width},
+                format,
+                smoothEdges};
     }
     int32_t width;
     std::vector<Pixel> pixels;
@@ -173,7 +176,8 @@ TEST(MotionSample, EveryBodySamplesEveryFormatAsTheRestatement) {
         const PK_PixelFormat format = formats[static_cast<size_t>(round) % formats.size()];
         const PK_Rect rect = DrawRect(random);
         const int32_t least = (rect.right - rect.left) * BytesOfPixel(format);
-        const int32_t rowBytes = (least + Between(random, 0, 3) * Between(random, 0, 9)) * (random.Below(2) == 0 ? 1 : -1);
+        const int32_t rowBytes =
+            (least + Between(random, 0, 3) * Between(random, 0, 9)) * (random.Below(2) == 0 ? 1 : -1);
         const Guard guard = random.Below(2) == 0 ? Guard::kBefore : Guard::kAfter;
         const Crop crop(rect, format, rowBytes, guard);
         FillOrdinarySamples(format, crop.Bytes(), crop.Size(), random);
@@ -184,8 +188,11 @@ TEST(MotionSample, EveryBodySamplesEveryFormatAsTheRestatement) {
         const MotionLine line = DrawLine(random, rect);
 
         const PKReference::MotionPlaces walkway = PKReference::WalkMotionLine(rect, line, 2);
-        std::vector<Pixel> expected(static_cast<size_t>(line.columns), Pixel{kUntouched, kUntouched, kUntouched, kUntouched});
-        const float full = DepthOf(format) == kDepth8u ? 255.0f : DepthOf(format) == kDepth15u ? 32768.0f : 1.0f;
+        std::vector<Pixel> expected(static_cast<size_t>(line.columns),
+                                    Pixel{kUntouched, kUntouched, kUntouched, kUntouched});
+        const float full = DepthOf(format) == kDepth8u    ? 255.0f
+                           : DepthOf(format) == kDepth15u ? 32768.0f
+                                                          : 1.0f;
         for (size_t i = 0; i < walkway.places.size(); ++i) {
             const MotionPlace& place = walkway.places[i];
             Pixel& pixel = expected[static_cast<size_t>(walkway.first) + i];
@@ -201,10 +208,10 @@ TEST(MotionSample, EveryBodySamplesEveryFormatAsTheRestatement) {
             ASSERT_EQ("", FirstDifference(Samples::Floats, 16 * expected.size(),
                                           reinterpret_cast<const uint8_t*>(expected.data()),
                                           reinterpret_cast<const uint8_t*>(sampled.line.data())))
-                << "round " << round << ", seed " << random.Seed() << ", " << PK_PixelFormatName(format) << ", rect "
-                << rect.left << ' ' << rect.top << ' ' << rect.right << ' ' << rect.bottom << ", at " << line.at.x
-                << ' ' << line.at.y << ", step " << line.step.x << ' ' << line.step.y << ", smooth "
-                << source.smoothEdges << ", rotated " << line.rotated;
+                << "round " << round << ", seed " << random.Seed() << ", " << PK_PixelFormatName(format)
+                << ", rect " << rect.left << ' ' << rect.top << ' ' << rect.right << ' ' << rect.bottom
+                << ", at " << line.at.x << ' ' << line.at.y << ", step " << line.step.x << ' ' << line.step.y
+                << ", smooth " << source.smoothEdges << ", rotated " << line.rotated;
         });
         if (HasFatalFailure()) return;
     }
@@ -221,7 +228,9 @@ TEST(MotionSample, InsideAndEdgeAgree) {
         for (int32_t i = 0; i < 50; ++i) {
             const PK_Point at = {Between(random, 4.0f, 36.0f), Between(random, 4.0f, 36.0f)};
             const auto edge = PKReference::SampleBilinear<float>(source, {at, false});
-            const float full = DepthOf(format) == kDepth8u ? 255.0f : DepthOf(format) == kDepth15u ? 32768.0f : 1.0f;
+            const float full = DepthOf(format) == kDepth8u    ? 255.0f
+                               : DepthOf(format) == kDepth15u ? 32768.0f
+                                                              : 1.0f;
             ExpectPixel(At(source, at.x, at.y), edge, 1e-5f * full);
         }
     }
@@ -303,14 +312,15 @@ TEST(MotionSample, ASourceWithoutRowsIsTransparentAndNotRead) {
         const Sampled sampled = Sample(source, {{0.5f, 0.5f}, {1, 0}, 16, false});
         ASSERT_EQ(sampled.span.count, 16);
         const bool isVideo = IsYUV(format) && DepthOf(format) == kDepth8u;
-        for (const Pixel& pixel : sampled.line) ExpectPixel(pixel, isVideo ? Pixel{128, 128, 16, 0} : Pixel{});
+        for (const Pixel& pixel : sampled.line)
+            ExpectPixel(pixel, isVideo ? Pixel{128, 128, 16, 0} : Pixel{});
     }
 }
 
 TEST(MotionSample, AnythingForAPlaceStaysInTheSourceAndInTheLine) {
     constexpr float kInfinity = std::numeric_limits<float>::infinity();
-    const float odd[] = {std::nanf(""), kInfinity, -kInfinity, 3e38f, -3e38f, 1e10f, -1e10f,
-                         1e-40f,        0,         8.25f,      -1,    0.3f};
+    const float odd[] = {std::nanf(""), kInfinity, -kInfinity, 3e38f, -3e38f, 1e10f,
+                         -1e10f,        1e-40f,    0,          8.25f, -1,     0.3f};
     const PK_Rect rect = {-2, 3, 14, 19};
     ResampleKernel table(2);
     table.ScaleForDownSample(0.3f, 0.3f);
@@ -326,7 +336,8 @@ TEST(MotionSample, AnythingForAPlaceStaysInTheSourceAndInTheLine) {
                     if (walk.LeavesOut()) continue;
                     for (const float stepX : odd)
                         for (const float stepY : odd) {
-                            MotionRow row = RowOf(crop.Source(true), {{x, y}, {stepX, stepY}, 37, stepY != 0});
+                            MotionRow row =
+                                RowOf(crop.Source(true), {{x, y}, {stepX, stepY}, 37, stepY != 0});
                             row.kernelX = row.kernelY = {table.Weights(), table.Width()};
                             const Sampled sampled = Run(ChooseMotionSampler(format, quality), row);
                             const auto [first, count] = sampled.span;
@@ -348,8 +359,8 @@ TEST(MotionSample, LongRowsStayInTheSource) {
         const Crop crop(rect, PK_PixelFormat_BGRA_4444_8u, 4 * kWidth, Guard::kAfter);
         std::fill_n(crop.Bytes(), crop.Size(), uint8_t{77});
         AtEveryTarget([&] {
-            const Sampled sampled =
-                Sample(crop.Source(false), {{0.5f, 2.4f}, {step, 0}, static_cast<int32_t>(kWidth / step), false});
+            const Sampled sampled = Sample(
+                crop.Source(false), {{0.5f, 2.4f}, {step, 0}, static_cast<int32_t>(kWidth / step), false});
             for (int32_t i = 0; i < sampled.span.count; ++i) {
                 const Pixel& pixel = sampled.line[static_cast<size_t>(sampled.span.first + i)];
                 ASSERT_NEAR(pixel[3], 77, 1e-3f);
@@ -385,7 +396,8 @@ TEST(MotionResample, IsTheSumOverTheAreaOfBothAxes) {
         const PK_PixelFormat format =
             random.Below(2) == 0 ? PK_PixelFormat_BGRP_4444_32f_Linear : PK_PixelFormat_PRGB_4444_32f;
         const PK_Rect rect = DrawRect(random);
-        const int32_t rowBytes = ((rect.right - rect.left) * 16 + Between(random, 0, 3) * 4) * (random.Below(2) == 0 ? 1 : -1);
+        const int32_t rowBytes =
+            ((rect.right - rect.left) * 16 + Between(random, 0, 3) * 4) * (random.Below(2) == 0 ? 1 : -1);
         const Guard guard = random.Below(2) == 0 ? Guard::kBefore : Guard::kAfter;
         const Crop crop(rect, format, rowBytes, guard);
         FillOrdinarySamples(format, crop.Bytes(), crop.Size(), random);
@@ -420,12 +432,12 @@ TEST(MotionResample, IsTheSumOverTheAreaOfBothAxes) {
                 continue;
             }
             const auto exact = PKReference::SampleByWeights(
-                source, walkway.places[static_cast<size_t>(place)].at, {row.kernelX.weights, row.kernelX.width},
-                {row.kernelY.weights, row.kernelY.width});
+                source, walkway.places[static_cast<size_t>(place)].at,
+                {row.kernelX.weights, row.kernelX.width}, {row.kernelY.weights, row.kernelY.width});
             for (size_t c = 0; c < 4; ++c)
                 ASSERT_NEAR(first[i][c], exact.pixel[c], 2e-6 * exact.magnitude + 1e-30)
-                    << "round " << round << ", seed " << random.Seed() << ", column " << i << ", channel " << c
-                    << ", rotated " << line.rotated << ", step " << line.step.x;
+                    << "round " << round << ", seed " << random.Seed() << ", column " << i << ", channel "
+                    << c << ", rotated " << line.rotated << ", step " << line.step.x;
         }
     }
 }
@@ -470,7 +482,8 @@ TEST(MotionResample, FadesOutsideWhateverTheEdgesAre) {
 TEST(MotionResample, WithoutATableGivesNothing) {
     const FloatImage image(2, std::vector<Pixel>(4, Pixel{1, 1, 1, 1}));
     for (const int32_t width : {0, -1998}) {
-        MotionRow row = RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true), {{0, 1}, {1, 0}, 3, false});
+        MotionRow row =
+            RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true), {{0, 1}, {1, 0}, 3, false});
         row.kernelX = row.kernelY = {nullptr, width};
         for (const Pixel& pixel : Run(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line)
             ExpectPixel(pixel, {0, 0, 0, 0});
@@ -487,9 +500,11 @@ TEST(MotionResample, ReadsNoPixelBesideItsTaps) {
     pixels[12 + 6] = pixels[12 - 5] = {kInfinity, kInfinity, kInfinity, kInfinity};
     const FloatImage image(24, pixels);
     for (const bool rotated : {false, true}) {
-        MotionRow row = RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true), {{12.75f, 0.5f}, {1, 0}, 1, rotated});
+        MotionRow row = RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true),
+                              {{12.75f, 0.5f}, {1, 0}, 1, rotated});
         row.kernelX = row.kernelY = {table.Weights(), table.Width()};
-        ExpectPixel(Run(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line[0], {1, 1, 1, 1}, 1e-3f);
+        ExpectPixel(Run(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line[0],
+                    {1, 1, 1, 1}, 1e-3f);
     }
 }
 
@@ -501,7 +516,8 @@ TEST(MotionSampleChoice, OnlyTheHighestQualityOfPremultipliedFloatRGBResamples) 
     };
     AtEveryTarget([&] {
         for (const PK_PixelFormat format : PackedFormats()) {
-            const bool isMember = !IsYUV(format) && AlphaOf(format) == kAlphaPremultiplied && DepthOf(format) == kDepth32f;
+            const bool isMember =
+                !IsYUV(format) && AlphaOf(format) == kAlphaPremultiplied && DepthOf(format) == kDepth32f;
             EXPECT_EQ(resamples(format, 5), isMember) << PK_PixelFormatName(format);
             for (const int32_t quality : {0, 1, 2, 3, 4, 6, 100}) EXPECT_FALSE(resamples(format, quality));
         }
@@ -533,7 +549,8 @@ TEST(MotionLineScale, TakesCodesToFloats) {
             });
         }
     }
-    for (const PK_PixelFormat format : {PK_PixelFormat_BGRA_4444_32f, PK_PixelFormat_PRGB_4444_32f_Linear, PK_PixelFormat_VUYA_4444_32f})
+    for (const PK_PixelFormat format :
+         {PK_PixelFormat_BGRA_4444_32f, PK_PixelFormat_PRGB_4444_32f_Linear, PK_PixelFormat_VUYA_4444_32f})
         EXPECT_FALSE(MotionLineScale(format));
     const auto bits = std::bit_cast<uint32_t>(MotionLineScale(PK_PixelFormat_BGRA_4444_8u)->scale[0]);
     EXPECT_EQ(bits, 0x3b808081u) << "1/255";

@@ -116,7 +116,8 @@ TEST(PartsOfRow, ARowThatMissesHasNoColumns) {
 
 TEST(PartsOfRow, AnythingLeavesPartsInTheirOrder) {
     constexpr float kInfinity = std::numeric_limits<float>::infinity();
-    const float odd[] = {std::nanf(""), kInfinity, -kInfinity, 3e38f, -3e38f, 1e-40f, 0, -0.0f, 8, 1, -1, 1e9f};
+    const float odd[] = {std::nanf(""), kInfinity, -kInfinity, 3e38f, -3e38f, 1e-40f, 0,
+                         -0.0f,         8,         1,          -1,    1e9f};
     const PK_Rect rects[] = {{0, 0, 16, 16}, {0, 0, 1, 1}, {0, 4, 16, 4}, {-4, -4, 20, 20}};
     for (const PK_Rect& rect : rects)
         for (const float x : odd)

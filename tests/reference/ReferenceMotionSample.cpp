@@ -9,8 +9,8 @@ namespace PKReference {
 namespace {
 
 // Fields of a format.
-constexpr uint32_t kYUV = 1, kAlpha = 0xc, kStraight = 4, kPremultiplied = 8, kDepth = 0x1c0, k8 = 0, k15 = 0x80,
-                   kAlphaFirst = 0x1000;
+constexpr uint32_t kYUV = 1, kAlpha = 0xc, kStraight = 4, kPremultiplied = 8, kDepth = 0x1c0, k8 = 0,
+                   k15 = 0x80, kAlphaFirst = 0x1000;
 
 template <class Sample>
 Sample Load(const uint8_t* from) {
@@ -21,8 +21,12 @@ Sample Load(const uint8_t* from) {
 
 struct Layout {
     explicit Layout(PK_PixelFormat format)
-        : depth(format & kDepth), isAlphaFirst((format & kAlphaFirst) != 0),
-          sampleBytes(depth == k8 ? 1 : depth == k15 ? 2 : 4), full(depth == k8 ? 255.0f : depth == k15 ? 32768.0f : 1.0f),
+        : depth(format & kDepth), isAlphaFirst((format & kAlphaFirst) != 0), sampleBytes(depth == k8    ? 1
+                                                                                         : depth == k15 ? 2
+                                                                                                        : 4),
+          full(depth == k8    ? 255.0f
+               : depth == k15 ? 32768.0f
+                              : 1.0f),
           hasVideoZero(depth == k8 && (format & kYUV) != 0) {}
 
     float Sample(const uint8_t* pixel, int channel) const {
@@ -82,7 +86,9 @@ std::optional<std::array<double, 2>> Clip(const PK_Rect& r, const MotionLine& li
     if (r.right < r.left || r.bottom < r.top) return std::nullopt;
     const auto [x, y] = line.at;
     const auto [dx, dy] = line.step;
-    const auto time = [](int32_t side, float at, float step) { return (double(side) - double(at)) / double(step); };
+    const auto time = [](int32_t side, float at, float step) {
+        return (double(side) - double(at)) / double(step);
+    };
     const auto isOutside = [](float at, int32_t low, int32_t high) {
         return at - float(low) < 8e-6f || at - float(high) >= -8e-6f;
     };
@@ -117,7 +123,8 @@ MotionPlaces WalkMotionLine(const PK_Rect& rect, const MotionLine& line, int32_t
     const int32_t columns = line.columns;
     const auto outer = Clip(Grown(rect, margin), line);
     if (!outer) return {columns, {}};
-    const int32_t start = Limit(std::floor((*outer)[0]), columns), end = Limit(std::ceil((*outer)[1]), columns);
+    const int32_t start = Limit(std::floor((*outer)[0]), columns),
+                  end = Limit(std::ceil((*outer)[1]), columns);
     int32_t inner = end, right = end;
     if (const auto inside = Clip(Grown(rect, -margin), line)) {
         right = Limit(std::floor((*inside)[1]), columns);
@@ -125,7 +132,8 @@ MotionPlaces WalkMotionLine(const PK_Rect& rect, const MotionLine& line, int32_t
     }
     MotionPlaces walk{start, {}};
     const PK_Point step = {line.step.x, line.rotated ? line.step.y : 0};
-    PK_Point at = {line.at.x + step.x * static_cast<float>(start), line.at.y + step.y * static_cast<float>(start)};
+    PK_Point at = {line.at.x + step.x * static_cast<float>(start),
+                   line.at.y + step.y * static_cast<float>(start)};
     for (int32_t i = start; i < inner; ++i, at = {at.x + step.x, at.y + step.y})
         walk.places.push_back({at, false});
     for (int32_t i = 0; i < right - inner; ++i) {

@@ -634,8 +634,8 @@ inline F32 LoadOnePerBlock(const float* source) {
 /// The sum of all blocks in the first: the halves are added, and then their halves.
 inline F32 SumOfBlocks(F32 a) {
     const __m256 halves = _mm256_add_ps(LowerHalf(a), UpperHalf(a));
-    return {_mm512_castps128_ps512(
-        _mm_add_ps(_mm256_castps256_ps128(halves), _mm256_extractf128_ps(halves, 1)))};
+    return {
+        _mm512_castps128_ps512(_mm_add_ps(_mm256_castps256_ps128(halves), _mm256_extractf128_ps(halves, 1)))};
 }
 inline void StoreFirstBlock(void* destination, F32 a) {
     _mm_storeu_ps(static_cast<float*>(destination), _mm512_castps512_ps128(a.v));
