@@ -7,8 +7,8 @@ namespace PK::PK_TARGET {
 namespace {
 
 constexpr int32_t kPhases = 128, kMostTaps = 20, kPixelFloats = 4, kPixelBytes = 16;
-constexpr int32_t kTogether =
-    4; // taps that are added up side by side, in an order that no vector's width changes
+// Taps that are added up side by side, in an order that no vector's width changes.
+constexpr int32_t kTogether = 4;
 constexpr int32_t kVectors = kTogether * kPixelFloats / kLanes;
 
 /// The weights of an axis as floats, which show all of them.
@@ -211,6 +211,9 @@ struct HighQuality {
     const Weights weightsX, weightsY;
 };
 
+constexpr MotionResampleKernels kKernels = {SampleRow<HighQuality<AlphaPlace::last>>,
+                                            SampleRow<HighQuality<AlphaPlace::first>>};
+
 } // namespace
 } // namespace PK::PK_TARGET
 
@@ -218,10 +221,7 @@ namespace PK {
 
 template <>
 const MotionResampleKernels& MotionResampleKernels::For<Target::PK_TARGET>() {
-    using namespace PK_TARGET;
-    static constexpr MotionResampleKernels kKernels = {SampleRow<HighQuality<AlphaPlace::last>>,
-                                                       SampleRow<HighQuality<AlphaPlace::first>>};
-    return kKernels;
+    return PK_TARGET::kKernels;
 }
 
 } // namespace PK
