@@ -15,6 +15,8 @@
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
+#include "frame/PixelFormat.h"
+#include "geometry/MotionSampleKernels.h"
 #include "geometry/WarpSpan.h"
 #include "primitives/ALaw.h"
 #include "primitives/BlockTransforms.h"
@@ -284,6 +286,51 @@ constexpr KernelRow kDeinterlacing[] = {
     Entry<&DeinterlaceKernels::alphaFirst32f>("InterpolateFieldRow_PRGB_32f", ThreeOf(Floats(4))),
 };
 
+// A picture of packed pixels in, a line of floats out.
+template <auto kMember, size_t... kPlace>
+constexpr KernelRow Sampler(const char* name, PK_PixelFormat format) {
+    const uint32_t depth = DepthOf(format);
+    const Operand pixel = depth == kDepth8u ? Bytes(4) : depth == kDepth15u ? Words(4) : Floats(4);
+    return Entry<kMember, kPlace...>(name, {{pixel.samples, pixel.bytes, 1, format}, Floats(4)});
+}
+
+constexpr KernelRow kMotion[] = {
+    Sampler<&MotionSampleKernels::straight, kMotionRGB8>("SampleMotionRow", PK_PixelFormat_BGRA_4444_8u),
+    Sampler<&MotionSampleKernels::straight, kMotionRGB8AlphaFirst>("SampleMotionRow",
+                                                                   PK_PixelFormat_ARGB_4444_8u),
+    Sampler<&MotionSampleKernels::straight, kMotionYUV8>("SampleMotionRow", PK_PixelFormat_VUYA_4444_8u),
+    Sampler<&MotionSampleKernels::straight, kMotion15>("SampleMotionRow", PK_PixelFormat_BGRA_4444_15u),
+    Sampler<&MotionSampleKernels::straight, kMotion15AlphaFirst>("SampleMotionRow",
+                                                                 PK_PixelFormat_ARGB_4444_15u),
+    Sampler<&MotionSampleKernels::straight, kMotionFloats>("SampleMotionRow", PK_PixelFormat_BGRA_4444_32f),
+    Sampler<&MotionSampleKernels::straight, kMotionFloatsAlphaFirst>("SampleMotionRow",
+                                                                     PK_PixelFormat_ARGB_4444_32f),
+    Sampler<&MotionSampleKernels::premultiplied, kMotionRGB8>("SampleMotionRow", PK_PixelFormat_BGRP_4444_8u),
+    Sampler<&MotionSampleKernels::premultiplied, kMotionRGB8AlphaFirst>("SampleMotionRow",
+                                                                        PK_PixelFormat_PRGB_4444_8u),
+    Sampler<&MotionSampleKernels::premultiplied, kMotionYUV8>("SampleMotionRow", PK_PixelFormat_VUYP_4444_8u),
+    Sampler<&MotionSampleKernels::premultiplied, kMotion15>("SampleMotionRow", PK_PixelFormat_BGRP_4444_15u),
+    Sampler<&MotionSampleKernels::premultiplied, kMotion15AlphaFirst>("SampleMotionRow",
+                                                                      PK_PixelFormat_PRGB_4444_15u),
+    Sampler<&MotionSampleKernels::premultiplied, kMotionFloats>("SampleMotionRow",
+                                                                PK_PixelFormat_BGRP_4444_32f),
+    Sampler<&MotionSampleKernels::premultiplied, kMotionFloatsAlphaFirst>("SampleMotionRow",
+                                                                          PK_PixelFormat_PRGB_4444_32f),
+    Sampler<&MotionSampleKernels::opaque, kMotionRGB8>("SampleMotionRow", PK_PixelFormat_BGRX_4444_8u),
+    Sampler<&MotionSampleKernels::opaque, kMotionRGB8AlphaFirst>("SampleMotionRow",
+                                                                 PK_PixelFormat_XRGB_4444_8u),
+    Sampler<&MotionSampleKernels::opaque, kMotionYUV8>("SampleMotionRow", PK_PixelFormat_VUYX_4444_8u),
+    Sampler<&MotionSampleKernels::opaque, kMotion15>("SampleMotionRow", PK_PixelFormat_BGRX_4444_15u),
+    Sampler<&MotionSampleKernels::opaque, kMotion15AlphaFirst>("SampleMotionRow",
+                                                               PK_PixelFormat_XRGB_4444_15u),
+    Sampler<&MotionSampleKernels::opaque, kMotionFloats>("SampleMotionRow", PK_PixelFormat_BGRX_4444_32f),
+    Sampler<&MotionSampleKernels::opaque, kMotionFloatsAlphaFirst>("SampleMotionRow",
+                                                                   PK_PixelFormat_XRGB_4444_32f),
+    Entry<&MotionSampleKernels::scaleLine>("ScaleMotionLineRow", {Floats(4), Floats(4)}),
+    Sampler<&MotionResampleKernels::alphaLast>("ResampleMotionRow", PK_PixelFormat_BGRP_4444_32f_Linear),
+    Sampler<&MotionResampleKernels::alphaFirst>("ResampleMotionRow", PK_PixelFormat_PRGB_4444_32f_Linear),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -312,6 +359,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kGainsAndSums);
     add(kDissolves);
     add(kDeinterlacing);
+    add(kMotion);
     add(kColour);
     return all;
 }

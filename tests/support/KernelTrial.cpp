@@ -8,6 +8,8 @@
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "filters/BoxBlurKernels.h"
+#include "filters/ResampleKernel.h"
+#include "geometry/MotionSampleKernels.h"
 #include "geometry/WarpSpan.h"
 #include "primitives/BlockTransforms.h"
 #include "primitives/Channels.h"
@@ -22,6 +24,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstring>
+#include <memory>
 #include <stdexcept>
 #include <string>
 
@@ -302,6 +305,64 @@ KernelTrial WarpTrial(const KernelRow& kernel, int32_t size, Random& random) {
             })};
 }
 
+float DrawBetween(Random& random, float least, float most) {
+    return least + (most - least) * static_cast<float>(random.Next()) * 0x1p-32f;
+}
+
+/// A row across a picture of half its length, mostly inside; now and then across anything.
+MotionRow DrawMotionRow(Random& random, int32_t columns, int32_t pixelBytes) {
+    constexpr int32_t kRows = 16;
+    constexpr float kWild[] = {NAN, INFINITY, -INFINITY, 3e38f, -1e9f, 0};
+    MotionRow row{};
+    row.columns = columns;
+    row.left = static_cast<int32_t>(random.Below(3));
+    row.top = static_cast<int32_t>(random.Below(3));
+    row.right = columns / 2 + 8;
+    row.bottom = kRows;
+    row.rowBytes = int64_t{row.right} * pixelBytes;
+    row.rotated = random.Below(2) != 0;
+    row.smoothEdges = random.Below(2) != 0;
+    row.x = DrawBetween(random, -3, 3);
+    row.y = DrawBetween(random, 4, 13);
+    row.stepX = DrawBetween(random, 0.45f, 0.55f);
+    if (row.rotated) row.stepY = DrawBetween(random, -6, 6) / static_cast<float>(columns + 1);
+    float* const places[] = {&row.x, &row.y, &row.stepX, &row.stepY};
+    const uint32_t kind = random.Below(8);
+    if (kind == 1) *places[random.Below(4)] = DrawBetween(random, -30, 30);
+    if (kind == 2) *places[random.Below(4)] = kWild[random.Below(6)];
+    return row;
+}
+
+KernelTrial MotionTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    const MotionRow row = DrawMotionRow(random, size, kernel.operands.source.bytes);
+    const auto table = std::make_shared<ResampleKernel>(2); // lives as long as the call
+    const float scale = DrawBetween(random, 0.2f, 1.3f);
+    if (scale > 1)
+        table->ScaleForUpSample(scale);
+    else
+        table->ScaleForDownSample(scale, scale);
+    // The columns that the kernel tells stand behind the line.
+    return {{RowOf(kernel.operands.source, int64_t{row.right} * row.bottom)},
+            RowOf(kernel.operands.destination, size + 1),
+            Typed<SampleMotionRow>([=](SampleMotionRow run, const Sources& sources, uint8_t* destination) {
+                MotionRow here = row;
+                here.pixels = sources[0];
+                here.kernelX = here.kernelY = {table->Weights(), table->Width()};
+                const MotionSpan span = run(here, reinterpret_cast<float*>(destination));
+                const float told[] = {static_cast<float>(span.first), static_cast<float>(span.count)};
+                std::memcpy(destination + 16 * Count(size), told, sizeof told);
+            })};
+}
+
+LineScale DrawLineScale(Random& random) {
+    LineScale scale;
+    for (int i = 0; i < 4; ++i) {
+        scale.zero[i] = static_cast<float>(random.Below(129));
+        scale.scale[i] = DrawAmount(random);
+    }
+    return scale;
+}
+
 struct SpecialTrial {
     const char* family;
     MakeKernelTrial make;
@@ -333,6 +394,9 @@ constexpr SpecialTrial kSpecial[] = {
     {"Sum", SumTrial},
     {"Dissolve", TwoRowTrialWith<float, DrawAmount>},
     {"BoxBlur", BoxTrial},
+    {"MotionSample", TrialWith<LineScale, DrawLineScale>, "ScaleMotionLine"},
+    {"MotionSample", MotionTrial},
+    {"MotionResample", MotionTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},
     {"Gamma", TrialWith<GammaConversion, DrawGamma>},

@@ -33,15 +33,16 @@ inline I32 NearestCode(F32 x) {
     return Max(Nearest(AtMost(Floats(kLimit), x)), Ints(0));
 }
 
+inline Channels ToFloat(IntChannels codes) {
+    return {ToFloat(codes.c0), ToFloat(codes.c1), ToFloat(codes.c2), ToFloat(codes.c3)};
+}
+
 /// How the codes of an integer layout become floats and come back.
 template <class Layout, int32_t kFullCode>
 struct CodesAsFloats {
     static constexpr float kFull = kFullCode;
 
-    static Channels Load(const void* source) {
-        const IntChannels codes = Layout::LoadCodes(source);
-        return {ToFloat(codes.c0), ToFloat(codes.c1), ToFloat(codes.c2), ToFloat(codes.c3)};
-    }
+    static Channels Load(const void* source) { return ToFloat(Layout::LoadCodes(source)); }
 
     static void Store(void* destination, Channels c) {
         Layout::StoreCodes(destination, {NearestCode<kFullCode>(c.c0), NearestCode<kFullCode>(c.c1),
@@ -66,6 +67,12 @@ struct Pixels8 : CodesAsFloats<Pixels8<kAlpha>, 255> {
     }
 };
 
+/// The four words of pixels whose first two are in one lane and whose last two in another.
+inline IntChannels WordChannels(I32 first, I32 second) {
+    const I32 low = Ints(0xffff);
+    return {first & low, ShiftRight<16>(first), second & low, ShiftRight<16>(second)};
+}
+
 /// White is 32768.
 template <AlphaPlace kAlpha = AlphaPlace::last>
 struct Pixels15 : CodesAsFloats<Pixels15<kAlpha>, 32768> {
@@ -74,9 +81,7 @@ struct Pixels15 : CodesAsFloats<Pixels15<kAlpha>, 32768> {
     static IntChannels LoadCodes(const void* source) {
         I32 first, second;
         LoadLanePairs(source, first, second);
-        const I32 low = Ints(0xffff);
-        return InOrder<kAlpha>(
-            IntChannels{first & low, ShiftRight<16>(first), second & low, ShiftRight<16>(second)});
+        return InOrder<kAlpha>(WordChannels(first, second));
     }
 
     /// The codes are from 0 to 65535.

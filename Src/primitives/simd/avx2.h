@@ -368,4 +368,36 @@ inline I32 ReverseLanes(I32 a) {
     return {_mm256_permutevar8x32_epi32(a.v, _mm256_setr_epi32(7, 6, 5, 4, 3, 2, 1, 0))};
 }
 
+/// Two lanes side by side for each lane, from any places: lane i has its two at offsets[i], in bytes.
+inline void LoadLanePairsAt(const uint8_t* base, const int64_t* offsets, I32& first, I32& second) {
+    const auto pairs = [base, offsets](int i) {
+        const auto pair = [base, offsets](int lane) {
+            return _mm_loadl_epi64(reinterpret_cast<const __m128i*>(base + offsets[lane]));
+        };
+        return _mm_unpacklo_epi64(pair(i), pair(i + 1));
+    };
+    const __m256 outer = _mm256_castsi256_ps(_mm256_set_m128i(pairs(4), pairs(0)));
+    const __m256 inner = _mm256_castsi256_ps(_mm256_set_m128i(pairs(6), pairs(2)));
+    first.v = _mm256_castps_si256(_mm256_shuffle_ps(outer, inner, _MM_SHUFFLE(2, 0, 2, 0)));
+    second.v = _mm256_castps_si256(_mm256_shuffle_ps(outer, inner, _MM_SHUFFLE(3, 1, 3, 1)));
+}
+
+/// Block i is loaded from offsets[4 x i], in bytes.
+inline F32 LoadFloatBlocksAt(const uint8_t* base, const int64_t* offsets) {
+    return LoadFloatBlocks(base + offsets[0], offsets[4] - offsets[0]);
+}
+
+/// Of floats side by side, one for each block, in all its lanes.
+inline F32 LoadOnePerBlock(const float* source) {
+    return {_mm256_set_m128(_mm_set1_ps(source[1]), _mm_set1_ps(source[0]))};
+}
+
+/// The sum of all blocks in the first: the halves are added, and then their halves.
+inline F32 SumOfBlocks(F32 a) {
+    return {_mm256_castps128_ps256(_mm_add_ps(_mm256_castps256_ps128(a.v), _mm256_extractf128_ps(a.v, 1)))};
+}
+inline void StoreFirstBlock(void* destination, F32 a) {
+    _mm_storeu_ps(static_cast<float*>(destination), _mm256_castps256_ps128(a.v));
+}
+
 } // namespace PK::PK_TARGET

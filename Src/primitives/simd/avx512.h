@@ -602,4 +602,43 @@ inline I32 PackLanesInBlocks(I32 a, I32 b, I32 c, I32 d) {
     return {_mm512_packus_epi16(_mm512_packs_epi32(a.v, b.v), _mm512_packs_epi32(c.v, d.v))};
 }
 
+/// Two lanes side by side for each lane, from any places: lane i has its two at offsets[i], in bytes.
+inline void LoadLanePairsAt(const uint8_t* base, const int64_t* offsets, I32& first, I32& second) {
+    const auto blocks = [base, offsets](int i) {
+        const auto pairs = [base, offsets](int lane) {
+            const auto pair = [base](int64_t at) {
+                return _mm_loadl_epi64(reinterpret_cast<const __m128i*>(base + at));
+            };
+            return _mm_unpacklo_epi64(pair(offsets[lane]), pair(offsets[lane + 1]));
+        };
+        return _mm512_inserti32x8(_mm512_castsi256_si512(_mm256_set_m128i(pairs(i + 4), pairs(i))),
+                                  _mm256_set_m128i(pairs(i + 12), pairs(i + 8)), 1);
+    };
+    const __m512 outer = _mm512_castsi512_ps(blocks(0)), inner = _mm512_castsi512_ps(blocks(2));
+    first.v = _mm512_castps_si512(_mm512_shuffle_ps(outer, inner, _MM_SHUFFLE(2, 0, 2, 0)));
+    second.v = _mm512_castps_si512(_mm512_shuffle_ps(outer, inner, _MM_SHUFFLE(3, 1, 3, 1)));
+}
+
+/// Block i is loaded from offsets[4 x i], in bytes.
+inline F32 LoadFloatBlocksAt(const uint8_t* base, const int64_t* offsets) {
+    return JoinHalves(_mm256_set_m128(LoadBlock(base + offsets[4]), LoadBlock(base + offsets[0])),
+                      _mm256_set_m128(LoadBlock(base + offsets[12]), LoadBlock(base + offsets[8])));
+}
+
+/// Of floats side by side, one for each block, in all its lanes.
+inline F32 LoadOnePerBlock(const float* source) {
+    const __m512i order = _mm512_setr_epi32(0, 0, 0, 0, 1, 1, 1, 1, 2, 2, 2, 2, 3, 3, 3, 3);
+    return {_mm512_permutexvar_ps(order, _mm512_castps128_ps512(_mm_loadu_ps(source)))};
+}
+
+/// The sum of all blocks in the first: the halves are added, and then their halves.
+inline F32 SumOfBlocks(F32 a) {
+    const __m256 halves = _mm256_add_ps(LowerHalf(a), UpperHalf(a));
+    return {
+        _mm512_castps128_ps512(_mm_add_ps(_mm256_castps256_ps128(halves), _mm256_extractf128_ps(halves, 1)))};
+}
+inline void StoreFirstBlock(void* destination, F32 a) {
+    _mm_storeu_ps(static_cast<float*>(destination), _mm512_castps512_ps128(a.v));
+}
+
 } // namespace PK::avx512

@@ -594,4 +594,31 @@ inline I32 ReverseLanes(I32 a) {
     return ShufflePixel<3, 2, 1, 0>(a);
 }
 
+/// Two lanes side by side for each lane, from any places: lane i has its two at offsets[i], in bytes.
+inline void LoadLanePairsAt(const uint8_t* base, const int64_t* offsets, I32& first, I32& second) {
+    const auto pair = [base, offsets](int i) {
+        return _mm_loadl_epi64(reinterpret_cast<const __m128i*>(base + offsets[i]));
+    };
+    SeparateLanes(I32{_mm_unpacklo_epi64(pair(0), pair(1))}, I32{_mm_unpacklo_epi64(pair(2), pair(3))}, first,
+                  second);
+}
+
+/// Block i is loaded from offsets[4 x i], in bytes.
+inline F32 LoadFloatBlocksAt(const uint8_t* base, const int64_t* offsets) {
+    return LoadFloats(base + *offsets);
+}
+
+/// Of floats side by side, one for each block, in all its lanes.
+inline F32 LoadOnePerBlock(const float* source) {
+    return Floats(*source);
+}
+
+/// The sum of all blocks in the first: the halves are added, and then their halves.
+inline F32 SumOfBlocks(F32 a) {
+    return a;
+}
+inline void StoreFirstBlock(void* destination, F32 a) {
+    Store(destination, a);
+}
+
 } // namespace PK::PK_TARGET

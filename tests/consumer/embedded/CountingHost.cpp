@@ -1,5 +1,6 @@
 #include "CountingHost.h"
 
+#include "zebcore/config.h"
 #include "zebcore/debug.h"
 #include "zebcore/memory.h"
 #include "zebcore/threads.h"
@@ -78,5 +79,17 @@ bool TraceEnabled(const char*, int32_t, bool) {
 
 void Trace(const std::string&) {}
 
+bool BreakAfterContractDialog(const char*, const char*, const char*, int32_t) {
+    return false;
+}
+
+bool IsDebuggerAttached() noexcept {
+    return false;
+}
+
 } // namespace debug
+
+void config::ThrowError(int32_t, const char*, uint32_t, int32_t, bool, const ReplacementValue&,
+                        const ReplacementValue&, const ReplacementValue&, const ReplacementValue&) {}
+
 } // namespace zebcore

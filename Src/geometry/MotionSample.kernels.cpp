@@ -1,0 +1,280 @@
+// Samples between four pixels: a layout, the zeros of its colours, and a way to weigh by alpha.
+
+#include "geometry/MotionWalk.h"
+#include "primitives/lanes/RowDriver.h"
+
+namespace PK::PK_TARGET {
+namespace {
+
+// Where a colour has its zero, which is also what transparent pixels show.
+
+struct NoZero {
+    static constexpr bool kIsZero = true;
+    static Channels Value() { return {Floats(0), Floats(0), Floats(0), Floats(0)}; }
+};
+struct VideoZero {
+    static constexpr bool kIsZero = false;
+    static Channels Value() { return {Floats(128), Floats(128), Floats(16), Floats(0)}; }
+};
+
+inline Channels And(I32 mask, const Channels& c) {
+    const auto masked = [mask](F32 x) { return FromBits(Bits(x) & mask); };
+    return {masked(c.c0), masked(c.c1), masked(c.c2), masked(c.c3)};
+}
+
+// Two pixels side by side for each lane, the left ones at the offsets.
+
+template <AlphaPlace kAlpha>
+inline void LoadNeighbours(Pixels8<kAlpha>, const uint8_t* base, const int64_t* offsets, Channels& left,
+                           Channels& right) {
+    I32 lefts, rights;
+    LoadLanePairsAt(base, offsets, lefts, rights);
+    left = ToFloat(InOrder<kAlpha>(ByteChannels(lefts)));
+    right = ToFloat(InOrder<kAlpha>(ByteChannels(rights)));
+}
+
+template <AlphaPlace kAlpha>
+inline Channels LoadPixelsAt(Pixels15<kAlpha>, const uint8_t* base, const int64_t* offsets) {
+    I32 first, second;
+    LoadLanePairsAt(base, offsets, first, second);
+    return ToFloat(InOrder<kAlpha>(WordChannels(first, second)));
+}
+
+template <AlphaPlace kAlpha>
+inline Channels LoadPixelsAt(Pixels32f<kAlpha>, const uint8_t* base, const int64_t* offsets) {
+    Channels c = {LoadFloatBlocksAt(base, offsets), LoadFloatBlocksAt(base, offsets + 1),
+                  LoadFloatBlocksAt(base, offsets + 2), LoadFloatBlocksAt(base, offsets + 3)};
+    TransposePixels(c.c0, c.c1, c.c2, c.c3);
+    return InOrder<kAlpha>(c);
+}
+
+template <class Layout>
+inline void LoadNeighbours(Layout layout, const uint8_t* base, const int64_t* offsets, Channels& left,
+                           Channels& right) {
+    left = LoadPixelsAt(layout, base, offsets);
+    right = LoadPixelsAt(layout, base + Layout::kPixelBytes, offsets);
+}
+
+// Cells: the pixels between whose centres a place lies.
+
+inline I32 Limit(I32 x, int32_t low, int32_t high) {
+    return Max(Min(x, Ints(high)), Ints(low));
+}
+
+/// Not-a-number becomes the upper limit.
+inline F32 Limit(F32 x, int32_t low, int32_t high) {
+    return Max(Min(x, Floats(static_cast<float>(high))), Floats(static_cast<float>(low)));
+}
+
+inline I32 Floor(F32 x) {
+    const I32 whole = Truncate(x);
+    return whole + Less(x, ToFloat(whole));
+}
+
+/// Of pixels that are all in the source.
+struct InnerCell {
+    InnerCell(const float* places, int32_t low, int32_t high) {
+        const F32 place = Limit(LoadFloats(places) - Floats(0.5f), low, high - 1);
+        first = Limit(Floor(place), low, high - 2); // limited once more: a float may have rounded the bounds
+        fraction = place - ToFloat(first);
+    }
+
+    I32 first;
+    F32 fraction;
+};
+
+/// Of pixels that may lie outside; the nearest in the source stand for those.
+struct EdgeCell {
+    EdgeCell(const float* places, int32_t low, int32_t high) {
+        const F32 place = Limit(LoadFloats(places) - Floats(0.5f), low - 2, high + 1);
+        const I32 first = Floor(place), second = first + Ints(1);
+        fraction = place - ToFloat(first);
+        const I32 nearest[] = {Limit(first, low, high - 1), Limit(second, low, high - 1)};
+        Store(index[0], nearest[0]);
+        Store(index[1], nearest[1]);
+        isInside[0] = Equal(nearest[0], first);
+        isInside[1] = Equal(nearest[1], second);
+    }
+
+    int32_t index[2][kLanes];
+    I32 isInside[2];
+    F32 fraction;
+};
+
+/// What four pixels add up to, and the share of each in alpha.
+struct Weighed {
+    Channels sum;
+    F32 shares[4];
+};
+
+/// Upper left, upper right, lower left, lower right; colours are differences from their zeros.
+using Four = Channels[4];
+
+template <class Layout, class Zero, MotionAlpha kAlpha>
+struct Bilinear {
+    static constexpr int32_t kMargin = 2;
+
+    explicit Bilinear(const MotionRow& from) : row(from) {}
+
+    /// As differences, and with full alpha if the layout has none.
+    static Channels Prepare(Channels c) {
+        if constexpr (!Zero::kIsZero) {
+            const Channels zero = Zero::Value();
+            c = {c.c0 - zero.c0, c.c1 - zero.c1, c.c2 - zero.c2, c.c3};
+        }
+        if constexpr (kAlpha == MotionAlpha::none) c.c3 = Floats(Layout::kFull);
+        return c;
+    }
+
+    static Weighed Weigh(const Four& pixels, F32 fx, F32 fy) {
+        const F32 gx = Floats(1) - fx, gy = Floats(1) - fy;
+        const F32 weights[4] = {gx * gy, fx * gy, gx * fy, fx * fy};
+        Weighed result;
+        for (int i = 0; i < 4; ++i) {
+            const Channels& c = pixels[i];
+            const F32 share = weights[i] * c.c3;
+            result.shares[i] = share;
+            F32 factor = weights[i];
+            if constexpr (kAlpha == MotionAlpha::straight)
+                factor = Layout::kFull == 1 ? share : share * Floats(1 / Layout::kFull);
+            const Channels part = {c.c0 * factor, c.c1 * factor, c.c2 * factor, share};
+            Channels& sum = result.sum;
+            sum = i == 0 ? part
+                         : Channels{sum.c0 + part.c0, sum.c1 + part.c1, sum.c2 + part.c2, sum.c3 + part.c3};
+        }
+        return result;
+    }
+
+    static Channels Finish(const Channels& sum, I32 isVisible) {
+        Channels c = And(isVisible, sum);
+        if constexpr (!Zero::kIsZero) {
+            const Channels zero = Zero::Value();
+            c = {c.c0 + zero.c0, c.c1 + zero.c1, c.c2 + zero.c2, c.c3};
+        }
+        return c;
+    }
+
+    /// One pixel of the cell for each lane.
+    Channels LoadEdge(const EdgeCell& x, const EdgeCell& y, int32_t right, int32_t lower) const {
+        uint8_t copies[kLanes * Layout::kPixelBytes];
+        for (int32_t i = 0; i < kLanes; ++i)
+            std::memcpy(copies + i * Layout::kPixelBytes,
+                        row.pixels + y.index[lower][i] * row.rowBytes +
+                            int64_t{x.index[right][i]} * Layout::kPixelBytes,
+                        Layout::kPixelBytes);
+        return Prepare(Layout::Load(copies));
+    }
+
+    void Edge(const Places& places, int32_t count, float* out) const {
+        if (row.left >= row.right || row.top >= row.bottom) return Clear(count, out);
+        for (int32_t n = 0; n < count; n += kLanes) {
+            const EdgeCell x(places.x + n, row.left, row.right), y(places.y + n, row.top, row.bottom);
+            // Where the edge is hard, one pixel inside is enough, and the nearest ones stand for the others.
+            const I32 isNear = (x.isInside[0] | x.isInside[1]) & (y.isInside[0] | y.isInside[1]);
+            Four pixels;
+            for (int32_t i = 0; i < 4; ++i) {
+                const I32 isInside = row.smoothEdges ? x.isInside[i % 2] & y.isInside[i / 2] : isNear;
+                pixels[i] = And(isInside, LoadEdge(x, y, i % 2, i / 2));
+            }
+            const Channels sum = Weigh(pixels, x.fraction, y.fraction).sum;
+            const I32 isVisible = Less(Floats(0), sum.c3 - Floats(kNegligible));
+            StorePixels(out + 4 * n, Finish(sum, isVisible), count - n);
+        }
+    }
+
+    /// Nothing of the source is there to be read.
+    static void Clear(int32_t count, float* out) {
+        for (int32_t n = 0; n < count; n += kLanes) StorePixels(out + 4 * n, Zero::Value(), count - n);
+    }
+
+    /// Places first, all of them, so that no load waits for what has just been stored.
+    void Inside(const Places& places, int32_t count, float* out) const {
+        alignas(64) float fx[kBlock], fy[kBlock];
+        alignas(64) int64_t offsets[kBlock];
+        FindInside(places, count, fx, fy, offsets);
+        for (int32_t n = 0; n < count; n += kLanes) {
+            Four pixels;
+            LoadNeighbours(Layout(), row.pixels, offsets + n, pixels[0], pixels[1]);
+            LoadNeighbours(Layout(), row.pixels + row.rowBytes, offsets + n, pixels[2], pixels[3]);
+            for (Channels& pixel : pixels) pixel = Prepare(pixel);
+            const Weighed weighed = Weigh(pixels, LoadFloats(fx + n), LoadFloats(fy + n));
+            StorePixels(out + 4 * n, Finish(weighed.sum, IsVisible(weighed)), count - n);
+        }
+    }
+
+    /// The fractions of the places, and the bytes from pixel (0, 0) to the upper left pixel of their cells.
+    void FindInside(const Places& places, int32_t count, float* fx, float* fy, int64_t* offsets) const {
+        alignas(64) int32_t columns[kBlock], rows[kBlock];
+        for (int32_t n = 0; n < count; n += kLanes) {
+            const InnerCell x(places.x + n, row.left, row.right), y(places.y + n, row.top, row.bottom);
+            Store(columns + n, x.first);
+            Store(rows + n, y.first);
+            Store(fx + n, x.fraction);
+            Store(fy + n, y.fraction);
+        }
+        const int64_t rowBytes = row.rowBytes;
+        const int32_t end = (count + kLanes - 1) / kLanes * kLanes;
+        for (int32_t i = 0; i < end; ++i)
+            offsets[i] = rows[i] * rowBytes + int64_t{columns[i]} * Layout::kPixelBytes;
+    }
+
+    /// Inside the source a pixel is seen as soon as one of the four is.
+    static I32 IsVisible(const Weighed& weighed) {
+        if constexpr (kAlpha == MotionAlpha::none) {
+            return Ints(-1);
+        } else {
+            const F32 least = Floats(0x1p-17f);
+            const F32(&shares)[4] = weighed.shares;
+            return (Less(least, shares[0]) | Less(least, shares[1])) |
+                   (Less(least, shares[2]) | Less(least, shares[3]));
+        }
+    }
+
+    const MotionRow row; // a copy, which no store to the line can change in the compiler's eyes
+};
+
+template <MotionAlpha kAlpha>
+constexpr void Enter(SampleMotionRow (&samplers)[kMotionLayouts]) {
+    samplers[kMotionRGB8] = SampleRow<Bilinear<Pixels8<>, NoZero, kAlpha>>;
+    samplers[kMotionRGB8AlphaFirst] = SampleRow<Bilinear<Pixels8<AlphaPlace::first>, NoZero, kAlpha>>;
+    samplers[kMotionYUV8] = SampleRow<Bilinear<Pixels8<>, VideoZero, kAlpha>>;
+    samplers[kMotion15] = SampleRow<Bilinear<Pixels15<>, NoZero, kAlpha>>;
+    samplers[kMotion15AlphaFirst] = SampleRow<Bilinear<Pixels15<AlphaPlace::first>, NoZero, kAlpha>>;
+    samplers[kMotionFloats] = SampleRow<Bilinear<Pixels32f<>, NoZero, kAlpha>>;
+    samplers[kMotionFloatsAlphaFirst] = SampleRow<Bilinear<Pixels32f<AlphaPlace::first>, NoZero, kAlpha>>;
+}
+
+struct ScaleLine : SampleGroup<4, 4> {
+    explicit ScaleLine(const LineScale& by)
+        : zero(PixelFloats(by.zero[0], by.zero[1], by.zero[2], by.zero[3])),
+          scale(PixelFloats(by.scale[0], by.scale[1], by.scale[2], by.scale[3])) {}
+
+    void Group(const uint8_t* source, uint8_t* destination) const {
+        Store(destination, (LoadFloats(source) - zero) * scale);
+    }
+
+    F32 zero, scale;
+};
+
+constexpr MotionSampleKernels MakeKernels() {
+    MotionSampleKernels kernels{};
+    Enter<MotionAlpha::straight>(kernels.straight);
+    Enter<MotionAlpha::premultiplied>(kernels.premultiplied);
+    Enter<MotionAlpha::none>(kernels.opaque);
+    kernels.scaleLine = RowWith<ScaleLine, LineScale>;
+    return kernels;
+}
+
+constexpr MotionSampleKernels kKernels = MakeKernels();
+
+} // namespace
+} // namespace PK::PK_TARGET
+
+namespace PK {
+
+template <>
+const MotionSampleKernels& MotionSampleKernels::For<Target::PK_TARGET>() {
+    return PK_TARGET::kKernels;
+}
+
+} // namespace PK

@@ -1,0 +1,88 @@
+#pragma once
+
+// Kernels that sample one row of motion's destination: they walk along a straight line through the source and leave a
+// premultiplied float pixel for each column in the order of BGRA or VUYA, at the scale of the source's codes. Kernel
+// sources include this header.
+
+#include "primitives/KernelShapes.h"
+
+namespace PK {
+
+/// Weights for one axis, as ResampleKernel has them: 128 rows of `width`, at most 20. A width below 1 has none.
+struct ResampleTable {
+    const int16_t* weights;
+    int32_t width;
+};
+
+struct MotionRow {
+    const uint8_t* pixels; // column 0 of row 0, which need not be in the rectangle
+    int64_t rowBytes;
+    int32_t left, top, right, bottom; // what may be read; right and bottom are exclusive
+    float x, y;                       // where the first column lies in the source
+    float stepX, stepY;               // from one column to the next
+    int32_t columns;
+    bool rotated;                   // else y is the same for all columns
+    bool smoothEdges;               // what lies outside is transparent; else the nearest pixel stands for it
+    ResampleTable kernelX, kernelY; // only read at the highest quality
+};
+
+/// The columns that the source reaches. Others are not written.
+struct MotionSpan {
+    int32_t first, count;
+};
+
+/// \param line  a pixel of four floats for each column.
+using SampleMotionRow = MotionSpan (*)(const MotionRow& row, float* line);
+
+/// first to inner is sampled with a look at the edges of the source, as is right to end; what is between lies inside.
+struct MotionParts {
+    int32_t first, inner, right, end;
+};
+
+/// \param margin  that a place inside keeps from the edges, and that one outside may have.
+MotionParts PartsOfRow(const MotionRow& row, int32_t margin) noexcept;
+
+/// The layouts that have kernels, after each of which stands, where there is one, that with alpha first.
+enum MotionLayout : int32_t {
+    kMotionRGB8,
+    kMotionRGB8AlphaFirst,
+    kMotionYUV8,
+    kMotion15,
+    kMotion15AlphaFirst,
+    kMotionFloats,
+    kMotionFloatsAlphaFirst,
+    kMotionLayouts
+};
+
+enum class MotionAlpha : int32_t { straight, premultiplied, none };
+
+/// (channel - zero) x scale, by channel.
+struct LineScale {
+    float zero[4], scale[4];
+};
+
+struct MotionSampleKernels {
+    SampleMotionRow straight[kMotionLayouts];
+    SampleMotionRow premultiplied[kMotionLayouts];
+    SampleMotionRow opaque[kMotionLayouts];
+
+    // Takes a line to the range of floats; in place, too.
+    RowKernelWith<LineScale> scaleLine;
+
+    static constexpr const char* kFamily = "MotionSample";
+    static constexpr Offer kOffer = Offer::flags;
+    template <Target>
+    static const MotionSampleKernels& For();
+};
+
+/// By the weights of two tables: premultiplied floats.
+struct MotionResampleKernels {
+    SampleMotionRow alphaLast, alphaFirst;
+
+    static constexpr const char* kFamily = "MotionResample";
+    static constexpr Offer kOffer = Offer::flags;
+    template <Target>
+    static const MotionResampleKernels& For();
+};
+
+} // namespace PK
