@@ -106,6 +106,14 @@ Run WeightedSum(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// From half of each side.
+template <int kType, int kInterpolation>
+Run Enlarge(const uint8_t* source, uint8_t* destination) {
+    return [from = Wrap(source, kWidth / 2, kHeight / 2, kType), to = Upright(destination, kType)] {
+        cv::resize(from, to, to.size(), 0, 0, kInterpolation);
+    };
+}
+
 const AddPeers add = {
     {"Gain of BGRP 8u", "OpenCV convertTo", true, Scaled<CV_8UC4>},
     {"Gain of BGRP 32f", "OpenCV convertTo", false, Scaled<CV_32FC4>},
