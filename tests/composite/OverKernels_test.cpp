@@ -55,9 +55,9 @@ constexpr Member kFloats[] = {
     {"premultiplied XX", &Kernels::premultiplied32f_XX, {false, false, true, true}},
 };
 
-/// Opacities at both thresholds and between.
-constexpr float kOpacities[] = {8e-6f,     9e-6f,     0.25f,      0.5f, 0.7f, 0.99f,
-                                0.999985f, 0.999991f, 0.9999925f, 1,    1.5f};
+/// Opacities at both thresholds and between; the greatest that is not full is 1 with 8e-6 more.
+constexpr float kOpacities[] = {8e-6f,     9e-6f,     0.25f,          0.5f,       0.7f, 0.99f,
+                                0.999985f, 0.999991f, 0x1.fffef4p-1f, 0.9999925f, 1,    1.5f};
 
 class OverBodies : public TargetTest {
 protected:

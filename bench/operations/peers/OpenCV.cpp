@@ -16,14 +16,11 @@ cv::Mat Wrap(const uint8_t* bytes, int32_t width, int32_t height, int type) {
     return {height, width, type, const_cast<uint8_t*>(bytes)};
 }
 
-/// Images of so many times the width and height.
-template <int kScale = 1>
 cv::Mat Upright(const uint8_t* bytes, int type = CV_8UC4) {
-    return Wrap(bytes, kScale * kWidth, kScale * kHeight, type);
+    return Wrap(bytes, kWidth, kHeight, type);
 }
-template <int kScale = 1>
 cv::Mat Turned(const uint8_t* bytes, int type = CV_8UC4) {
-    return Wrap(bytes, kScale * kHeight, kScale * kWidth, type);
+    return Wrap(bytes, kHeight, kWidth, type);
 }
 
 Run FromRGB(const uint8_t* source, uint8_t* destination) {
@@ -32,17 +29,15 @@ Run FromRGB(const uint8_t* source, uint8_t* destination) {
     };
 }
 
-template <int kType, int kScale = 1>
+template <int kType>
 Run Transpose(const uint8_t* source, uint8_t* destination) {
-    return [from = Upright<kScale>(source, kType), to = Turned<kScale>(destination, kType)] {
-        cv::transpose(from, to);
-    };
+    return [from = Upright(source, kType), to = Turned(destination, kType)] { cv::transpose(from, to); };
 }
 
-template <int kCode, int kScale = 1>
+template <int kCode>
 Run Rotate(const uint8_t* source, uint8_t* destination) {
-    const cv::Mat to = kCode == cv::ROTATE_180 ? Upright<kScale>(destination) : Turned<kScale>(destination);
-    return [from = Upright<kScale>(source), to] { cv::rotate(from, to, kCode); };
+    const cv::Mat to = kCode == cv::ROTATE_180 ? Upright(destination) : Turned(destination);
+    return [from = Upright(source), to] { cv::rotate(from, to, kCode); };
 }
 
 template <int kWindowWidth, int kWindowHeight>
@@ -123,14 +118,12 @@ const AddPeers add = {
     {"Composite of two BGRA 8u by a one-bit mask", "OpenCV copyTo (mask of bytes)", false, MaskedCopy},
     {"RGB 8u to BGRA 8u", "OpenCV cvtColor", true, FromRGB},
     {"Transpose BGRA 8u", "OpenCV transpose", true, Transpose<CV_8UC4>},
-    {"Transpose BGRA 8u of 3840 x 2160", "OpenCV transpose", true, Transpose<CV_8UC4, 2>},
     {"Transpose pixels of 1 byte", "OpenCV transpose", true, Transpose<CV_8UC1>},
     {"Transpose pixels of 2 bytes", "OpenCV transpose", true, Transpose<CV_16UC1>},
     {"Transpose pixels of 8 bytes", "OpenCV transpose", true, Transpose<CV_16UC4>},
     {"Transpose pixels of 16 bytes", "OpenCV transpose", true, Transpose<CV_32FC4>},
     {"Rotate BGRA 8u by 90 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_CLOCKWISE>},
     {"Rotate BGRA 8u by 180 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_180>},
-    {"Rotate BGRA 8u of 3840 x 2160 by 180 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_180, 2>},
     {"Rotate BGRA 8u by 270 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_COUNTERCLOCKWISE>},
     {"Box blur of rows, radius 10", "OpenCV boxFilter 21 x 1", false, BoxFilter<21, 1>},
     {"Box blur of columns, radius 10", "OpenCV boxFilter 1 x 21", false, BoxFilter<1, 21>},
