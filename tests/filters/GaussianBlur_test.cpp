@@ -192,7 +192,9 @@ TEST_F(GaussianBlur, SpreadsADotIntoTheMargin) {
             };
             EXPECT_NEAR(at(12, 12 + i), at(12, 12 - i), 2.5f) << i;
             EXPECT_NEAR(at(12, 12 + i), at(12 + i, 12), 1) << i;
-            if (i > 0) EXPECT_LE(at(12 + i, 12), at(11 + i, 12) + 1) << i;
+            if (i > 0) {
+                EXPECT_LE(at(12 + i, 12), at(11 + i, 12) + 1) << i;
+            }
         }
     }
 }
