@@ -28,6 +28,16 @@ struct BoxBlur {
 };
 void Blur(Frame& frame, const BoxBlur& blur);
 
+struct GaussianBlur {
+    double sigmaX = 0;
+    double sigmaY = 0;
+    bool repeatEdge = false;
+    bool linear = false;
+    int32_t grow = 0; ///< pixels more on each side, in the directions that are blurred
+    int32_t quality = kDefaultQuality;
+};
+Frame Blurred(const Frame& frame, const GaussianBlur& blur);
+
 struct Warp {
     std::array<double, 8> quad = {}; ///< where the corners of the picture go, clockwise from the top left one
     float feather = 0;

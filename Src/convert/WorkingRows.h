@@ -78,15 +78,25 @@ public:
     }
 
     /// A further row, for TemporaryRows::Take of BytesOfRow.
-    void AddRow(PK_PixelFormat format) { fRowBytes += TemporaryRows::Rounded(BytesOfRow(format, fWidth)); }
+    void AddRow(PK_PixelFormat format) { AddBytes(BytesOfRow(format, fWidth)); }
+
+    /// Whatever else is to be had from TemporaryRows::Take.
+    void AddBytes(uint64_t bytes) { fRowBytes += TemporaryRows::Rounded(bytes); }
+
+    /// Bytes of all that was counted.
+    uint64_t Bytes() const {
+        return fRowBytes + static_cast<uint64_t>(fScratchRows) * TemporaryRows::Rounded(fScratchBytes);
+    }
+
+    /// The rows in so much memory.
+    TemporaryRows In(uint8_t* memory) const { return {memory, fScratchBytes, fScratchRows}; }
 
     /// Calls use(rows) with a TemporaryRows and returns what it returns; PK_ErrOutOfMemory without a call if more
     /// than the stack is given for, 256 KiB in all, could not be had.
     template <class Use>
     PK_Result With(Use&& use) const {
-        const uint64_t scratch = static_cast<uint64_t>(fScratchRows) * TemporaryRows::Rounded(fScratchBytes);
-        return WithRowScratch(fRowBytes + scratch, [&](uint8_t* memory) {
-            TemporaryRows rows(memory, fScratchBytes, fScratchRows);
+        return WithRowScratch(Bytes(), [&](uint8_t* memory) {
+            TemporaryRows rows = In(memory);
             return use(rows);
         });
     }

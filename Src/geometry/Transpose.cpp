@@ -10,26 +10,6 @@
 namespace PK {
 namespace {
 
-using TransposeKernel = void (*)(const TransposeArea&);
-
-TransposeKernel KernelOf(uint8_t pixelBytes) {
-    const TransposeKernels& kernels = Best<TransposeKernels>();
-    switch (pixelBytes) {
-    case 1:
-        return kernels.pixels1;
-    case 2:
-        return kernels.pixels2;
-    case 4:
-        return kernels.pixels4;
-    case 8:
-        return kernels.pixels8;
-    case 16:
-        return kernels.pixels16;
-    default:
-        return nullptr;
-    }
-}
-
 /// A step between rows in whole pixels; what is left over is dropped.
 int64_t WholePixels(int32_t rowBytes, int32_t pixelBytes) {
     return int64_t{rowBytes} / pixelBytes * pixelBytes;
@@ -65,7 +45,7 @@ using namespace PK;
 
 PK_Result PK_Transpose(const void* source, int32_t sourceRowBytes, void* dest, int32_t destRowBytes,
                        int32_t width, int32_t height, uint8_t pixelBytes) noexcept {
-    const TransposeKernel kernel = KernelOf(pixelBytes);
+    const TransposeKernels::Run kernel = Best<TransposeKernels>().OfPixels(pixelBytes);
     if (!kernel) return PK_ErrBadSrcFormat;
     if (const auto result = ResultOfSize(width, height, BelowZero::Refused)) return *result;
     if (HasNull({source, dest})) return PK_ErrFailed;
@@ -91,7 +71,7 @@ PK_Result PK_RotateImage(const void* source, int32_t sourceRowBytes, void* dest,
                                 WholePixels(destRowBytes, 4),
                                 height,
                                 width};
-    const TransposeKernel transpose = Best<TransposeKernels>().pixels4;
+    const TransposeKernels::Run transpose = Best<TransposeKernels>().pixels4;
     switch (degrees < 0 ? degrees + 360 : degrees) {
     case 90:
         transpose(FromLastSourceRow(area));

@@ -17,12 +17,28 @@ struct TransposeArea {
 };
 
 struct TransposeKernels {
-    void (*pixels1)(const TransposeArea& area);
-    void (*pixels2)(const TransposeArea& area);
-    void (*pixels4)(const TransposeArea& area);
-    void (*pixels8)(const TransposeArea& area);
-    void (*pixels16)(const TransposeArea& area);
+    using Run = void (*)(const TransposeArea& area);
+
+    Run pixels1, pixels2, pixels4, pixels8, pixels16;
     RowKernel reverseRow; ///< four-byte pixels
+
+    /// That of pixels of so many bytes; null where there is none.
+    constexpr Run OfPixels(int32_t pixelBytes) const {
+        switch (pixelBytes) {
+        case 1:
+            return pixels1;
+        case 2:
+            return pixels2;
+        case 4:
+            return pixels4;
+        case 8:
+            return pixels8;
+        case 16:
+            return pixels16;
+        default:
+            return nullptr;
+        }
+    }
 
     static constexpr const char* kFamily = "Transpose";
     static constexpr Offer kOffer = Offer::flags;

@@ -15,6 +15,7 @@
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
+#include "filters/GaussianBlurKernels.h"
 #include "frame/PixelFormat.h"
 #include "geometry/MotionSampleKernels.h"
 #include "geometry/WarpSpan.h"
@@ -125,6 +126,7 @@ constexpr KernelRow kOperations[] = {
     Entry<&MaskKernels::pixels16>("SelectByMaskRow_16", {Bytes(16), Bytes(16), Bytes(16)}),
     Entry<&BoxBlurKernels::bundle>("BoxBlurBundle", {Bytes(kBundleStep), Bytes(kBundleStep)}),
     Entry<&BoxBlurKernels::line>("BoxBlurLine", {Bytes(4), Bytes(4)}),
+    Entry<&GaussianBlurKernels::filterLines>("GaussianBlurLines", {Floats(4), Floats(4)}),
     Entry<&WarpNearestKernels::featherOver>("WarpSpan_FeatherOver", {Bytes(4), Bytes(4)}),
     Entry<&WarpNearestKernels::copy>("WarpSpan_Copy", {Bytes(4), Bytes(4)}),
     Entry<&WarpNearestKernels::blendBGRA>("WarpSpan_BlendBGRA", {Bytes(4), Bytes(4)}),

@@ -14,6 +14,7 @@
 #include <PixelKiln/CrossDissolve.h>
 #include <PixelKiln/Deinterlace.h>
 #include <PixelKiln/Fills.h>
+#include <PixelKiln/GaussianBlur.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Matte.h>
 #include <PixelKiln/Overlay.h>

@@ -97,6 +97,37 @@ void AddBlurs(Calls& calls) {
     }
 }
 
+void AddGaussianBlurs(Calls& calls) {
+    struct Blurring {
+        PK_PixelFormat format;
+        int32_t width, height, direction;
+        Memory memory;
+    };
+    constexpr int32_t kLong = 9001, kShort = 5, kSide = 40;
+    constexpr Memory kLines = TakesOrRefuses("lines above 256 KiB");
+    constexpr Blurring kBlurrings[] = {
+        {kBGRA, kSide, kShort, 1, TakesNone("has short lines on the stack")},
+        {kBGRA, kSide, kShort, 2, TakesNone("has short lines on the stack")},
+        {kBGRA, kSide, kShort, 3, TakesOrRefuses("the rows that wait for their columns")},
+        {kBGRA, kLong, kShort, 1, kLines},
+        {kBGRA, kShort, kLong, 2, kLines},
+        {PK_PixelFormat_BGRP_4444_32f, kLong, kShort, 3, TakesOrRefuses("rows that wait, and lines")},
+        {PK_PixelFormat_ARGB_4444_15u, kShort, kLong, 3, TakesOrRefuses("rows that wait, and lines")},
+    };
+    for (const Blurring& job : kBlurrings) {
+        const int32_t rowBytes = PK_PixelFormatRowBytes(job.format, job.width);
+        const size_t bytes = static_cast<size_t>(rowBytes) * static_cast<size_t>(job.height);
+        calls.push_back({{"PK_GaussianBlur"},
+                         job.memory,
+                         std::vector<uint8_t>(bytes),
+                         [=, source = Content(bytes)](uint8_t* block) {
+                             return PK_GaussianBlur(source.data(), rowBytes, job.width, job.height,
+                                                    job.format, block, rowBytes, job.width, job.height,
+                                                    job.format, 3, 2, true, false, job.direction, 4);
+                         }});
+    }
+}
+
 void AddStamps(Calls& calls) {
     constexpr int32_t kStampWidth = 900, kStampHeight = 300;
     calls.push_back({{"PK_PrintNum"},
@@ -108,6 +139,7 @@ void AddStamps(Calls& calls) {
                      }});
 }
 
-const Family sTurns(AddTurns), sFields(AddFields), sWarps(AddWarps), sBlurs(AddBlurs), sStamps(AddStamps);
+const Family sTurns(AddTurns), sFields(AddFields), sWarps(AddWarps), sBlurs(AddBlurs),
+    sGaussianBlurs(AddGaussianBlurs), sStamps(AddStamps);
 
 } // namespace

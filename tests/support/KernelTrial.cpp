@@ -8,6 +8,7 @@
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "filters/BoxBlurKernels.h"
+#include "filters/GaussianCoefficients.h"
 #include "filters/ResampleKernel.h"
 #include "geometry/MotionSampleKernels.h"
 #include "geometry/WarpSpan.h"
@@ -278,6 +279,29 @@ KernelTrial BoxTrial(const KernelRow& kernel, int32_t size, Random& random) {
             })};
 }
 
+/// Nearly `size` pixels in lines of one length: a full bundle if they are many, as the operation does it.
+KernelTrial GaussianTrial(const KernelRow& kernel, int32_t size, Random& random) {
+    constexpr int32_t kMany = 1024;
+    const int32_t lines =
+        size < kMany ? 1 + static_cast<int32_t>(random.Below(kGaussianLines)) : kGaussianLines;
+    const int32_t length = size / lines, count = length == 0 ? 0 : lines;
+    const int32_t more = static_cast<int32_t>(random.Below(2) * random.Below(20));
+    const GaussianCoefficients c =
+        GaussianCoefficientsOf(0.3 + 40 * static_cast<double>(random.Next()) * 0x1p-32);
+    const auto scratch =
+        std::make_shared<std::vector<uint8_t>>(kGaussianLines * kGaussianPixelBytes * Count(length + more));
+    const bool repeatEdge = random.Below(2) != 0;
+    using Filter = GaussianBlurKernels::Filter;
+    return {{RowOf(kernel.operands.source, int64_t{count} * length)},
+            RowOf(kernel.operands.destination, int64_t{count} * (length + more)),
+            Typed<Filter>([=](Filter run, const Sources& sources, uint8_t* destination) {
+                run({sources[0], int64_t{length} * kGaussianPixelBytes, destination,
+                     int64_t{length + more} * kGaussianPixelBytes, scratch->data(), count, length,
+                     length + more, repeatEdge},
+                    c);
+            })};
+}
+
 /// A span across a small picture, whose places leave it on both sides.
 KernelTrial WarpTrial(const KernelRow& kernel, int32_t size, Random& random) {
     constexpr int32_t kSide = 24;
@@ -397,6 +421,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"MotionSample", TrialWith<LineScale, DrawLineScale>, "ScaleMotionLine"},
     {"MotionSample", MotionTrial},
     {"MotionResample", MotionTrial},
+    {"GaussianBlur", GaussianTrial},
     {"WarpNearest", WarpTrial},
     {"WarpBilinear", WarpTrial},
     {"Gamma", TrialWith<GammaConversion, DrawGamma>},

@@ -234,6 +234,9 @@ inline void StoreBlocks(void* destination, int64_t stride, I32 a) {
     _mm_storeu_si128(static_cast<__m128i*>(destination), _mm256_castsi256_si128(a.v));
     _mm_storeu_si128(reinterpret_cast<__m128i*>(second), _mm256_extracti128_si256(a.v, 1));
 }
+inline void StoreFloatBlocks(void* destination, int64_t stride, F32 a) {
+    StoreBlocks(destination, stride, Bits(a));
+}
 
 /// The blocks of two or three vectors in turns.
 inline void StoreBlocksInTurns(void* destination, I32 a, I32 b) {

@@ -452,11 +452,21 @@ inline I32 Truncate(F64 a) {
 inline __m128 LoadBlock(const uint8_t* source) {
     return _mm_loadu_ps(reinterpret_cast<const float*>(source));
 }
-/// The block i is loaded from i x stride bytes further on.
+inline void StoreBlock(uint8_t* destination, __m128 block) {
+    _mm_storeu_ps(reinterpret_cast<float*>(destination), block);
+}
+/// The block i is loaded from, or stored to, i x stride bytes further on.
 inline F32 LoadFloatBlocks(const void* source, int64_t stride) {
     const auto* bytes = static_cast<const uint8_t*>(source);
     return JoinHalves(_mm256_set_m128(LoadBlock(bytes + stride), LoadBlock(bytes)),
                       _mm256_set_m128(LoadBlock(bytes + 3 * stride), LoadBlock(bytes + 2 * stride)));
+}
+inline void StoreFloatBlocks(void* destination, int64_t stride, F32 a) {
+    auto* bytes = static_cast<uint8_t*>(destination);
+    StoreBlock(bytes, _mm512_castps512_ps128(a.v));
+    StoreBlock(bytes + stride, _mm512_extractf32x4_ps(a.v, 1));
+    StoreBlock(bytes + 2 * stride, _mm512_extractf32x4_ps(a.v, 2));
+    StoreBlock(bytes + 3 * stride, _mm512_extractf32x4_ps(a.v, 3));
 }
 
 /// The blocks of two or three vectors in turns.

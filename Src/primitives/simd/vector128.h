@@ -448,9 +448,12 @@ inline I32 Truncate(F64 a) {
 
 // Blocks of four lanes: the pieces of which a wider vector is made.
 
-/// The block i is loaded from i x stride bytes further on.
+/// The block i is loaded from, or stored to, i x stride bytes further on.
 inline F32 LoadFloatBlocks(const void* source, [[maybe_unused]] int64_t stride) {
     return LoadFloats(source);
+}
+inline void StoreFloatBlocks(void* destination, [[maybe_unused]] int64_t stride, F32 a) {
+    Store(destination, a);
 }
 
 /// The blocks of two or three vectors in turns.

@@ -48,6 +48,14 @@ Run BoxFilter(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// By as many pixels to each side as it takes for the type: three sigmas of bytes, four of floats.
+template <int kType, int kSigma>
+Run GaussianBlur(const uint8_t* source, uint8_t* destination) {
+    return [from = Upright(source, kType), to = Upright(destination, kType)] {
+        cv::GaussianBlur(from, to, cv::Size(), kSigma, kSigma, cv::BORDER_REPLICATE);
+    };
+}
+
 // Its pixel centres are at whole numbers.
 template <int kInterpolation>
 Run Warp(const uint8_t* source, uint8_t* destination) {
@@ -127,6 +135,14 @@ const AddPeers add = {
     {"Rotate BGRA 8u by 270 degrees", "OpenCV rotate", true, Rotate<cv::ROTATE_90_COUNTERCLOCKWISE>},
     {"Box blur of rows, radius 10", "OpenCV boxFilter 21 x 1", false, BoxFilter<21, 1>},
     {"Box blur of columns, radius 10", "OpenCV boxFilter 1 x 21", false, BoxFilter<1, 21>},
+    {"Gaussian blur of BGRP 8u, sigma 1", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 1>},
+    {"Gaussian blur of BGRP 8u, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 10>},
+    {"Gaussian blur of BGRP 8u, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 40>},
+    {"Gaussian blur of BGRP 8u, sigma 100", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 100>},
+    {"Gaussian blur of BGRP 32f, sigma 1", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 1>},
+    {"Gaussian blur of BGRP 32f, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 10>},
+    {"Gaussian blur of BGRP 32f, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 40>},
+    {"Gaussian blur of BGRP 32f, sigma 100", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 100>},
     {"Quad warp, bilinear", "OpenCV warpAffine", false, Warp<cv::INTER_LINEAR>},
     {"Quad warp, nearest", "OpenCV warpAffine", false, Warp<cv::INTER_NEAREST>},
 };

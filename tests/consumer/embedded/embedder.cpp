@@ -49,6 +49,19 @@ int main() {
     Expect(count.allocations > 1, "scratch is the host's");
     Expect(count.allocations == count.blocksGivenBack, "scratch is given back to the host");
 
+    const host::Counts before = count;
+    const auto blur = [&](int32_t side, int32_t rows) {
+        PK_GaussianBlur(pixels.data(), 4 * side, side, rows, PK_PixelFormat_BGRA_4444_8u, samples.data(),
+                        4 * side, side, rows, PK_PixelFormat_BGRA_4444_8u, 2, 2, false, false, 3, 4);
+    };
+    blur(33, 32);
+    blur(32, 33);
+    Expect(count.tasks == before.tasks,
+           "an image that is not larger than 32 is blurred by the calling thread");
+    blur(33, 33);
+    Expect(count.tasks == before.tasks + 2, "rows and columns of a larger one are a task each");
+    Expect(count.parts == before.parts + 4, "of bands of 32 rows, and of strips of 128 bytes");
+
     PK_Terminate();
     Expect(count.executorsLetGo == 1, "a stop lets the executor go");
     if (sFailures == 0) std::puts("the library runs on the host of the project that includes it");
