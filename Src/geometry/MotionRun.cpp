@@ -1,5 +1,6 @@
 // Draws a placed source: copied where it lies pixel on pixel, else sampled row by row, by passes over the fields.
 
+#include "convert/RasterFormats.h"
 #include "convert/WorkingRows.h"
 #include "filters/GaussianBlur.h"
 #include "filters/ResampleKernel.h"
@@ -14,11 +15,11 @@
 #include "primitives/Thresholds.h"
 
 #include <PixelKiln/Accumulate.h>
+#include <PixelKiln/Composite.h>
 #include <PixelKiln/Convert.h>
 
 #include <algorithm>
 #include <cmath>
-#include <memory>
 #include <optional>
 
 namespace PK {
@@ -175,7 +176,7 @@ private:
         memory.AddRow(fLineFormat);
         memory.AddChain(fDirect);
         memory.AddChain(fLine);
-        return memory.With([&](TemporaryRows& rows) {
+        return memory.With([&](TemporaryRows& rows) -> PK_Result {
             auto* const line = reinterpret_cast<float*>(rows.Take(uint64_t{16} * static_cast<uint32_t>(Columns())));
             for (int32_t row = first; row < end; ++row, at.x += fWalk.row.x, at.y += fWalk.row.y) {
                 if (!IsOfField(row, field)) continue;

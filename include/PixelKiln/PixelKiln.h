@@ -17,6 +17,7 @@
 #include <PixelKiln/GaussianBlur.h>
 #include <PixelKiln/Lifecycle.h>
 #include <PixelKiln/Matte.h>
+#include <PixelKiln/Motion.h>
 #include <PixelKiln/Overlay.h>
 #include <PixelKiln/PixelFormat.h>
 #include <PixelKiln/Planar.h>
