@@ -113,7 +113,7 @@ struct Sampled {
 };
 
 /// The line ends, or begins, with a guard page.
-Sampled Run(SampleMotionRow sample, const MotionRow& row, Guard guard = Guard::kAfter) {
+Sampled SampleRow(SampleMotionRow sample, const MotionRow& row, Guard guard = Guard::kAfter) {
     const auto columns = static_cast<size_t>(row.columns);
     const GuardedRows memory(16 * columns, guard);
     auto* const line = reinterpret_cast<float*>(memory.Bytes());
@@ -124,7 +124,7 @@ Sampled Run(SampleMotionRow sample, const MotionRow& row, Guard guard = Guard::k
 }
 
 Sampled Sample(const MotionSource& source, const MotionLine& line, int32_t quality = 2) {
-    return Run(ChooseMotionSampler(source.format, quality), RowOf(source, line));
+    return SampleRow(ChooseMotionSampler(source.format, quality), RowOf(source, line));
 }
 
 /// One pixel at one place.
@@ -202,7 +202,7 @@ TEST(MotionSample, EveryBodySamplesEveryFormatAsTheRestatement) {
                 ASSERT_NEAR(pixel[c], exact[c], 2e-5 * full) << "round " << round << ", column " << i;
         }
         AtEveryTarget([&] {
-            const Sampled sampled = Run(ChooseMotionSampler(format, 2), RowOf(source, line), guard);
+            const Sampled sampled = SampleRow(ChooseMotionSampler(format, 2), RowOf(source, line), guard);
             ASSERT_EQ(sampled.span.first, walkway.first);
             ASSERT_EQ(sampled.span.count, static_cast<int32_t>(walkway.places.size()));
             ASSERT_EQ("", FirstDifference(Samples::Floats, 16 * expected.size(),
@@ -340,7 +340,7 @@ TEST(MotionSample, AnythingForAPlaceStaysInTheSourceAndInTheLine) {
                             MotionRow row =
                                 RowOf(crop.Source(true), {{x, y}, {stepX, stepY}, 37, stepY != 0});
                             row.kernelX = row.kernelY = {table.Weights(), table.Width()};
-                            const Sampled sampled = Run(ChooseMotionSampler(format, quality), row);
+                            const Sampled sampled = SampleRow(ChooseMotionSampler(format, quality), row);
                             const auto [first, count] = sampled.span;
                             ASSERT_TRUE(first >= 0 && count >= 0 && first + count <= 37);
                             for (int32_t i = 0; i < 37; ++i) {
@@ -416,7 +416,7 @@ TEST(MotionResample, IsTheSumOverTheAreaOfBothAxes) {
         const PKReference::MotionPlaces walkway = PKReference::WalkMotionLine(rect, line, 6);
         std::vector<Pixel> first;
         AtEveryTarget([&] {
-            const Sampled sampled = Run(ChooseMotionSampler(format, 5), row, guard);
+            const Sampled sampled = SampleRow(ChooseMotionSampler(format, 5), row, guard);
             if (first.empty()) first = sampled.line;
             ASSERT_EQ("", FirstDifference(Samples::Floats, 16 * first.size(),
                                           reinterpret_cast<const uint8_t*>(first.data()),
@@ -456,7 +456,7 @@ Pixel Enlarge(const std::vector<Pixel>& pixels, float x, bool rotated, bool smoo
     const MotionSource source = image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, smoothEdges);
     MotionRow row = RowOf(source, {{x, 0.5f}, {0.5f, 0}, 1, rotated});
     row.kernelX = row.kernelY = {table.Weights(), table.Width()};
-    return Run(ChooseMotionSampler(source.format, 5), row).line[0];
+    return SampleRow(ChooseMotionSampler(source.format, 5), row).line[0];
 }
 
 } // namespace
@@ -486,7 +486,7 @@ TEST(MotionResample, WithoutATableGivesNothing) {
         MotionRow row =
             RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true), {{0, 1}, {1, 0}, 3, false});
         row.kernelX = row.kernelY = {nullptr, width};
-        for (const Pixel& pixel : Run(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line)
+        for (const Pixel& pixel : SampleRow(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line)
             ExpectPixel(pixel, {0, 0, 0, 0});
     }
 }
@@ -504,7 +504,7 @@ TEST(MotionResample, ReadsNoPixelBesideItsTaps) {
         MotionRow row = RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true),
                               {{12.75f, 0.5f}, {1, 0}, 1, rotated});
         row.kernelX = row.kernelY = {table.Weights(), table.Width()};
-        ExpectPixel(Run(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line[0],
+        ExpectPixel(SampleRow(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line[0],
                     {1, 1, 1, 1}, 1e-3f);
     }
 }
