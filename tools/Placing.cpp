@@ -39,11 +39,12 @@ void Place(const Frame& picture, const Placing& placing, Frame& back) {
     const PK_PixelFormat format = FormatOf(picture, placing.quality);
     if (format != picture.Format()) return Place(Converted(picture, format, kDefaultQuality), placing, back);
     Require(PK_MotionWithBlendMode(picture.Pixels(), picture.RowBytes(), picture.Width(), picture.Height(),
-                                   picture.Format(), placing.sourceField, nullptr, back.Pixels(), back.RowBytes(),
-                                   back.Width(), back.Height(), back.Format(), placing.destinationField, 1, 1,
-                                   FromBottom(placing.position), FromBottom(placing.anchor), placing.scale,
-                                   placing.rotation, static_cast<float>(placing.opacity), placing.softness,
-                                   placing.smoothEdges, 0, placing.mode, placing.quality, false),
+                                   picture.Format(), placing.sourceField, nullptr, back.Pixels(),
+                                   back.RowBytes(), back.Width(), back.Height(), back.Format(),
+                                   placing.destinationField, 1, 1, FromBottom(placing.position),
+                                   FromBottom(placing.anchor), placing.scale, placing.rotation,
+                                   static_cast<float>(placing.opacity), placing.softness, placing.smoothEdges,
+                                   0, placing.mode, placing.quality, false),
             "place", picture);
 }
 

@@ -2,7 +2,8 @@
 
 namespace tool {
 
-Y4MWriter::Y4MWriter(const std::string& name, int32_t width, int32_t height, int32_t framesASecond) : fFile(name) {
+Y4MWriter::Y4MWriter(const std::string& name, int32_t width, int32_t height, int32_t framesASecond)
+    : fFile(name) {
     const std::string head = "YUV4MPEG2 W" + std::to_string(width) + " H" + std::to_string(height) + " F" +
                              std::to_string(framesASecond) + ":1 Ip A1:1 C444 XCOLORRANGE=LIMITED\n";
     fFile.Write(head.data(), head.size());

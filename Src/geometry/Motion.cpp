@@ -72,8 +72,8 @@ PK_Result RunDeinterlaced(const MotionJob& job) {
     const bool keepsTop = job.sourceField == 1; // for what comes first
     const int32_t first = job.destinationField == 1 ? 1 : 2, second = 3 - first;
     if (job.renderField != 0 || !IsInterlaced(job.destinationField)) {
-        const bool isSecond = IsInterlaced(job.renderField) && job.renderField == second &&
-                              IsInterlaced(job.destinationField);
+        const bool isSecond =
+            IsInterlaced(job.renderField) && job.renderField == second && IsInterlaced(job.destinationField);
         return source.Run(isSecond ? keepsTop : !keepsTop, job.renderField);
     }
     if (const PK_Result result = source.Run(!keepsTop, first)) return result;
@@ -90,10 +90,13 @@ PK_Result Place(MotionJob job, const PK_Rect* crop) {
     if (job.opacity < kNegligible || scale.x < kNegligible || scale.y < kNegligible) return PK_Success;
     for (const auto& [width, height, pixels] :
          {std::tuple{job.source.width, job.source.height, job.source.pixels},
-          {job.destination.width, job.destination.height, static_cast<const uint8_t*>(job.destination.pixels)}})
-        if (const auto result = ResultWithoutWork(width, height, {pixels}, BelowZero::Refused)) return *result;
+          {job.destination.width, job.destination.height,
+           static_cast<const uint8_t*>(job.destination.pixels)}})
+        if (const auto result = ResultWithoutWork(width, height, {pixels}, BelowZero::Refused))
+            return *result;
 
-    if (job.quality > kBilinearQuality && !IsPremultipliedRGBFloat(job.source.format)) job.quality = kBilinearQuality;
+    if (job.quality > kBilinearQuality && !IsPremultipliedRGBFloat(job.source.format))
+        job.quality = kBilinearQuality;
     if (job.blendMode == PK_BlendMode_Dissolve) SeedSharedRandom(1);
     if (job.quality == kHighestQuality && IsInterlaced(job.sourceField)) return RunDeinterlaced(job);
     return RunMotion(job);
@@ -111,19 +114,20 @@ using namespace PK;
 
 namespace {
 
-PK_Result Place(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight, PK_PixelFormat srcFormat,
-                int32_t srcField, const PK_Rect* srcRect, void* dst, int32_t dstRowBytes, int32_t dstWidth,
-                int32_t dstHeight, PK_PixelFormat dstFormat, int32_t dstField, uint32_t aspectNum, uint32_t aspectDen,
-                PK_Point position, PK_Point anchor, PK_Point scale, double rotation, float opacity, bool composite,
-                double softness, bool smoothEdges, int32_t renderField, PK_BlendMode blendMode, int32_t quality,
+PK_Result Place(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
+                PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst,
+                int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,
+                int32_t dstField, uint32_t aspectNum, uint32_t aspectDen, PK_Point position, PK_Point anchor,
+                PK_Point scale, double rotation, float opacity, bool composite, double softness,
+                bool smoothEdges, int32_t renderField, PK_BlendMode blendMode, int32_t quality,
                 bool compositeInLinear) {
     return PK::Place({{static_cast<const uint8_t*>(src), srcRowBytes, srcFormat, srcWidth, srcHeight},
                       srcField,
                       {},
                       {static_cast<uint8_t*>(dst), dstRowBytes, dstFormat, dstWidth, dstHeight},
                       dstField,
-                      {srcWidth, srcHeight, dstWidth, dstHeight, aspectNum, aspectDen, FromTop(position), FromTop(anchor),
-                       scale, rotation},
+                      {srcWidth, srcHeight, dstWidth, dstHeight, aspectNum, aspectDen, FromTop(position),
+                       FromTop(anchor), scale, rotation},
                       opacity,
                       composite,
                       softness,
@@ -138,24 +142,28 @@ PK_Result Place(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t 
 } // namespace
 
 PK_Result PK_Motion(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
-                    PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst, int32_t dstRowBytes,
-                    int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat, int32_t dstField, uint32_t aspectNum,
-                    uint32_t aspectDen, PK_Point position, PK_Point anchor, PK_Point scale, double rotation,
-                    float opacity, bool composite, double softness, bool smoothEdges, int32_t renderField,
-                    int32_t quality, bool compositeInLinear) noexcept {
-    return ::Place(src, srcRowBytes, srcWidth, srcHeight, srcFormat, srcField, srcRect, dst, dstRowBytes, dstWidth,
-                   dstHeight, dstFormat, dstField, aspectNum, aspectDen, position, anchor, scale, rotation, opacity,
-                   composite, softness, smoothEdges, renderField, PK_BlendMode_Normal, quality, compositeInLinear);
+                    PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst,
+                    int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,
+                    int32_t dstField, uint32_t aspectNum, uint32_t aspectDen, PK_Point position,
+                    PK_Point anchor, PK_Point scale, double rotation, float opacity, bool composite,
+                    double softness, bool smoothEdges, int32_t renderField, int32_t quality,
+                    bool compositeInLinear) noexcept {
+    return ::Place(src, srcRowBytes, srcWidth, srcHeight, srcFormat, srcField, srcRect, dst, dstRowBytes,
+                   dstWidth, dstHeight, dstFormat, dstField, aspectNum, aspectDen, position, anchor, scale,
+                   rotation, opacity, composite, softness, smoothEdges, renderField, PK_BlendMode_Normal,
+                   quality, compositeInLinear);
 }
 
 PK_Result PK_MotionWithBlendMode(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
-                                 PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst,
-                                 int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,
-                                 int32_t dstField, uint32_t aspectNum, uint32_t aspectDen, PK_Point position,
-                                 PK_Point anchor, PK_Point scale, double rotation, float opacity, double softness,
-                                 bool smoothEdges, int32_t renderField, PK_BlendMode blendMode, int32_t quality,
+                                 PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect,
+                                 void* dst, int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight,
+                                 PK_PixelFormat dstFormat, int32_t dstField, uint32_t aspectNum,
+                                 uint32_t aspectDen, PK_Point position, PK_Point anchor, PK_Point scale,
+                                 double rotation, float opacity, double softness, bool smoothEdges,
+                                 int32_t renderField, PK_BlendMode blendMode, int32_t quality,
                                  bool compositeInLinear) noexcept {
-    return ::Place(src, srcRowBytes, srcWidth, srcHeight, srcFormat, srcField, srcRect, dst, dstRowBytes, dstWidth,
-                   dstHeight, dstFormat, dstField, aspectNum, aspectDen, position, anchor, scale, rotation, opacity, true,
-                   softness, smoothEdges, renderField, blendMode, quality, compositeInLinear);
+    return ::Place(src, srcRowBytes, srcWidth, srcHeight, srcFormat, srcField, srcRect, dst, dstRowBytes,
+                   dstWidth, dstHeight, dstFormat, dstField, aspectNum, aspectDen, position, anchor, scale,
+                   rotation, opacity, true, softness, smoothEdges, renderField, blendMode, quality,
+                   compositeInLinear);
 }

@@ -21,7 +21,8 @@ struct FieldOfSource {
 /// \param destinationField  that of the destination; any other number is a progressive one.
 /// \param pass              the field that is written, 0 for all rows.
 constexpr FieldOfSource ChooseFieldOfSource(int32_t sourceField, int32_t destinationField, int32_t pass) {
-    if (!IsInterlaced(destinationField)) return sourceField == 1 ? FieldOfSource{0, true} : FieldOfSource{1, false};
+    if (!IsInterlaced(destinationField))
+        return sourceField == 1 ? FieldOfSource{0, true} : FieldOfSource{1, false};
     constexpr FieldOfSource kSameOrder[] = {{1, true}, {0, true}, {1, false}};
     constexpr FieldOfSource kOtherOrder[] = {{0, true}, {1, false}, {0, true}};
     const int32_t column = pass == 0 || pass == 1 ? pass : 2;

@@ -34,12 +34,13 @@ bool MotionPlacement::IsUnscaled() const {
 }
 
 bool MotionPlacement::IsCentred() const {
-    return AreEqual(fGeometry.position.x, fGeometry.anchor.x) && AreEqual(fGeometry.position.y, fGeometry.anchor.y);
+    return AreEqual(fGeometry.position.x, fGeometry.anchor.x) &&
+           AreEqual(fGeometry.position.y, fGeometry.anchor.y);
 }
 
 PK_Point MotionPlacement::ToDestination(float x, float y) const {
-    const auto& [sourceWidth, sourceHeight, width, height, aspectNum, aspectDen, position, anchor, scale, rotation] =
-        fGeometry;
+    const auto& [sourceWidth, sourceHeight, width, height, aspectNum, aspectDen, position, anchor, scale,
+                 rotation] = fGeometry;
     float x1 = (x - static_cast<float>(sourceWidth) * anchor.x) * scale.x;
     float y1 = (y - static_cast<float>(sourceHeight) * anchor.y) * scale.y;
     if (fIsRotated) {
@@ -52,8 +53,8 @@ PK_Point MotionPlacement::ToDestination(float x, float y) const {
 }
 
 PK_Point MotionPlacement::ToSource(int32_t column, int32_t row) const {
-    const auto& [sourceWidth, sourceHeight, width, height, aspectNum, aspectDen, position, anchor, scale, rotation] =
-        fGeometry;
+    const auto& [sourceWidth, sourceHeight, width, height, aspectNum, aspectDen, position, anchor, scale,
+                 rotation] = fGeometry;
     float u = 0.5f - static_cast<float>(width) * position.x + static_cast<float>(column);
     float v = 0.5f - static_cast<float>(height) * position.y + static_cast<float>(row);
     if (fIsRotated) {
@@ -66,10 +67,12 @@ PK_Point MotionPlacement::ToSource(int32_t column, int32_t row) const {
 }
 
 PK_Rect MotionPlacement::Reach(const PK_Rect& source, int32_t marginX, int32_t marginY) const {
-    const auto left = static_cast<float>(source.left - marginX), right = static_cast<float>(source.right + marginX);
-    const auto top = static_cast<float>(source.top - marginY), bottom = static_cast<float>(source.bottom + marginY);
-    const PK_Point corners[] = {ToDestination(left, top), ToDestination(right, top), ToDestination(left, bottom),
-                                ToDestination(right, bottom)};
+    const auto left = static_cast<float>(source.left - marginX),
+               right = static_cast<float>(source.right + marginX);
+    const auto top = static_cast<float>(source.top - marginY),
+               bottom = static_cast<float>(source.bottom + marginY);
+    const PK_Point corners[] = {ToDestination(left, top), ToDestination(right, top),
+                                ToDestination(left, bottom), ToDestination(right, bottom)};
     float xs[4], ys[4];
     for (int i = 0; i < 4; ++i) {
         if (std::isnan(corners[i].x) || std::isnan(corners[i].y)) return {};

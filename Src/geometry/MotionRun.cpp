@@ -43,13 +43,14 @@ public:
                    int32_t destinationStep, int32_t width, int32_t height) const {
         const PK_PixelFormat to = fJob.destination.format;
         if (fJob.composites)
-            return PK_CompositeWithBlendMode(source, sourceStep, format, destination, destinationStep, to, destination,
-                                             destinationStep, to, width, height, fJob.opacity, fJob.blendMode,
-                                             fJob.quality, fJob.inLinear);
+            return PK_CompositeWithBlendMode(source, sourceStep, format, destination, destinationStep, to,
+                                             destination, destinationStep, to, width, height, fJob.opacity,
+                                             fJob.blendMode, fJob.quality, fJob.inLinear);
         if (IsFading(fJob))
-            return PK_AlphaGain(source, sourceStep, format, destination, destinationStep, to, width, height, fJob.opacity,
-                                fJob.quality);
-        return PK_Convert(source, sourceStep, format, destination, destinationStep, to, width, height, fJob.quality);
+            return PK_AlphaGain(source, sourceStep, format, destination, destinationStep, to, width, height,
+                                fJob.opacity, fJob.quality);
+        return PK_Convert(source, sourceStep, format, destination, destinationStep, to, width, height,
+                          fJob.quality);
     }
 
     /// Whether nothing but a conversion is asked for, which a chain does.
@@ -81,9 +82,10 @@ PK_Result CopyWhole(const MotionJob& job) {
         toStep *= 2;
         height /= 2;
     }
-    if (fromStep != static_cast<int32_t>(fromStep) || toStep != static_cast<int32_t>(toStep)) return PK_ErrFailed;
-    return RowDrawer(job).Draw(from, static_cast<int32_t>(fromStep), job.source.format, to, static_cast<int32_t>(toStep),
-                               job.source.width, height);
+    if (fromStep != static_cast<int32_t>(fromStep) || toStep != static_cast<int32_t>(toStep))
+        return PK_ErrFailed;
+    return RowDrawer(job).Draw(from, static_cast<int32_t>(fromStep), job.source.format, to,
+                               static_cast<int32_t>(toStep), job.source.width, height);
 }
 
 // Sampled.
@@ -143,17 +145,20 @@ struct DrawnSpan {
 
 class SampledRows {
 public:
-    SampledRows(const MotionJob& job, const DestinationImage& destination, const PK_Rect& box, const Walk& walk,
-                PK_PixelFormat sampled, bool isRotated, const ResampleTable& kernelX, const ResampleTable& kernelY)
+    SampledRows(const MotionJob& job, const DestinationImage& destination, const PK_Rect& box,
+                const Walk& walk, PK_PixelFormat sampled, bool isRotated, const ResampleTable& kernelX,
+                const ResampleTable& kernelY)
         : fJob(job), fDrawer(job), fDestination(destination), fBox(box), fWalk(walk), fIsRotated(isRotated),
           fKernelX(kernelX), fKernelY(kernelY), fSample(ChooseMotionSampler(sampled, job.quality)),
           fScale(MotionLineScale(job.source.format)),
-          fLineFormat(Packed4444(With(job.source.format, kOrderMask, kOrderBGRA), kAlphaPremultiplied, kDepth32f)) {}
+          fLineFormat(
+              Packed4444(With(job.source.format, kOrderMask, kOrderBGRA), kAlphaPremultiplied, kDepth32f)) {}
 
     /// Whether there are ways to the destination's format.
     bool Build() {
         const PK_PixelFormat to = fDestination.format;
-        return fDirect.Build(fJob.source.format, to, fJob.quality) && fLine.Build(fLineFormat, to, fJob.quality);
+        return fDirect.Build(fJob.source.format, to, fJob.quality) &&
+               fLine.Build(fLineFormat, to, fJob.quality);
     }
 
     /// All rows of the box, or those of a field.
@@ -171,13 +176,15 @@ public:
 private:
     int32_t Columns() const { return fBox.right - fBox.left; }
 
-    PK_Result RenderBand(const SourceRows& source, PK_Point at, int32_t first, int32_t end, int32_t field) const {
+    PK_Result RenderBand(const SourceRows& source, PK_Point at, int32_t first, int32_t end,
+                         int32_t field) const {
         RowMemory memory(Columns());
         memory.AddRow(fLineFormat);
         memory.AddChain(fDirect);
         memory.AddChain(fLine);
         return memory.With([&](TemporaryRows& rows) -> PK_Result {
-            auto* const line = reinterpret_cast<float*>(rows.Take(uint64_t{16} * static_cast<uint32_t>(Columns())));
+            auto* const line =
+                reinterpret_cast<float*>(rows.Take(uint64_t{16} * static_cast<uint32_t>(Columns())));
             for (int32_t row = first; row < end; ++row, at.x += fWalk.row.x, at.y += fWalk.row.y) {
                 if (!IsOfField(row, field)) continue;
                 const DrawnSpan span = SpanOfRow(source, at, line);
@@ -198,8 +205,10 @@ private:
             if (column && row) return ExactSpan(source, *column, *row);
         }
         const auto& [left, top, right, bottom] = source.rectangle;
-        const MotionRow row = {source.pixels, source.rowBytes, left, top, right, bottom, at.x, at.y, fWalk.column.x,
-                               fWalk.column.y, Columns(), fIsRotated, fJob.smoothEdges, fKernelX, fKernelY};
+        const MotionRow row = {
+            source.pixels, source.rowBytes, left,           top,       right,      bottom,           at.x,
+            at.y,          fWalk.column.x,  fWalk.column.y, Columns(), fIsRotated, fJob.smoothEdges, fKernelX,
+            fKernelY};
         const MotionSpan span = fSample(row, line);
         if (span.count < 1) return {};
         float* const pixels = line + int64_t{4} * span.first;
@@ -213,8 +222,8 @@ private:
         if (row < rectangle.top || row >= rectangle.bottom) return {};
         const int32_t skipped = std::max(0, rectangle.left - column);
         const int32_t count = std::min(Columns(), rectangle.right - column) - skipped;
-        const uint8_t* const pixels =
-            source.pixels + row * source.rowBytes + (int64_t{column} + skipped) * BytesOfRow(source.format, 1);
+        const uint8_t* const pixels = source.pixels + row * source.rowBytes +
+                                      (int64_t{column} + skipped) * BytesOfRow(source.format, 1);
         return {pixels, &fDirect, fBox.left + skipped, count};
     }
 
@@ -241,22 +250,20 @@ private:
 
 /// Those of a source that is walked from its top. The crop's rows count in both fields.
 /// \param left, top  the place that the pixels are those of.
-SourceRows ChooseRows(const MotionJob& job, const SourceImage& source, int32_t left, int32_t top, int32_t pass) {
+SourceRows ChooseRows(const MotionJob& job, const SourceImage& source, int32_t left, int32_t top,
+                      int32_t pass) {
     const int64_t column = int64_t{left} * BytesOfRow(source.format, 1);
     if (!IsInterlaced(job.sourceField))
         return {source.Row(top) + column, source.rowBytes, source.format, job.crop, true, top};
     const FieldOfSource field = ChooseFieldOfSource(job.sourceField, job.destinationField, pass);
     const PK_Rect& crop = job.crop;
     const int32_t firstRow = field.RowFrom(top);
-    return {source.pixels + firstRow * source.rowBytes + column,
-            2 * source.rowBytes,
-            source.format,
-            {crop.left, crop.top / 2, crop.right, crop.bottom / 2},
-            field.isSameLine,
-            firstRow};
+    return {source.pixels + firstRow * source.rowBytes + column,    2 * source.rowBytes, source.format,
+            {crop.left, crop.top / 2, crop.right, crop.bottom / 2}, field.isSameLine,    firstRow};
 }
 
-PK_Result DrawSharp(const MotionJob& job, const SourceImage& source, const Walk& walk, const SampledRows& rows) {
+PK_Result DrawSharp(const MotionJob& job, const SourceImage& source, const Walk& walk,
+                    const SampledRows& rows) {
     const auto draw = [&](int32_t pass) {
         const SourceRows from = ChooseRows(job, source, 0, 0, pass);
         const PK_Point start = {walk.start.x, from.isSameLine ? walk.start.y : walk.start.y - 0.5f};
@@ -270,11 +277,11 @@ PK_Result DrawSharp(const MotionJob& job, const SourceImage& source, const Walk&
 /// A crop of the source, blurred, as if it lay where the source lies.
 class BlurredSource {
 public:
-    BlurredSource(const MotionJob& job, const SourceImage& source, const MotionBlur& blur, PK_PixelFormat format,
-                  int32_t marginX, int32_t marginY)
+    BlurredSource(const MotionJob& job, const SourceImage& source, const MotionBlur& blur,
+                  PK_PixelFormat format, int32_t marginX, int32_t marginY)
         : fJob(job), fSource(source), fBlur(blur), fMarginX(marginX), fMarginY(marginY),
-          fWidth(job.crop.right - job.crop.left + 2 * marginX),
-          fHeight(RowsOfCrop() + 2 * marginY), fFormat(format), fBuffer(format, fWidth, fHeight) {}
+          fWidth(job.crop.right - job.crop.left + 2 * marginX), fHeight(RowsOfCrop() + 2 * marginY),
+          fFormat(format), fBuffer(format, fWidth, fHeight) {}
 
     bool HasMemory() const { return fBuffer.Pixels() != nullptr; }
 
@@ -285,9 +292,9 @@ public:
         const int32_t width = crop.right - crop.left, height = HeightOf(from);
         const int32_t direction = (fBlur.x > 0 ? 1 : 0) + (fBlur.y > 0 ? 2 : 0);
         if (const PK_Result result = BlurForMotion(
-                from.pixels, static_cast<int32_t>(from.rowBytes), width, height, fJob.source.format, fBuffer.Pixels(),
-                fBuffer.RowBytes(), fWidth, fHeight, fFormat, fBlur.x, fBlur.y, !fJob.smoothEdges,
-                sMotionBlurLinear != 0, true, direction, fJob.quality))
+                from.pixels, static_cast<int32_t>(from.rowBytes), width, height, fJob.source.format,
+                fBuffer.Pixels(), fBuffer.RowBytes(), fWidth, fHeight, fFormat, fBlur.x, fBlur.y,
+                !fJob.smoothEdges, sMotionBlurLinear != 0, true, direction, fJob.quality))
             return result;
         const PK_Rect& lies = from.rectangle;
         const int64_t above = lies.top - (fHeight - height) / 2, before = lies.left - (fWidth - width) / 2;
@@ -295,7 +302,8 @@ public:
                    fBuffer.RowBytes(),
                    fFormat,
                    {lies.left - fMarginX, lies.top - fMarginY, lies.right + fMarginX, lies.bottom + fMarginY},
-                   from.isSameLine, from.firstRow};
+                   from.isSameLine,
+                   from.firstRow};
         return PK_Success;
     }
 
@@ -319,7 +327,8 @@ private:
     TransientPixelBuffer fBuffer;
 };
 
-PK_Result DrawBlurred(const MotionJob& job, const BlurredSource& source, const Walk& walk, const SampledRows& rows) {
+PK_Result DrawBlurred(const MotionJob& job, const BlurredSource& source, const Walk& walk,
+                      const SampledRows& rows) {
     const auto draw = [&](int32_t pass, bool isOneOfTwo) {
         SourceRows from;
         if (const PK_Result result = source.Blur(pass, from)) return result;
@@ -342,7 +351,8 @@ ResampleTable TableOf(const ResampleKernel& kernel) {
     return {kernel.Weights(), kernel.Width()};
 }
 
-PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, const MotionBlur& blur, bool needsBlur) {
+PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, const MotionBlur& blur,
+                      bool needsBlur) {
     ResampleKernel kernelX(kKeysCubic), kernelY(kKeysCubic);
     if (job.quality == kCubicQuality) {
         Scale(kernelX, placement.Scale().x);
@@ -358,8 +368,8 @@ PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, co
     const Walk walk = ChooseWalk(placement, box, IsInterlaced(job.sourceField));
     const PK_PixelFormat sampled =
         needsBlur ? WithAlpha(job.source.format, kAlphaPremultiplied) : job.source.format;
-    SampledRows rows(job, FromTop(job.destination), box, walk, sampled, placement.IsRotated(), TableOf(kernelX),
-                     TableOf(kernelY));
+    SampledRows rows(job, FromTop(job.destination), box, walk, sampled, placement.IsRotated(),
+                     TableOf(kernelX), TableOf(kernelY));
     if (!rows.Build()) return PK_ErrFailed;
     if (!needsBlur) return DrawSharp(job, source, walk, rows);
     const BlurredSource blurred(job, source, blur, sampled, marginX, marginY);

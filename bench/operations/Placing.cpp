@@ -15,11 +15,12 @@ struct Size {
     int32_t width, height;
 };
 
-PK_Result Place(const uint8_t* source, Size from, PK_PixelFormat fromFormat, uint8_t* destination, PK_PixelFormat toFormat,
-                float scale, double degrees, int32_t quality) {
-    return PK_Motion(source, PK_PixelFormatPackedRowBytes(fromFormat, from.width), from.width, from.height, fromFormat, 0,
-                     nullptr, destination, PK_PixelFormatPackedRowBytes(toFormat, kWidth), kWidth, kHeight, toFormat, 0, 1,
-                     1, kMiddle, kMiddle, {scale, scale}, degrees, 1, false, 0, false, 0, quality, false);
+PK_Result Place(const uint8_t* source, Size from, PK_PixelFormat fromFormat, uint8_t* destination,
+                PK_PixelFormat toFormat, float scale, double degrees, int32_t quality) {
+    return PK_Motion(source, PK_PixelFormatPackedRowBytes(fromFormat, from.width), from.width, from.height,
+                     fromFormat, 0, nullptr, destination, PK_PixelFormatPackedRowBytes(toFormat, kWidth),
+                     kWidth, kHeight, toFormat, 0, 1, 1, kMiddle, kMiddle, {scale, scale}, degrees, 1, false,
+                     0, false, 0, quality, false);
 }
 
 /// At 0.8 of the size, by 15 degrees.
@@ -39,13 +40,14 @@ constexpr PK_PixelFormat k8 = PK_PixelFormat_BGRP_4444_8u, k32 = PK_PixelFormat_
 // clang-format off: one row an operation
 const AddOperations add = {
     {"Placing of BGRP 8u turned, bilinear", kBytes8, kBytes8, Samples::Bytes, Against::Peer, 1, Turn<k8>},
-    {"Placing of BGRP 32f turned, bilinear", kBytes32, kBytes32, Samples::Floats, Against::Peer, 1, Turn<k32>},
-    {"Placing of BGRP 8u at twice the size, bilinear", kBytes8 / 4, kBytes8, Samples::Bytes, Against::Peer, 0.6,
-     Enlarge<k8, k8, 2>},
-    {"Placing of BGRP 8u at twice the size to 32f, bilinear", kBytes8 / 4, kBytes32, Samples::Bytes, Against::Peer, 1,
-     Enlarge<k8, k32, 2>},
-    {"Placing of BGRP 32f at twice the size, cubic", kBytes32 / 4, kBytes32, Samples::Floats, Against::Peer, 1,
-     Enlarge<kLinear, kLinear, 5>},
+    {"Placing of BGRP 32f turned, bilinear", kBytes32, kBytes32, Samples::Floats, Against::Peer, 1,
+     Turn<k32>},
+    {"Placing of BGRP 8u at twice the size, bilinear", kBytes8 / 4, kBytes8, Samples::Bytes, Against::Peer,
+     0.6, Enlarge<k8, k8, 2>},
+    {"Placing of BGRP 8u at twice the size to 32f, bilinear", kBytes8 / 4, kBytes32, Samples::Bytes,
+     Against::Peer, 1, Enlarge<k8, k32, 2>},
+    {"Placing of BGRP 32f at twice the size, cubic", kBytes32 / 4, kBytes32, Samples::Floats, Against::Peer,
+     1, Enlarge<kLinear, kLinear, 5>},
 };
 // clang-format on
 

@@ -12,7 +12,8 @@ namespace {
 
 using namespace PK;
 
-constexpr float kInfinity = std::numeric_limits<float>::infinity(), kNaN = std::numeric_limits<float>::quiet_NaN();
+constexpr float kInfinity = std::numeric_limits<float>::infinity(),
+                kNaN = std::numeric_limits<float>::quiet_NaN();
 
 /// 40 x 20 in the middle of 100 x 60.
 MotionGeometry Middle() {
@@ -81,8 +82,13 @@ TEST(MotionPlacement, GoesBackWhereItCameFrom) {
 
 TEST(MotionPlacement, ATwentiethOfADegreeIsTheLeastRotation) {
     MotionGeometry geometry = Middle();
-    for (const auto& [degrees, isRotated] : {std::pair{0.0, false}, {0.04, false}, {-0.04, false}, {0.06, true},
-                                             {180.0, true}, {360.0, false}, {359.9, true}}) {
+    for (const auto& [degrees, isRotated] : {std::pair{0.0, false},
+                                             {0.04, false},
+                                             {-0.04, false},
+                                             {0.06, true},
+                                             {180.0, true},
+                                             {360.0, false},
+                                             {359.9, true}}) {
         geometry.rotation = degrees;
         EXPECT_EQ(MotionPlacement(geometry).IsRotated(), isRotated) << degrees;
     }

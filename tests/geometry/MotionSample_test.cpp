@@ -486,7 +486,8 @@ TEST(MotionResample, WithoutATableGivesNothing) {
         MotionRow row =
             RowOf(image.Source(PK_PixelFormat_BGRP_4444_32f_Linear, true), {{0, 1}, {1, 0}, 3, false});
         row.kernelX = row.kernelY = {nullptr, width};
-        for (const Pixel& pixel : SampleRow(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line)
+        for (const Pixel& pixel :
+             SampleRow(ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, 5), row).line)
             ExpectPixel(pixel, {0, 0, 0, 0});
     }
 }

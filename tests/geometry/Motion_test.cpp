@@ -37,11 +37,11 @@ struct Call {
     int32_t renderField = 0, quality = 2;
 
     PK_Result operator()(const AlignedPicture& source, AlignedPicture& destination) const {
-        return PK_Motion(source.Pixels(), source.RowBytes(), source.width, source.height, source.format, sourceField,
-                         crop ? &*crop : nullptr, destination.Pixels(), destination.RowBytes(), destination.width,
-                         destination.height, destination.format, destinationField, aspectNum, aspectDen, position,
-                         anchor, scale, rotation, opacity, composite, softness, smoothEdges, renderField, quality,
-                         false);
+        return PK_Motion(source.Pixels(), source.RowBytes(), source.width, source.height, source.format,
+                         sourceField, crop ? &*crop : nullptr, destination.Pixels(), destination.RowBytes(),
+                         destination.width, destination.height, destination.format, destinationField,
+                         aspectNum, aspectDen, position, anchor, scale, rotation, opacity, composite,
+                         softness, smoothEdges, renderField, quality, false);
     }
 };
 
@@ -56,6 +56,17 @@ AlignedPicture RandomPicture(PK_PixelFormat format, int32_t width, int32_t heigh
     return picture;
 }
 
+/// Of premultiplied floats, none of them clear: those show no colour.
+AlignedPicture VisiblePicture(int32_t width, int32_t height, Random& random) {
+    AlignedPicture picture = RandomPicture(kFloats, width, height, random);
+    for (int32_t row = 0; row < height; ++row)
+        for (int32_t x = 0; x < width; ++x) {
+            const float alpha = 0.25f + static_cast<float>(random.Below(768)) / 1024;
+            std::memcpy(picture.Row(row) + 16 * x + 12, &alpha, sizeof alpha);
+        }
+    return picture;
+}
+
 TEST(MotionCall, APictureOnItselfIsConverted) {
     Random random(1);
     for (const PK_PixelFormat to : {kBGRA, kBGRX, kFloats, PK_PixelFormat_UYVY_422_8u})
@@ -65,8 +76,8 @@ TEST(MotionCall, APictureOnItselfIsConverted) {
             Call call;
             call.quality = quality;
             ASSERT_EQ(call(source, actual), PK_Success);
-            ASSERT_EQ(PK_Convert(source.Pixels(), source.RowBytes(), kBGRA, expected.Pixels(), expected.RowBytes(), to,
-                                 33, 21, std::min(quality, 4)),
+            ASSERT_EQ(PK_Convert(source.Pixels(), source.RowBytes(), kBGRA, expected.Pixels(),
+                                 expected.RowBytes(), to, 33, 21, std::min(quality, 4)),
                       PK_Success);
             EXPECT_EQ(actual.DifferenceFrom(expected), "");
         }
@@ -84,7 +95,8 @@ TEST(MotionCall, AMoveByWholePixelsCopiesThem) {
         const size_t kept = row < 3 ? 160 : 28;
         EXPECT_EQ(std::memcmp(destination.RowFromTop(row), before.RowFromTop(row), kept), 0) << row;
         if (row >= 3) {
-            EXPECT_EQ(std::memcmp(destination.RowFromTop(row) + 28, source.RowFromTop(row - 3), 160 - 28), 0) << row;
+            EXPECT_EQ(std::memcmp(destination.RowFromTop(row) + 28, source.RowFromTop(row - 3), 160 - 28), 0)
+                << row;
         }
     }
 }
@@ -110,7 +122,8 @@ TEST(MotionCall, ChecksItsArgumentsInOrder) {
     Random random(4);
     const AlignedPicture source = RandomPicture(kBGRA, 8, 6, random);
     AlignedPicture destination(kBGRA, 8, 6);
-    for (const PK_Rect& bad : {PK_Rect{0, 0, 9, 6}, {0, 0, 8, 7}, {-1, 0, 8, 6}, {0, -1, 8, 6}, {4, 0, 4, 6}, {0, 5, 8, 5}}) {
+    for (const PK_Rect& bad :
+         {PK_Rect{0, 0, 9, 6}, {0, 0, 8, 7}, {-1, 0, 8, 6}, {0, -1, 8, 6}, {4, 0, 4, 6}, {0, 5, 8, 5}}) {
         Call call;
         call.crop = bad;
         EXPECT_EQ(call(source, destination), PK_ErrBadRect);
@@ -136,14 +149,14 @@ TEST(MotionCall, ChecksItsArgumentsInOrder) {
     EXPECT_EQ(PK_Motion(source.Pixels(), 0, 8, 6, kBGRA, 0, nullptr, destination.Pixels(), 0, 8, 6,
                         PK_PixelFormat_NTSCDV25, 0, 1, 1, {}, {}, {1, 1}, 0, 1, false, 0, false, 0, 2, false),
               PK_ErrBadDstFormat);
-    EXPECT_EQ(PK_Motion(nullptr, 32, 8, 6, kBGRA, 0, nullptr, destination.Pixels(), 32, 8, 6, kBGRA, 0, 1, 1, {}, {},
-                        {1, 1}, 0, 1, false, 0, false, 0, 2, false),
+    EXPECT_EQ(PK_Motion(nullptr, 32, 8, 6, kBGRA, 0, nullptr, destination.Pixels(), 32, 8, 6, kBGRA, 0, 1, 1,
+                        {}, {}, {1, 1}, 0, 1, false, 0, false, 0, 2, false),
               PK_ErrFailed);
 }
 
 TEST(MotionCall, HalfATurnMirrorsBothWays) {
     Random random(5);
-    const AlignedPicture source = RandomPicture(kFloats, 16, 12, random);
+    const AlignedPicture source = VisiblePicture(16, 12, random);
     AlignedPicture destination(kFloats, 16, 12);
     Call call;
     call.rotation = 180;
@@ -188,7 +201,8 @@ public:
         const double x = column + 0.5 - fWidth * double{fCall.position.x};
         const double y = row + 0.5 - fHeight * (1 - double{fCall.position.y});
         const double u = (c * x + s * y) / fCall.scale.x + fSource.width * double{fCall.anchor.x} - 0.5;
-        const double v = (c * y - s * x) / fCall.scale.y + fSource.height * (1 - double{fCall.anchor.y}) - 0.5;
+        const double v =
+            (c * y - s * x) / fCall.scale.y + fSource.height * (1 - double{fCall.anchor.y}) - 0.5;
         std::fill_n(pixel, 4, 0.0);
         const double i = std::floor(u), j = std::floor(v), fx = u - i, fy = v - j;
         for (int corner = 0; corner < 4; ++corner) {
@@ -214,9 +228,10 @@ private:
 TEST(MotionCall, SamplesBetweenFourPixels) {
     Random random(7);
     for (int round = 0; round < 40; ++round) {
-        const AlignedPicture source =
-            RandomPicture(kFloats, static_cast<int32_t>(1 + random.Below(40)), static_cast<int32_t>(1 + random.Below(40)), random);
-        const auto width = static_cast<int32_t>(1 + random.Below(60)), height = static_cast<int32_t>(1 + random.Below(60));
+        const AlignedPicture source = VisiblePicture(static_cast<int32_t>(1 + random.Below(40)),
+                                                     static_cast<int32_t>(1 + random.Below(40)), random);
+        const auto width = static_cast<int32_t>(1 + random.Below(60)),
+                   height = static_cast<int32_t>(1 + random.Below(60));
         AlignedPicture destination(kFloats, width, height);
         const auto fraction = [&] { return static_cast<float>(random.Below(1000)) / 1000; };
         Call call;
@@ -235,7 +250,8 @@ TEST(MotionCall, SamplesBetweenFourPixels) {
                 std::memcpy(actual, destination.RowFromTop(row) + 16 * column, 16);
                 for (int channel = 0; channel < 4; ++channel)
                     ASSERT_NEAR(actual[channel], expected[channel], 2e-3)
-                        << "seed " << random.Seed() << ", round " << round << ", column " << column << ", row " << row;
+                        << "seed " << random.Seed() << ", round " << round << ", column " << column
+                        << ", row " << row;
             }
     }
 }
@@ -243,8 +259,12 @@ TEST(MotionCall, SamplesBetweenFourPixels) {
 TEST(MotionCall, OddNumbersReturnAtOnceAndWriteNothingBeside) {
     Random random(8);
     const AlignedPicture source = RandomPicture(kBGRP, 20, 20, random);
-    constexpr float kOdd[] = {std::numeric_limits<float>::quiet_NaN(), std::numeric_limits<float>::infinity(), 1e30f,
-                              -1e30f, 1e-5f, 1e9f};
+    constexpr float kOdd[] = {std::numeric_limits<float>::quiet_NaN(),
+                              std::numeric_limits<float>::infinity(),
+                              1e30f,
+                              -1e30f,
+                              1e-5f,
+                              1e9f};
     for (const float odd : kOdd)
         for (int which = 0; which < 6; ++which)
             for (const int32_t quality : {2, 4}) {

@@ -16,7 +16,8 @@ namespace tool {
 namespace {
 
 constexpr const char* kNotes =
-    "Places are fractions of a picture, from its top left corner. The anchor of SRC comes to lie on the position.\n"
+    "Places are fractions of a picture, from its top left corner. The anchor of SRC comes to lie on the "
+    "position.\n"
     "A flight goes from the placing that is told to that of --to, and is written as a Y4M stream:\n"
     "--to position=0.8,0.3 scale=0.5,0.5 rotate=90 opacity=0\n\n"
     "Examples:\n"
@@ -32,17 +33,22 @@ struct Options {
 };
 
 void Declare(Words& words, Options& options) {
-    words.Take("FILES", options.files, "SRC, BACK if there is one, and OUT: PNG files, or a .y4m of a flight").Required();
-    words.Take("--size", options.size, "Of the output, such as 1920x1080; without it, that of BACK or of SRC");
+    words.Take("FILES", options.files, "SRC, BACK if there is one, and OUT: PNG files, or a .y4m of a flight")
+        .Required();
+    words.Take("--size", options.size,
+               "Of the output, such as 1920x1080; without it, that of BACK or of SRC");
     words.Take("--position", options.position, "Where the anchor lies in the output").ShowDefault();
     words.Take("--anchor", options.anchor, "In SRC").ShowDefault();
     words.Take("--scale", options.scale, "Horizontally and vertically").ShowDefault();
     words.Take("--rotate", options.placing.rotation, "Degrees, clockwise").ShowDefault();
     words.Take("--opacity", options.placing.opacity, "Of SRC").Between(0.0, 1.0).ShowDefault();
-    words.Take("--softness", options.placing.softness, "Blur before sampling").Between(0.0, 1.0).ShowDefault();
+    words.Take("--softness", options.placing.softness, "Blur before sampling")
+        .Between(0.0, 1.0)
+        .ShowDefault();
     words.Flag("--soft-edges", options.placing.smoothEdges, "Fade the edges of SRC over a pixel");
     words.Take("--mode", options.mode, "Name of a blend mode, such as Multiply").ShowDefault();
-    words.Take("--src-field", options.placing.sourceField, "Earlier field of SRC; 0: progressive").OneOf({0, 1, 2});
+    words.Take("--src-field", options.placing.sourceField, "Earlier field of SRC; 0: progressive")
+        .OneOf({0, 1, 2});
     words.Take("--dst-field", options.placing.destinationField, "The same of the output").OneOf({0, 1, 2});
     AddQuality(words, options.placing.quality);
     words.Take("--frames", options.frames, "Of a flight").Between(1, 100000).ShowDefault();
@@ -71,7 +77,8 @@ void Set(Placing& placing, const std::string& name, const std::string& value) {
     else if (name == "softness")
         placing.softness = number();
     else
-        throw Failure(kExitUsage, "--to knows position, anchor, scale, rotate, opacity and softness, not '" + name + "'");
+        throw Failure(kExitUsage,
+                      "--to knows position, anchor, scale, rotate, opacity and softness, not '" + name + "'");
 }
 
 /// The placing at the end of a flight.
@@ -101,7 +108,8 @@ Frame BackOf(const Options& options, const Frame& source) {
     }
     if (back && back->Width() == width && back->Height() == height) return std::move(*back);
     Frame frame(PK_PixelFormat_BGRA_4444_8u, width, height);
-    Require(PK_FillWithOpaqueBlack(frame.Pixels(), frame.RowBytes(), width, height, frame.Format()), "fill", frame);
+    Require(PK_FillWithOpaqueBlack(frame.Pixels(), frame.RowBytes(), width, height, frame.Format()), "fill",
+            frame);
     if (back) Place(*back, {}, frame);
     return frame;
 }
