@@ -242,8 +242,20 @@ TEST(MotionCall, SamplesBetweenFourPixels) {
         call.rotation = 360 * static_cast<double>(fraction());
         ASSERT_EQ(call(source, destination), PK_Success);
         const Reference reference(source, call, width, height);
-        for (int32_t row = 0; row < height; ++row)
-            for (int32_t column = 0; column < width; ++column) {
+        const PK::MotionPlacement placement({source.width,
+                                             source.height,
+                                             width,
+                                             height,
+                                             1,
+                                             1,
+                                             {call.position.x, 1 - call.position.y},
+                                             {call.anchor.x, 1 - call.anchor.y},
+                                             call.scale,
+                                             call.rotation});
+        const PK_Rect box =
+            placement.Reach({0, 0, source.width, source.height}, 0, 0); // beside it nothing is drawn
+        for (int32_t row = box.top; row < box.bottom; ++row)
+            for (int32_t column = box.left; column < box.right; ++column) {
                 double expected[4];
                 float actual[4];
                 reference.At(column, row, expected);
