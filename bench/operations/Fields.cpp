@@ -2,6 +2,7 @@
 
 #include "operations/Operation.h"
 
+#include <PixelKiln/Convert.h>
 #include <PixelKiln/Deinterlace.h>
 
 namespace OperationBench {
@@ -17,6 +18,10 @@ Run Rebuild(const uint8_t*, uint8_t* image) {
 template <PK_PixelFormat kFormat, int32_t kRowBytes>
 Run RebuildBesideCopy(const uint8_t* source, uint8_t* destination) {
     return [=] {
+        constexpr int32_t kStep = 2 * kRowBytes;
+        const int32_t kept =
+            PK_IsOriginBottomLeft(kFormat) ? kRowBytes : 0; // rows 0, 2, 4 and so on from the top
+        PK_Convert(source + kept, kStep, kFormat, destination + kept, kStep, kFormat, kWidth, kHeight / 2, 4);
         PK_DeinterlaceCopy(source, kRowBytes, kFormat, destination, kRowBytes, kFormat, kWidth, kHeight, 0,
                            4);
     };

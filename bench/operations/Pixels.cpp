@@ -72,9 +72,8 @@ Run Transpose(const uint8_t* source, uint8_t* destination) {
 template <int32_t kDegrees>
 Run Rotate(const uint8_t* source, uint8_t* destination) {
     return [=] {
-        PK_RotateImage(source, kBGRARowBytes, destination,
-                       (kDegrees == 180 ? kBGRARowBytes : kTurnedRowBytes), kWidth, kHeight,
-                       PK_PixelFormat_BGRA_4444_8u, kDegrees);
+        PK_RotateImage(source, kBGRARowBytes, destination, kDegrees == 180 ? kBGRARowBytes : kTurnedRowBytes,
+                       kWidth, kHeight, PK_PixelFormat_BGRA_4444_8u, kDegrees);
     };
 }
 

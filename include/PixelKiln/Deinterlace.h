@@ -50,9 +50,9 @@ extern "C" {
 ///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on different
 /// images. PK_Initialize must have been called. From quality 4 on, denormal results become 0, as in
-/// conversions, though not the samples of kept rows that limit them. Below, the floating-point mode is the caller's but for the row that is copied. On return it is
-/// as it was; results are rounded by it. The exception flags of MXCSR are as before from quality 4 on, and else
-/// as the arithmetic left them.
+/// conversions, though not the samples of kept rows that limit them. Below, the floating-point mode is the
+/// caller's but for the row that is copied. On return it is as it was; results are rounded by it. The exception
+/// flags of MXCSR are as before from quality 4 on, and else as the arithmetic left them.
 ///
 /// \param buffer    first row of the image.
 /// \param rowBytes  bytes from one row to the next.

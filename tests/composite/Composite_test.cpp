@@ -325,16 +325,16 @@ TEST_F(Composite, WideRowsTakeMemoryBeyondTheStack) {
 TEST_F(Composite, TheDestinationMayBeTopOrBack) {
     for (const PK_PixelFormat format :
          {kBGRA, kBGRX, PK_PixelFormat_UYVY_422_8u, PK_PixelFormat_ARGB_4444_15u, kFloats})
-        for (const int32_t height : {3, 70}) {
-            constexpr int32_t kWidth = 38;
-            const size_t length = RowLength(format, kWidth);
+        for (const auto& [width, height] : {std::pair{38, 3}, {38, 70}, {40, 3}, {40, 70}}) {
+            const size_t length = RowLength(format, width);
             const auto rowBytes = static_cast<int32_t>(length);
             Codes top(length * static_cast<size_t>(height)), back(top.size()), apart(top.size());
             FillOrdinarySamples(format, top.data(), top.size(), fRandom);
             FillOrdinarySamples(format, back.data(), back.size(), fRandom);
-            const auto composite = [&](const Codes& s, const Codes& b, Codes& destination) {
+            const auto composite = [&, columns = width, rows = height](const Codes& s, const Codes& b,
+                                                                       Codes& destination) {
                 return PK_Composite(s.data(), rowBytes, format, b.data(), rowBytes, format,
-                                    destination.data(), rowBytes, format, kWidth, height, 0.6f, kQuality,
+                                    destination.data(), rowBytes, format, columns, rows, 0.6f, kQuality,
                                     false);
             };
             ASSERT_EQ(composite(top, back, apart), PK_Success);
