@@ -16,7 +16,7 @@ Frame Filled(const Frame& like, const char* colour) {
 }
 
 /// A picture too small for the blur stays as it is.
-Frame Blurred(const Frame& picture, const BoxBlur& blur) {
+Frame BoxBlurred(const Frame& picture, const BoxBlur& blur) {
     constexpr int32_t kLeastSide = 4;
     Frame frame = Copied(picture);
     if (picture.Width() >= kLeastSide && picture.Height() >= kLeastSide) Blur(frame, blur);
@@ -47,12 +47,12 @@ std::vector<Tile> OperationTiles(const Frame& picture) {
     };
     add("fill", "255,128,0,255", Filled(picture, "255,128,0,255"));
     add("rotate", "90 degrees", Rotated(picture, 90));
-    add("box blur", "radius 10, borders kept", Blurred(picture, {10, 1, true, true, true}));
-    add("box blur", "radius 10, borders fading", Blurred(picture, {10, 1, true, true, false}));
-    add("box blur", "radius 6.5, three passes, rows", Blurred(picture, {6.5, 3, true, false, true}));
+    add("box blur", "radius 10, borders kept", BoxBlurred(picture, {10, 1, true, true, true}));
+    add("box blur", "radius 10, borders fading", BoxBlurred(picture, {10, 1, true, true, false}));
+    add("box blur", "radius 6.5, three passes, rows", BoxBlurred(picture, {6.5, 3, true, false, true}));
     add("warp", "over black", Warped(picture, 0, Filled(picture, "black")));
     add("warp", "feather of a sixteenth, over itself",
-        Warped(picture, feather, Blurred(picture, {20, 2, true, true, true})));
+        Warped(picture, feather, BoxBlurred(picture, {20, 2, true, true, true})));
     add("stamp", "decimal and hexadecimal",
         Stamped(Stamped(picture, {-1234567, {0.04F, 0.04F}, 0.1F, false}),
                 {0xbeef, {0.04F, 0.3F}, 0.2F, true}));
