@@ -127,15 +127,6 @@ TEST_F(GaussianBlur, WithoutSigmasCopiesToTheMiddle) {
     }
 }
 
-TEST_F(GaussianBlur, WithoutSigmasKeepsThePictureUpright) {
-    AlignedPicture source(kBGRA, 2, 3), out(PK_PixelFormat_VUYA_4444_8u, 2, 3);
-    for (int32_t y = 0; y < 3; ++y) std::memset(source.RowFromTop(y), 60 * y, 8);
-    for (int32_t y = 0; y < 3; ++y) source.RowFromTop(y)[3] = source.RowFromTop(y)[7] = 255;
-    ASSERT_EQ(Blur(source, out, {.sigmaX = 0, .sigmaY = 0}), PK_Success);
-    ASSERT_TRUE(PK_IsOriginTopLeft(out.format) != PK_IsOriginTopLeft(kBGRA));
-    for (int32_t y = 1; y < 3; ++y) EXPECT_GT(out.RowFromTop(y)[2], out.RowFromTop(y - 1)[2]);
-}
-
 TEST_F(GaussianBlur, BlursRowsInTheOrderOfMemory) {
     AlignedPicture source(kBGRA, 2, 3), out(PK_PixelFormat_VUYA_4444_8u, 2, 3);
     for (int32_t y = 0; y < 3; ++y) std::memset(source.Row(y), 60 * y, 8);

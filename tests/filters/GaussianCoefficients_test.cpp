@@ -37,7 +37,7 @@ TEST(GaussianCoefficients, ByHand) {
                            .c2 = 0x1.f44d88p-3f,
                            .c3 = -0x1.05554p-5f,
                            .d1 = -0x1.81a9fap-2f,
-                           .d2 = 0x1.49904p-4f});
+                           .d2 = 0x1.499004p-4f});
     ExpectCoefficients(10, {.c0 = 0x1.3e2136p-5f,
                             .c1 = -0x1.cf79dap-6f,
                             .c2 = 0x1.473284p-5f,

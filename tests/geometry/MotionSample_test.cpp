@@ -68,7 +68,28 @@ public:
     }
     MotionSource Source(bool smoothEdges) const { return {Origin(), fRowBytes, fRect, fFormat, smoothEdges}; }
 
+    /// Every row by itself, as samples need not lie as far apart as rows do.
+    void FillOrdinary(Random& random) const {
+        for (int32_t row = fRect.top; row < fRect.bottom; ++row)
+            FillOrdinarySamples(fFormat, Row(row), RowLength(), random);
+    }
+
+    /// No float sample is below 0: alphas show, then, or do not, in one way.
+    void MakeFloatsPositive() const {
+        if (DepthOf(fFormat) != kDepth32f) return;
+        for (int32_t row = fRect.top; row < fRect.bottom; ++row)
+            for (size_t i = 3; i < RowLength(); i += 4) Row(row)[i] &= 0x7f;
+    }
+
 private:
+    size_t RowLength() const {
+        return static_cast<size_t>((fRect.right - fRect.left) * BytesOfPixel(fFormat));
+    }
+    uint8_t* Row(int32_t row) const {
+        const int32_t lowest = fRowBytes < 0 ? fRect.bottom - 1 : fRect.top;
+        return fMemory.Bytes() + int64_t{row - lowest} * fRowBytes;
+    }
+
     PK_Rect fRect;
     PK_PixelFormat fFormat;
     int32_t fRowBytes;
@@ -180,7 +201,7 @@ TEST(MotionSample, EveryBodySamplesEveryFormatAsTheRestatement) {
             (least + Between(random, 0, 3) * Between(random, 0, 9)) * (random.Below(2) == 0 ? 1 : -1);
         const Guard guard = random.Below(2) == 0 ? Guard::kBefore : Guard::kAfter;
         const Crop crop(rect, format, rowBytes, guard);
-        FillOrdinarySamples(format, crop.Bytes(), crop.Size(), random);
+        crop.FillOrdinary(random);
         if (random.Below(3) == 0) // some samples of nothing, so that alpha vanishes here and there
             for (size_t i = 0; i + 16 <= crop.Size(); i += 16)
                 if (random.Below(2) == 0) std::memset(crop.Bytes() + i, 0, 16);
@@ -223,7 +244,8 @@ TEST(MotionSample, InsideAndEdgeAgree) {
     const PK_Rect rect = {0, 0, 40, 40};
     for (const PK_PixelFormat format : PackedFormats()) {
         const Crop crop(rect, format, 40 * BytesOfPixel(format), Guard::kAfter);
-        FillOrdinarySamples(format, crop.Bytes(), crop.Size(), random);
+        crop.FillOrdinary(random);
+        crop.MakeFloatsPositive();
         const MotionSource source = crop.Source(true);
         for (int32_t i = 0; i < 50; ++i) {
             const PK_Point at = {Between(random, 4.0f, 36.0f), Between(random, 4.0f, 36.0f)};
