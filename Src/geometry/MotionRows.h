@@ -1,0 +1,68 @@
+#pragma once
+
+// Rows of motion's destination, sampled along a walk over the source or copied where they lie pixel on pixel.
+
+#include "convert/ConversionChain.h"
+#include "convert/Image.h"
+#include "convert/WorkingRows.h"
+#include "geometry/MotionDrawer.h"
+#include "geometry/MotionSample.h"
+#include "geometry/MotionSource.h"
+
+#include <optional>
+
+namespace PK {
+
+/// The steps over the source with which the destination is walked.
+struct MotionSteps {
+    PK_Point start, column, row;
+    bool isExact; ///< unscaled, not turned, and on whole columns
+};
+
+/// From the first column and row of a box of the destination on.
+MotionSteps ChooseMotionSteps(const MotionPlacement& placement, const PK_Rect& box, bool isInterlaced);
+
+class MotionRows {
+public:
+    /// \param destination  walked from its top.
+    /// \param sampled      format of what is sampled: the source, or its blurred copy.
+    MotionRows(const MotionJob& job, const DestinationImage& destination, const PK_Rect& box,
+               const MotionSteps& steps, PK_PixelFormat sampled, bool isRotated, const ResampleTable& kernelX,
+               const ResampleTable& kernelY);
+
+    /// Whether there are ways to the destination's format.
+    bool Build();
+
+    /// Draws all rows of the box, or those of a field.
+    /// \param start  of the first row in the source's rows.
+    PK_Result Draw(const MotionSourceRows& source, PK_Point start, int32_t field) const;
+
+private:
+    struct Span;
+
+    int32_t Columns() const { return fBox.right - fBox.left; }
+    PK_Result DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end,
+                       int32_t field) const;
+    bool IsOfField(int32_t row, int32_t field) const;
+    Span SpanOfRow(const MotionSourceRows& source, PK_Point at, float* line) const;
+    Span ExactSpan(const MotionSourceRows& source, int32_t column, int32_t row) const;
+    PK_Result DrawSpan(const Span& span, int32_t row, const ChainScratch& scratch, uint8_t* units) const;
+    PK_Result DrawInUnits(const Span& span, uint8_t* row, const ChainScratch& scratch, uint8_t* units) const;
+    bool IsOfWholeUnits(const Span& span) const;
+
+    const MotionJob& fJob;
+    MotionDrawer fDrawer;
+    DestinationImage fDestination;
+    PK_Rect fBox;
+    MotionSteps fSteps;
+    bool fIsRotated;
+    ResampleTable fKernelX, fKernelY;
+    SampleMotionRow fSample;
+    std::optional<LineScale> fScale;
+    PK_PixelFormat fLineFormat;
+    ConversionChain fDirect, fLine;
+    ConversionChain fFromUnits,
+        fToUnits; // where a row of the destination cannot be parted between any two pixels
+};
+
+} // namespace PK
