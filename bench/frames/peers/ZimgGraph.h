@@ -11,24 +11,24 @@
 
 namespace FrameBench {
 
+inline zimg_graph_builder_params ParamsOfZimg() {
+    zimg_graph_builder_params params;
+    zimg_graph_builder_params_default(&params, ZIMG_API_VERSION);
+    params.cpu_type = ZIMG_CPU_AUTO_64B;
+    return params;
+}
+
 /// A conversion of zimg with its scratch memory.
 struct Graph {
     Graph(const zimg_image_format& source, const zimg_image_format& destination, bool approximate) {
-        zimg_graph_builder_params params;
-        zimg_graph_builder_params_default(&params, ZIMG_API_VERSION);
-        params.cpu_type = ZIMG_CPU_AUTO_64B;
+        zimg_graph_builder_params params = ParamsOfZimg();
         params.allow_approximate_gamma = approximate;
-        graph.reset(zimg_filter_graph_build(&source, &destination, &params));
-        if (!graph) {
-            char message[256];
-            zimg_get_last_error(message, sizeof message);
-            std::fprintf(stderr, "zimg: %s\n", message);
-            std::exit(1);
-        }
-        constexpr size_t kAlignment = 64;
-        size_t bytes = 0;
-        zimg_filter_graph_get_tmp_size(graph.get(), &bytes);
-        scratch = Allocate(bytes + kAlignment);
+        Build(source, destination, params);
+    }
+
+    Graph(const zimg_image_format& source, const zimg_image_format& destination,
+          const zimg_graph_builder_params& params) {
+        Build(source, destination, params);
     }
 
     void Process(const zimg_image_buffer_const& source, const zimg_image_buffer& destination) const {
@@ -41,6 +41,22 @@ struct Graph {
     };
     std::unique_ptr<zimg_filter_graph, FreeGraph> graph;
     Bytes scratch;
+
+private:
+    void Build(const zimg_image_format& source, const zimg_image_format& destination,
+               const zimg_graph_builder_params& params) {
+        graph.reset(zimg_filter_graph_build(&source, &destination, &params));
+        if (!graph) {
+            char message[256];
+            zimg_get_last_error(message, sizeof message);
+            std::fprintf(stderr, "zimg: %s\n", message);
+            std::exit(1);
+        }
+        constexpr size_t kAlignment = 64;
+        size_t bytes = 0;
+        zimg_filter_graph_get_tmp_size(graph.get(), &bytes);
+        scratch = Allocate(bytes + kAlignment);
+    }
 };
 
 template <class Buffer>

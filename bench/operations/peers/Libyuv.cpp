@@ -63,12 +63,22 @@ Run Interpolate(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// From half of each side.
+Run Enlarge(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        libyuv::ARGBScale(source, kBGRARowBytes / 2, kWidth / 2, kHeight / 2, destination, kBGRARowBytes,
+                          kWidth, kHeight, libyuv::kFilterBilinear);
+    };
+}
+
 const AddPeers add = {
     {"Premultiplied BGRA 8u over opaque at full opacity", "libyuv ARGBBlend", false, Blend},
     {"Premultiplied BGRA 8u over premultiplied at full opacity", "libyuv ARGBBlend", false, Blend},
     {"Dissolve of opaque BGRA 8u", "libyuv ARGBInterpolate", true, Interpolate},
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
+    {"Placing of BGRP 8u at twice the size, bilinear", "libyuv ARGBScale", false, Enlarge},
+    {"Placing of BGRP 8u at twice the size to 32f, bilinear", "libyuv ARGBScale (to 8u)", false, Enlarge},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
     {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
     {"Transpose pixels of 1 byte", "libyuv TransposePlane", true, TransposeBytes},

@@ -109,11 +109,26 @@ Run WeightedSum(const uint8_t* source, uint8_t* destination) {
     };
 }
 
-/// From half of each side.
-template <int kType, int kInterpolation>
-Run Enlarge(const uint8_t* source, uint8_t* destination) {
-    return [from = Wrap(source, kWidth / 2, kHeight / 2, kType), to = Upright(destination, kType)] {
+template <int kType, int kInterpolation, int32_t kFromWidth, int32_t kFromHeight, int32_t kToWidth,
+          int32_t kToHeight>
+Run Scale(const uint8_t* source, uint8_t* destination) {
+    return [from = Wrap(source, kFromWidth, kFromHeight, kType),
+            to = Wrap(destination, kToWidth, kToHeight, kType)] {
         cv::resize(from, to, to.size(), 0, 0, kInterpolation);
+    };
+}
+
+constexpr int32_t kHalfWidth = kWidth / 2, kHalfHeight = kHeight / 2;
+
+template <int kType, int kInterpolation>
+constexpr Prepare Enlarge = Scale<kType, kInterpolation, kHalfWidth, kHalfHeight, kWidth, kHeight>;
+
+/// About the middle, to 0.8 of the size.
+template <int kType, int kInterpolation>
+Run Turn(const uint8_t* source, uint8_t* destination) {
+    const cv::Mat matrix = cv::getRotationMatrix2D({kWidth / 2.0F, kHeight / 2.0F}, 15, 0.8);
+    return [matrix, from = Upright(source, kType), to = Upright(destination, kType)] {
+        cv::warpAffine(from, to, matrix, to.size(), kInterpolation, cv::BORDER_TRANSPARENT);
     };
 }
 
@@ -143,6 +158,15 @@ const AddPeers add = {
     {"Gaussian blur of BGRP 32f, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 10>},
     {"Gaussian blur of BGRP 32f, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 40>},
     {"Gaussian blur of BGRP 32f, sigma 100", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 100>},
+    {"Placing of BGRP 8u turned, bilinear", "OpenCV warpAffine", false, Turn<CV_8UC4, cv::INTER_LINEAR>},
+    {"Placing of BGRP 32f turned, bilinear", "OpenCV warpAffine", false, Turn<CV_32FC4, cv::INTER_LINEAR>},
+    {"Placing of BGRP 32f turned, cubic", "OpenCV warpAffine", false, Turn<CV_32FC4, cv::INTER_CUBIC>},
+    {"Placing of BGRP 8u at twice the size, bilinear", "OpenCV resize", false,
+     Enlarge<CV_8UC4, cv::INTER_LINEAR>},
+    {"Placing of BGRP 32f at twice the size, bilinear", "OpenCV resize", false,
+     Enlarge<CV_32FC4, cv::INTER_LINEAR>},
+    {"Placing of BGRP 32f at twice the size, cubic", "OpenCV resize", false,
+     Enlarge<CV_32FC4, cv::INTER_CUBIC>},
     {"Quad warp, bilinear", "OpenCV warpAffine", false, Warp<cv::INTER_LINEAR>},
     {"Quad warp, nearest", "OpenCV warpAffine", false, Warp<cv::INTER_NEAREST>},
 };

@@ -1,4 +1,4 @@
-// zimg, on planes without alpha: a quarter less memory than pixels with it. "Approximate" allows its gamma by table.
+// zimg, its colours on planes without alpha: a quarter less memory than pixels with it. "Approximate" allows its gamma by table.
 
 #include "frames/peers/ZimgGraph.h"
 #include "operations/Operation.h"
@@ -39,6 +39,42 @@ Run Convert(const uint8_t*, uint8_t*) {
                        FrameBench::BufferOf<zimg_image_buffer>(*to, kRowBytes));
     };
 }
+
+/// Four planes one after the other, by the cubic that motion has.
+template <int32_t kFromWidth, int32_t kFromHeight, int32_t kToWidth, int32_t kToHeight>
+Run Scale(const uint8_t*, uint8_t*) {
+    constexpr int32_t kFromRowBytes = 4 * kFromWidth, kToRowBytes = 4 * kToWidth;
+    const auto from = std::make_shared<FrameBench::Planes>(4, kFromRowBytes, kFromHeight);
+    const auto to = std::make_shared<FrameBench::Planes>(4, kToRowBytes, kToHeight);
+    from->Fill<float>(kFromWidth, 0, 1);
+    zimg_graph_builder_params params = FrameBench::ParamsOfZimg();
+    params.resample_filter = ZIMG_RESIZE_BICUBIC;
+    params.filter_param_a = 0;
+    params.filter_param_b = 0.75;
+    const auto graph = std::make_shared<FrameBench::Graph>(
+        FrameBench::OfSize(kFromWidth, kFromHeight, ZIMG_PIXEL_FLOAT),
+        FrameBench::OfSize(kToWidth, kToHeight, ZIMG_PIXEL_FLOAT), params);
+    return [=] {
+        for (int plane = 0; plane < 4; ++plane) {
+            auto source = FrameBench::EmptyBuffer<zimg_image_buffer_const>();
+            auto destination = FrameBench::EmptyBuffer<zimg_image_buffer>();
+            source.plane[0].data = from->Plane(plane);
+            source.plane[0].stride = kFromRowBytes;
+            destination.plane[0].data = to->Plane(plane);
+            destination.plane[0].stride = kToRowBytes;
+            graph->Process(source, destination);
+        }
+    };
+}
+
+constexpr int32_t kHalfWidth = kWidth / 2, kHalfHeight = kHeight / 2;
+
+const AddPeers addScaling = {
+    {"Placing of BGRP 32f at twice the size, cubic", "zimg bicubic (planes)", false,
+     Scale<kHalfWidth, kHalfHeight, kWidth, kHeight>},
+    {"Placing of BGRP 32f at half the size, cubic", "zimg bicubic (planes)", false,
+     Scale<kWidth, kHeight, kHalfWidth, kHalfHeight>},
+};
 
 template <const Colour& kFrom, const Colour& kTo>
 void AddBoth(const char* operation) {
