@@ -9,7 +9,7 @@ namespace {
 constexpr int32_t kPhases = 128, kMostTaps = 20, kPixelFloats = 4, kPixelBytes = 16;
 // Taps that are added up side by side, in an order that no vector's width changes.
 constexpr int32_t kTogether = 4;
-constexpr int32_t kVectors = kTogether * kPixelFloats / kLanes;
+constexpr int32_t kVectors = kTogether / kVectorPixels;
 
 /// The weights of an axis as floats, which show all of them.
 class Weights {
@@ -17,38 +17,54 @@ public:
     explicit Weights(const ResampleTable& table) : fTaps(table.width < 1 ? 0 : table.width) {
         for (int32_t i = 0; i < kPhases * fTaps; i += kLanes)
             Store(fWeights + i, ToFloat(LoadSignedWords(table.weights + i)));
+        std::memset(fWeights + kPhases * fTaps, 0, sizeof(float) * kTogether);
     }
 
     int32_t Taps() const { return fTaps; }
+    /// Behind the weights of a phase, as many as are loaded together may be read.
     const float* Phase(int32_t phase) const { return fWeights + phase * fTaps; }
 
 private:
     int32_t fTaps;
-    alignas(64) float fWeights[kPhases * kMostTaps];
+    alignas(64) float fWeights[kPhases * kMostTaps + kTogether];
 };
 
-/// The first pixel that a place takes along an axis, and its row of weights.
+/// The first pixels that places take along an axis, and their rows of weights.
 struct Reach {
-    Reach(float place, int32_t low, int32_t high, int32_t taps) {
+    Reach(const float* places, int32_t low, int32_t high, int32_t taps) {
         // Beyond these bounds no tap meets the source; not-a-number becomes the upper one.
-        const float least = static_cast<float>(low - kMostTaps), most = static_cast<float>(high + kMostTaps);
-        float x = place - 0.5f;
-        x = x < most ? x : most;
-        x = x > least ? x : least;
-        const auto whole = static_cast<int32_t>(x);
-        const int32_t pixel = whole - (static_cast<float>(whole) > x ? 1 : 0);
-        const auto rounded = static_cast<int32_t>((x - static_cast<float>(pixel)) * kPhases);
-        phase = rounded < kPhases ? rounded : kPhases - 1; // just below a pixel the difference rounds to 1
-        first = pixel + 1 - taps / 2;
+        const F32 least = Floats(static_cast<float>(low - kMostTaps));
+        const F32 most = Floats(static_cast<float>(high + kMostTaps));
+        const F32 x = Max(Min(LoadFloats(places) - Floats(0.5f), most), least);
+        const I32 pixel = Floor(x);
+        // Just below a pixel the difference rounds to 1.
+        phase = Min(Truncate((x - ToFloat(pixel)) * Floats(kPhases)), Ints(kPhases - 1));
+        first = pixel + Ints(1 - taps / 2);
     }
 
-    int32_t first, phase;
+    I32 first, phase;
+};
+
+/// Those of a block of places.
+struct Reaches {
+    Reaches(const float* places, int32_t count, int32_t low, int32_t high, int32_t taps) {
+        for (int32_t i = 0; i < count; i += kLanes) {
+            const Reach reach(places + i, low, high, taps);
+            Store(first + i, reach.first);
+            Store(phase + i, reach.phase);
+        }
+        FillGroup(first, count);
+        FillGroup(phase, count);
+    }
+
+    alignas(64) int32_t first[kBlock], phase[kBlock];
 };
 
 inline F32 Zero() {
     return Floats(0);
 }
 
+/// Pixels by weights, added up by the number of their tap modulo four.
 struct TapSums {
     F32 sums[kVectors];
 
@@ -56,38 +72,38 @@ struct TapSums {
         for (F32& sum : sums) sum = Zero();
     }
 
-    void AddFour(const float* pixels, const float* weights) {
-        for (int32_t i = 0; i < kVectors; ++i)
-            sums[i] = sums[i] +
-                      LoadFloats(pixels + i * kLanes) * LoadOnePerBlock(weights + i * kLanes / kPixelFloats);
+    /// Taps come in pairs.
+    void Add(const float* pixels, const float* weights, int32_t taps) {
+        int32_t tap = 0;
+        for (; tap + kTogether <= taps; tap += kTogether)
+            for (int32_t i = 0; i < kVectors; ++i)
+                AddVector(i, LoadFloats(pixels + tap * kPixelFloats + i * kLanes), weights + tap);
+        if (tap == taps) return;
+        constexpr int32_t kPair = 2, kPairVectors = kVectors == 1 ? 1 : kVectors / 2;
+        for (int32_t i = 0; i < kPairVectors; ++i)
+            AddVector(i, LoadFirstBlocks<kPair>(pixels + tap * kPixelFloats + i * kLanes), weights + tap);
     }
 
+    /// The sums of a row by its weight.
+    void Add(const TapSums& row, F32 weight) {
+        for (int32_t i = 0; i < kVectors; ++i) sums[i] = sums[i] + row.sums[i] * weight;
+    }
+
+    /// A vector whose blocks add up to the total.
     F32 Total() const {
         if constexpr (kVectors == 4)
             return (sums[0] + sums[2]) + (sums[1] + sums[3]);
         else if constexpr (kVectors == 2)
-            return SumOfBlocks(sums[0] + sums[1]);
+            return sums[0] + sums[1];
         else
-            return SumOfBlocks(sums[0]);
+            return sums[0];
+    }
+
+private:
+    void AddVector(int32_t i, F32 pixels, const float* weights) {
+        sums[i] = sums[i] + pixels * LoadOnePerBlock(weights + i * kVectorPixels);
     }
 };
-
-/// The sum of pixels side by side by their weights, in the first block.
-inline F32 SumOfTaps(const float* pixels, const float* weights, int32_t taps) {
-    TapSums sums;
-    int32_t tap = 0;
-    for (; tap + kTogether <= taps; tap += kTogether)
-        sums.AddFour(pixels + tap * kPixelFloats, weights + tap);
-    if (tap < taps) {
-        alignas(64) float lastPixels[kTogether * kPixelFloats] = {};
-        float lastWeights[kTogether] = {};
-        const auto left = static_cast<size_t>(taps - tap);
-        std::memcpy(lastPixels, pixels + tap * kPixelFloats, left * kPixelBytes);
-        std::memcpy(lastWeights, weights + tap, left * sizeof(float));
-        sums.AddFour(lastPixels, lastWeights);
-    }
-    return sums.Total();
-}
 
 template <AlphaPlace kAlpha>
 struct HighQuality {
@@ -100,30 +116,31 @@ struct HighQuality {
 
     /// What lies outside the source is left out, at the edges and inside, where a wide table reaches beyond the margin.
     void Sample(const Places& places, int32_t count, float* out) const {
-        int32_t first[kBlock], phases[kBlock];
-        int32_t least = INT32_MAX, most = INT32_MIN;
-        for (int32_t i = 0; i < count; ++i) {
-            const Reach reach(places.x[i], row.left, row.right, weightsX.Taps());
-            first[i] = reach.first;
-            phases[i] = reach.phase;
-            least = reach.first < least ? reach.first : least;
-            most = reach.first > most ? reach.first : most;
-        }
-        const int64_t width = int64_t{most} - least + weightsX.Taps();
-        // Adding up rows pays as long as the columns between the pixels' own are not too many.
-        const bool sharesRows = !row.rotated && width <= int64_t{count} * weightsX.Taps();
-        if (!sharesRows) {
-            for (int32_t i = 0; i < count; ++i)
-                Put(out + 4 * i,
-                    SumOfArea(first[i], phases[i], Reach(places.y[i], row.top, row.bottom, weightsY.Taps())));
-            return;
-        }
-        alignas(64) float sums[kBlock * kMostTaps * kPixelFloats];
-        AddRows(Reach(places.y[0], row.top, row.bottom, weightsY.Taps()), least, static_cast<int32_t>(width),
-                sums);
-        for (int32_t i = 0; i < count; ++i)
-            Put(out + 4 * i, SumOfTaps(sums + int64_t{first[i] - least} * kPixelFloats,
-                                       weightsX.Phase(phases[i]), weightsX.Taps()));
+        const Reaches x(places.x, count, row.left, row.right, weightsX.Taps());
+        if (!row.rotated && SampleLevel(places, x, count, out)) return;
+        const Reaches y(places.y, count, row.top, row.bottom, weightsY.Taps());
+        Put(count, out,
+            [&](int32_t i) { return SumOfArea(x.first[i], x.phase[i], y.first[i], y.phase[i]).Total(); });
+    }
+
+    /// Where all places lie in the same rows these are added up first, once for many columns. Returns false where that
+    /// does not pay, as there are too many columns of the source between two of the destination.
+    bool SampleLevel(const Places& places, const Reaches& x, int32_t count, float* out) const {
+        constexpr int64_t kMostColumns =
+            5 * kBlock; // at a quarter of the size, the least that has a table of its own
+        const Range range = RangeOf(x.first, count);
+        const int64_t width = int64_t{range.most} - range.least + weightsX.Taps();
+        if (width > kMostColumns) return false;
+        alignas(64) float sums[kMostColumns * kPixelFloats];
+        const Reaches y(places.y, 1, row.top, row.bottom, weightsY.Taps());
+        AddRows(y.first[0], y.phase[0], range.least, static_cast<int32_t>(width), sums);
+        Put(count, out, [&](int32_t i) {
+            TapSums taps;
+            taps.Add(sums + int64_t{x.first[i] - range.least} * kPixelFloats, weightsX.Phase(x.phase[i]),
+                     weightsX.Taps());
+            return taps.Total();
+        });
+        return true;
     }
 
     const float* PixelAt(int32_t column, int32_t line) const {
@@ -141,70 +158,80 @@ struct HighQuality {
     };
 
     /// Rows by their weights, for `width` columns from `first` on; 0 outside the source.
-    void AddRows(const Reach& rows, int32_t first, int32_t width, float* sums) const {
+    void AddRows(int32_t firstLine, int32_t phase, int32_t first, int32_t width, float* sums) const {
         const Overlap inside(row, first, width);
         const float* sources[kMostTaps];
         F32 weights[kMostTaps];
         int32_t count = 0;
         for (int32_t tap = 0; tap < weightsY.Taps() && inside.begin < inside.end; ++tap) {
-            const int32_t line = rows.first + tap;
+            const int32_t line = firstLine + tap;
             if (line < row.top || line >= row.bottom) continue;
             sources[count] = PixelAt(first + inside.begin, line);
-            weights[count++] = Floats(weightsY.Phase(rows.phase)[tap]);
+            weights[count++] = Floats(weightsY.Phase(phase)[tap]);
         }
         const int32_t begin = inside.begin * kPixelFloats, end = inside.end * kPixelFloats;
         std::memset(sums, 0, sizeof(float) * static_cast<size_t>(begin));
-        int32_t at = begin;
-        for (; at + kLanes <= end; at += kLanes) {
-            F32 sum = Zero();
-            for (int32_t i = 0; i < count; ++i)
-                sum = sum + LoadFloats(sources[i] + (at - begin)) * weights[i];
-            Store(sums + at, sum);
-        }
-        if (at < end) { // less than a vector is left of each row
-            const auto bytes = sizeof(float) * static_cast<size_t>(end - at);
-            alignas(64) float last[kLanes] = {};
-            F32 sum = Zero();
-            for (int32_t i = 0; i < count; ++i) {
-                std::memcpy(last, sources[i] + (at - begin), bytes);
-                sum = sum + LoadFloats(last) * weights[i];
-            }
-            Store(last, sum);
-            std::memcpy(sums + at, last, bytes);
-        }
+        if (end - begin >= kLanes)
+            ByVectors(end - begin, [&](int32_t at) {
+                F32 sum = Zero();
+                for (int32_t i = 0; i < count; ++i) sum = sum + LoadFloats(sources[i] + at) * weights[i];
+                Store(sums + begin + at, sum);
+            });
+        else
+            AddShortRows(sources, weights, count, sums + begin, end - begin);
         const int32_t behind = inside.end < inside.begin ? inside.begin : inside.end;
         std::memset(sums + behind * kPixelFloats, 0, static_cast<size_t>(width - behind) * kPixelBytes);
     }
 
+    /// Less than a vector of each, if anything.
+    static void AddShortRows(const float* const* sources, const F32* weights, int32_t count, float* sums,
+                             int32_t floats) {
+        const size_t bytes = floats > 0 ? sizeof(float) * static_cast<size_t>(floats) : 0;
+        alignas(64) float last[kLanes] = {};
+        F32 sum = Zero();
+        for (int32_t i = 0; i < count; ++i) {
+            std::memcpy(last, sources[i], bytes);
+            sum = sum + LoadFloats(last) * weights[i];
+        }
+        Store(last, sum);
+        std::memcpy(sums, last, bytes);
+    }
+
     /// An area of its own for one pixel.
-    F32 SumOfArea(int32_t first, int32_t phase, const Reach& rows) const {
+    TapSums SumOfArea(int32_t first, int32_t phase, int32_t firstLine, int32_t phaseOfLines) const {
         const int32_t taps = weightsX.Taps();
         const Overlap inside(row, first, taps);
         const float* const weights = weightsX.Phase(phase);
-        F32 sum = Zero();
+        TapSums sum;
         for (int32_t tap = 0; tap < weightsY.Taps() && inside.begin < inside.end; ++tap) {
-            const int32_t line = rows.first + tap;
+            const int32_t line = firstLine + tap;
             if (line < row.top || line >= row.bottom) continue;
-            F32 ofRow;
+            TapSums ofRow;
             if (inside.end - inside.begin == taps) {
-                ofRow = SumOfTaps(PixelAt(first, line), weights, taps);
+                ofRow.Add(PixelAt(first, line), weights, taps);
             } else {
                 alignas(64) float pixels[kMostTaps * kPixelFloats] = {};
                 std::memcpy(pixels + inside.begin * kPixelFloats, PixelAt(first + inside.begin, line),
                             static_cast<size_t>(inside.end - inside.begin) * kPixelBytes);
-                ofRow = SumOfTaps(pixels, weights, taps);
+                ofRow.Add(pixels, weights, taps);
             }
-            sum = sum + ofRow * Floats(weightsY.Phase(rows.phase)[tap]);
+            sum.Add(ofRow, Floats(weightsY.Phase(phaseOfLines)[tap]));
         }
         return sum;
     }
 
-    /// Alpha is limited to 0 to 1, not-a-number becoming 0; colours may be negative.
-    static void Put(float* out, F32 sum) {
-        F32 pixel = sum * Floats(0x1p-28f); // two weights of 1
-        if constexpr (kAlpha == AlphaPlace::first) pixel = ShufflePixel<3, 2, 1, 0>(pixel);
-        const F32 limited = Min(Max(pixel, Zero()), Floats(1));
-        StoreFirstBlock(out, BlendBlocks<8>(limited, pixel));
+    /// total(column) is a vector whose blocks add up to its pixel. Alpha is limited to 0 to 1, not-a-number becoming 0;
+    /// colours may be negative.
+    template <class Total>
+    static void Put(int32_t count, float* out, Total total) {
+        for (int32_t n = 0; n < count; n += kVectorPixels) {
+            F32 totals[kVectorPixels];
+            for (int32_t i = 0; i < kVectorPixels; ++i) totals[i] = total(n + i);
+            F32 pixels = SumsOfBlocks(totals) * Floats(0x1p-28f); // two weights of 1
+            if constexpr (kAlpha == AlphaPlace::first) pixels = ShufflePixel<3, 2, 1, 0>(pixels);
+            const F32 limited = Min(Max(pixels, Zero()), Floats(1));
+            StorePixels(out + kPixelFloats * n, BlendBlocks<8>(limited, pixels), count - n);
+        }
     }
 
     const MotionRow row;

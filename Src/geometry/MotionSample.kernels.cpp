@@ -25,8 +25,8 @@ inline Channels And(I32 mask, const Channels& c) {
 // Two pixels side by side for each lane, the left ones at the offsets.
 
 template <AlphaPlace kAlpha>
-inline void LoadNeighbours(Pixels8<kAlpha>, const uint8_t* base, const int64_t* offsets, Channels& left,
-                           Channels& right) {
+[[gnu::always_inline]] inline void LoadNeighbours(Pixels8<kAlpha>, const uint8_t* base,
+                                                  const int64_t* offsets, Channels& left, Channels& right) {
     I32 lefts, rights;
     LoadLanePairsAt(base, offsets, lefts, rights);
     left = ToFloat(InOrder<kAlpha>(ByteChannels(lefts)));
@@ -49,10 +49,29 @@ inline Channels LoadPixelsAt(Pixels32f<kAlpha>, const uint8_t* base, const int64
 }
 
 template <class Layout>
-inline void LoadNeighbours(Layout layout, const uint8_t* base, const int64_t* offsets, Channels& left,
-                           Channels& right) {
+[[gnu::always_inline]] inline void LoadNeighbours(Layout layout, const uint8_t* base, const int64_t* offsets,
+                                                  Channels& left, Channels& right) {
     left = LoadPixelsAt(layout, base, offsets);
     right = LoadPixelsAt(layout, base + Layout::kPixelBytes, offsets);
+}
+
+// Interleaved pixels, alpha last.
+
+template <AlphaPlace kAlpha>
+inline F32 InOrder(F32 pixels) {
+    return kAlpha == AlphaPlace::last ? pixels : ShufflePixel<3, 2, 1, 0>(pixels);
+}
+template <AlphaPlace kAlpha>
+inline F32 LoadInterleaved(Pixels8<kAlpha>, const uint8_t* pixels) {
+    return InOrder<kAlpha>(ToFloat(LoadBytes(pixels)));
+}
+template <AlphaPlace kAlpha>
+inline F32 LoadInterleaved(Pixels15<kAlpha>, const uint8_t* pixels) {
+    return InOrder<kAlpha>(ToFloat(LoadWords(pixels)));
+}
+template <AlphaPlace kAlpha>
+inline F32 LoadInterleaved(Pixels32f<kAlpha>, const uint8_t* pixels) {
+    return InOrder<kAlpha>(LoadFloats(pixels));
 }
 
 // Cells: the pixels between whose centres a place lies.
@@ -64,11 +83,6 @@ inline I32 Limit(I32 x, int32_t low, int32_t high) {
 /// Not-a-number becomes the upper limit.
 inline F32 Limit(F32 x, int32_t low, int32_t high) {
     return Max(Min(x, Floats(static_cast<float>(high))), Floats(static_cast<float>(low)));
-}
-
-inline I32 Floor(F32 x) {
-    const I32 whole = Truncate(x);
-    return whole + Less(x, ToFloat(whole));
 }
 
 /// Of pixels that are all in the source.
@@ -126,7 +140,7 @@ struct Bilinear {
         return c;
     }
 
-    static Weighed Weigh(const Four& pixels, F32 fx, F32 fy) {
+    [[gnu::always_inline]] static Weighed Weigh(const Four& pixels, F32 fx, F32 fy) {
         const F32 gx = Floats(1) - fx, gy = Floats(1) - fy;
         const F32 weights[4] = {gx * gy, fx * gy, gx * fy, fx * fy};
         Weighed result;
@@ -187,8 +201,149 @@ struct Bilinear {
         for (int32_t n = 0; n < count; n += kLanes) StorePixels(out + 4 * n, Zero::Value(), count - n);
     }
 
-    /// Places first, all of them, so that no load waits for what has just been stored.
     void Inside(const Places& places, int32_t count, float* out) const {
+        if (row.rotated || !InsideLevel(places, count, out)) InsideByCells(places, count, out);
+    }
+
+    /// The place in the columns of the source, for all columns of a block.
+    struct Columns {
+        Columns(const Places& places, int32_t count, const MotionRow& row) {
+            for (int32_t n = 0; n < count; n += kLanes) {
+                const InnerCell cell(places.x + n, row.left, row.right);
+                Store(first + n, cell.first);
+                Store(fraction + n, cell.fraction);
+            }
+            FillGroup(first, count);
+        }
+
+        alignas(64) int32_t first[kBlock];
+        alignas(64) float fraction[kBlock];
+    };
+
+    /// Where all places lie between the same two rows these are mixed first, once for many columns. Returns false where
+    /// that does not pay, as there are too many columns of the source between two of the destination.
+    bool InsideLevel(const Places& places, int32_t count, float* out) const {
+        constexpr int32_t kMostColumns = 2 * kBlock + 2;
+        Columns columns(places, count, row);
+        const Range range = RangeOf(columns.first, count);
+        // A vector's worth at least, which the source has: its margins are two pixels each.
+        const int32_t least =
+            range.least < row.right - kVectorPixels ? range.least : row.right - kVectorPixels;
+        const int32_t width = range.most + 2 - least;
+        if (width > kMostColumns) return false;
+        constexpr int32_t kFloats = 4 * (kMostColumns + kVectorPixels);
+        alignas(64) float mixed[kFloats], shares[kFloats];
+        const LevelRows rows(*this, places, least, width < kVectorPixels ? kVectorPixels : width);
+        const bool isPlain = rows.Mix(mixed);
+        if (!isPlain) rows.TakeShares(shares);
+        for (int32_t n = 0; n < count; n += kLanes)
+            Store(columns.first + n, LoadInts(columns.first + n) - Ints(least));
+        const bool isNear = AreNear(columns.first, count);
+        for (int32_t n = 0; n < count; n += kVectorPixels) {
+            const int32_t* const first = columns.first + n;
+            const F32 fx = LoadOnePerBlock(columns.fraction + n);
+            F32 left, right;
+            LoadSideBySide(mixed, first, isNear, left, right);
+            F32 sum = left + (right - left) * fx;
+            if (!isPlain) {
+                LoadSideBySide(shares, first, isNear, left, right);
+                sum = FromBits(IsSeen(Max(left * (Floats(1) - fx), right * fx)) & Bits(sum));
+            }
+            StorePixels(out + 4 * n, Zero::kIsZero ? sum : sum + InterleavedZero(), count - n);
+        }
+        return true;
+    }
+
+    static I32 IsSeen(F32 shares) { return Less(Floats(0x1p-17f), BroadcastAlpha<AlphaPlace::last>(shares)); }
+
+    /// Whether the pixels of each vector begin no further from its first than it is wide.
+    static bool AreNear(const int32_t* first, int32_t count) {
+        I32 far = Ints(0);
+        for (int32_t n = 0; n < count; n += kVectorPixels)
+            far = far | (LoadOneIntPerBlock(first + n) - Ints(first[n]));
+        return !AnyNegative(Ints(kVectorPixels - 1) - far) && !AnyNegative(far);
+    }
+
+    /// The pixels of some columns of a row, and those right of them.
+    [[gnu::always_inline]] static void LoadSideBySide(const float* pixels, const int32_t* first, bool isNear,
+                                                      F32& left, F32& right) {
+        if (isNear) {
+            const float* const near = pixels + 4 * int64_t{*first};
+            const I32 lanes = ShiftLeft<2>(LoadOneIntPerBlock(first) - Ints(*first)) + PixelInts(0, 1, 2, 3);
+            left = LoadBlocksNear(near, lanes);
+            right = LoadBlocksNear(near + 4, lanes);
+        } else {
+            left = LoadBlocksOf(pixels, first);
+            right = LoadBlocksOf(pixels + 4, first);
+        }
+    }
+
+    /// Two rows of the source, one after the other, from a column on, and a row between them.
+    class LevelRows {
+    public:
+        LevelRows(const Bilinear& sampler, const Places& places, int32_t first, int32_t width)
+            : fWidth(width), fRowBytes(sampler.row.rowBytes) {
+            const MotionRow& row = sampler.row;
+            const InnerCell cell(places.y, row.top, row.bottom);
+            int32_t rows[kLanes];
+            float fractions[kLanes];
+            Store(rows, cell.first);
+            Store(fractions, cell.fraction);
+            fUpper = row.pixels + rows[0] * row.rowBytes + int64_t{first} * Layout::kPixelBytes;
+            fFraction = fractions[0];
+        }
+
+        /// Returns whether all pixels have so much alpha that, of any two, the share of one of the four in the source is
+        /// enough to be seen.
+        bool Mix(float* mixed) const {
+            const F32 fy = Floats(fFraction);
+            I32 isMuch = Ints(-1);
+            Go([&](int32_t at, F32 above, F32 below) {
+                const F32 sum = above + (below - above) * fy;
+                Store(mixed + at, sum);
+                if constexpr (kAlpha != MotionAlpha::none) isMuch = isMuch & Less(Floats(0x1p-13f), sum);
+            });
+            return !AnyNegative(Not(isMuch) & AlphaLanes<AlphaPlace::last>());
+        }
+
+        /// The greater of two alphas by the weight of its row.
+        void TakeShares(float* shares) const {
+            const F32 fy = Floats(fFraction), gy = Floats(1 - fFraction);
+            Go([&](int32_t at, F32 above, F32 below) { Store(shares + at, Max(above * gy, below * fy)); });
+        }
+
+    private:
+        template <class Use>
+        void Go(Use use) const {
+            ByVectors(4 * fWidth, [&](int32_t at) {
+                const uint8_t* const pixels = fUpper + int64_t{at} * Layout::kPixelBytes / 4;
+                use(at, LoadLevel(pixels), LoadLevel(pixels + fRowBytes));
+            });
+        }
+
+        const uint8_t* fUpper;
+        int32_t fWidth;
+        int64_t fRowBytes;
+        float fFraction;
+    };
+
+    /// Interleaved pixels as they are weighed: differences from the zeros, multiplied by alpha.
+    static F32 LoadLevel(const uint8_t* pixels) {
+        F32 c = LoadInterleaved(Layout(), pixels);
+        if constexpr (!Zero::kIsZero) c = c - InterleavedZero();
+        if constexpr (kAlpha == MotionAlpha::none) return BlendBlocks<8>(Floats(Layout::kFull), c);
+        if constexpr (kAlpha == MotionAlpha::straight) {
+            const F32 alpha = BroadcastAlpha<AlphaPlace::last>(c);
+            return BlendBlocks<8>(alpha,
+                                  c * (Layout::kFull == 1 ? alpha : alpha * Floats(1 / Layout::kFull)));
+        }
+        return c;
+    }
+
+    static F32 InterleavedZero() { return Zero::kIsZero ? Floats(0) : PixelFloats(128, 128, 16, 0); }
+
+    /// Places first, all of them, so that no load waits for what has just been stored.
+    void InsideByCells(const Places& places, int32_t count, float* out) const {
         alignas(64) float fx[kBlock], fy[kBlock];
         alignas(64) int64_t offsets[kBlock];
         FindInside(places, count, fx, fy, offsets);

@@ -7,7 +7,8 @@
 
 namespace PK::PK_TARGET {
 
-inline constexpr int32_t kBlock = 64; // whole groups of any target
+inline constexpr int32_t kBlock = 128;               // columns; whole groups of any target
+inline constexpr int32_t kVectorPixels = kLanes / 4; // of interleaved floats
 
 /// Of as many columns as are asked for, and up to the end of their last group some that do no harm.
 struct Places {
@@ -77,10 +78,11 @@ MotionSpan SampleRow(const MotionRow& row, float* line) {
     };
     sampleEdge(parts.inner - parts.first);
     ByFours fourX(x), fourY(y);
+    fourY.Take(places.y, kBlock);
     InBlocks(parts.right - parts.inner, [&](int32_t count) {
         fourX.Take(places.x, count);
-        fourY.Take(places.y, count);
         sampler.Inside(places, count, out);
+        if (row.rotated) fourY.Take(places.y, kBlock);
         out += 4 * count;
     });
     x.Skip(parts.right - parts.inner);
@@ -90,11 +92,69 @@ MotionSpan SampleRow(const MotionRow& row, float* line) {
 }
 
 /// As many pixels of a group as there are.
-inline void StorePixels(float* out, const Channels& pixels, int32_t count) {
+[[gnu::always_inline]] inline void StorePixels(float* out, const Channels& pixels, int32_t count) {
     if (count >= kLanes) return StoreFloatChannels(out, pixels);
     alignas(64) float scratch[4 * kLanes];
     StoreFloatChannels(scratch, pixels);
     std::memcpy(out, scratch, sizeof(float) * 4 * static_cast<size_t>(count));
+}
+
+/// The same of a vector of interleaved pixels.
+[[gnu::always_inline]] inline void StorePixels(float* out, F32 pixels, int32_t count) {
+    if (count >= kVectorPixels) return Store(out, pixels);
+    alignas(64) float scratch[kLanes];
+    Store(scratch, pixels);
+    std::memcpy(out, scratch, sizeof(float) * 4 * static_cast<size_t>(count));
+}
+
+inline I32 Floor(F32 x) {
+    const I32 whole = Truncate(x);
+    return whole + Less(x, ToFloat(whole));
+}
+
+/// The last of so many numbers once more up to the end of the group.
+template <class Number>
+inline void FillGroup(Number* numbers, int32_t count) {
+    for (int32_t i = count; i % kLanes != 0; ++i) numbers[i] = numbers[count - 1];
+}
+
+/// From each group of four lanes the one that wins against the other three.
+template <class Choose>
+inline I32 BestOfGroups(I32 x, Choose choose) {
+    const I32 pairs = choose(x, ShufflePixel<1, 0, 3, 2>(x));
+    return choose(pairs, ShufflePixel<2, 3, 0, 1>(pairs));
+}
+
+struct Range {
+    int32_t least, most;
+};
+
+/// Of so many numbers, one at least, in whole groups.
+inline Range RangeOf(const int32_t* numbers, int32_t count) {
+    I32 least = LoadInts(numbers), most = least;
+    for (int32_t i = kLanes; i < count; i += kLanes) {
+        const I32 group = LoadInts(numbers + i);
+        least = Min(least, group);
+        most = Max(most, group);
+    }
+    int32_t leasts[kLanes], mosts[kLanes];
+    Store(leasts, BestOfGroups(least, [](I32 a, I32 b) { return Min(a, b); }));
+    Store(mosts, BestOfGroups(most, [](I32 a, I32 b) { return Max(a, b); }));
+    Range range = {leasts[0], mosts[0]};
+    for (int32_t i = 4; i < kLanes; i += 4) {
+        if (leasts[i] < range.least) range.least = leasts[i];
+        if (mosts[i] > range.most) range.most = mosts[i];
+    }
+    return range;
+}
+
+/// Goes over the floats of interleaved pixels by vectors: use(first float). The last vector may have some of the one
+/// before it, so that none goes beyond the end. There is a vector's worth at least.
+template <class Use>
+inline void ByVectors(int32_t floats, Use use) {
+    int32_t at = 0;
+    for (; at + kLanes <= floats; at += kLanes) use(at);
+    if (at < floats) use(floats - kLanes);
 }
 
 } // namespace PK::PK_TARGET

@@ -395,12 +395,30 @@ inline F32 LoadOnePerBlock(const float* source) {
     return {_mm256_set_m128(_mm_set1_ps(source[1]), _mm_set1_ps(source[0]))};
 }
 
-/// The sum of all blocks in the first: the halves are added, and then their halves.
-inline F32 SumOfBlocks(F32 a) {
-    return {_mm256_castps128_ps256(_mm_add_ps(_mm256_castps256_ps128(a.v), _mm256_extractf128_ps(a.v, 1)))};
+/// Blocks of floats side by side by their numbers.
+[[gnu::always_inline]] inline F32 LoadBlocksOf(const float* blocks, const int32_t* index) {
+    return LoadFloatBlocks(blocks + int64_t{4} * index[0], int64_t{16} * (int64_t{index[1]} - index[0]));
 }
-inline void StoreFirstBlock(void* destination, F32 a) {
-    _mm_storeu_ps(static_cast<float*>(destination), _mm256_castps256_ps128(a.v));
+
+/// The same of no more blocks than a vector has, with the lanes of the numbers: lane i of a block is 4 x number + i.
+inline F32 LoadBlocksNear(const float* blocks, I32 lanes) {
+    return {_mm256_permutevar8x32_ps(_mm256_loadu_ps(blocks), lanes.v)};
+}
+inline I32 LoadOneIntPerBlock(const int32_t* source) {
+    return Bits(LoadOnePerBlock(reinterpret_cast<const float*>(source)));
+}
+
+/// The first kBlocks, and 0 behind them; a vector of no more is loaded whole.
+template <int kBlocks>
+inline F32 LoadFirstBlocks(const float* source) {
+    static_assert(kBlocks >= 2);
+    return LoadFloats(source);
+}
+
+/// For each block a vector, whose blocks it sums: the halves are added, and then their halves.
+inline F32 SumsOfBlocks(const F32 (&vectors)[2]) {
+    const __m256 a = vectors[0].v, b = vectors[1].v;
+    return {_mm256_add_ps(_mm256_permute2f128_ps(a, b, 0x20), _mm256_permute2f128_ps(a, b, 0x31))};
 }
 
 } // namespace PK::PK_TARGET

@@ -641,14 +641,36 @@ inline F32 LoadOnePerBlock(const float* source) {
     return {_mm512_permutexvar_ps(order, _mm512_castps128_ps512(_mm_loadu_ps(source)))};
 }
 
-/// The sum of all blocks in the first: the halves are added, and then their halves.
-inline F32 SumOfBlocks(F32 a) {
-    const __m256 halves = _mm256_add_ps(LowerHalf(a), UpperHalf(a));
-    return {
-        _mm512_castps128_ps512(_mm_add_ps(_mm256_castps256_ps128(halves), _mm256_extractf128_ps(halves, 1)))};
+/// Blocks of floats side by side by their numbers.
+[[gnu::always_inline]] inline F32 LoadBlocksOf(const float* blocks, const int32_t* index) {
+    const auto block = [blocks, index](int i) { return _mm_loadu_ps(blocks + int64_t{4} * index[i]); };
+    return JoinHalves(_mm256_set_m128(block(1), block(0)), _mm256_set_m128(block(3), block(2)));
 }
-inline void StoreFirstBlock(void* destination, F32 a) {
-    _mm_storeu_ps(static_cast<float*>(destination), _mm512_castps512_ps128(a.v));
+
+/// The same of no more blocks than a vector has, with the lanes of the numbers: lane i of a block is 4 x number + i.
+inline F32 LoadBlocksNear(const float* blocks, I32 lanes) {
+    return {_mm512_permutexvar_ps(lanes.v, _mm512_loadu_ps(blocks))};
+}
+inline I32 LoadOneIntPerBlock(const int32_t* source) {
+    return Bits(LoadOnePerBlock(reinterpret_cast<const float*>(source)));
+}
+
+/// The first kBlocks, and 0 behind them; a vector of no more is loaded whole.
+template <int kBlocks>
+inline F32 LoadFirstBlocks(const float* source) {
+    return {_mm512_maskz_loadu_ps(static_cast<__mmask16>((1U << (4 * kBlocks)) - 1), source)};
+}
+
+/// For each block a vector, whose blocks it sums: the halves are added, and then their halves.
+inline F32 SumsOfBlocks(const F32 (&vectors)[4]) {
+    const auto halves = [&vectors](int i) {
+        const __m512 a = vectors[i].v, b = vectors[i + 1].v;
+        return _mm512_add_ps(_mm512_shuffle_f32x4(a, b, _MM_SHUFFLE(1, 0, 1, 0)),
+                             _mm512_shuffle_f32x4(a, b, _MM_SHUFFLE(3, 2, 3, 2)));
+    };
+    const __m512 a = halves(0), b = halves(2);
+    return {_mm512_add_ps(_mm512_shuffle_f32x4(a, b, _MM_SHUFFLE(2, 0, 2, 0)),
+                          _mm512_shuffle_f32x4(a, b, _MM_SHUFFLE(3, 1, 3, 1)))};
 }
 
 } // namespace PK::avx512
