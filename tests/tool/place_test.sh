@@ -110,6 +110,11 @@ is "second" "$(luma 1)" "$(bar 1010ebeb10101010)"
 is "last" "$(luma 3)" "$(bar 101010101010ebeb)"
 is "chroma" "$(tail -c 64 flight.y4m | tr -d '\200' | wc -c)" 0
 
+expect 0 "stills-%02d.png: 4 frames 8x4" "${flight[@]:0:3}" stills-%02d.png "${flight[@]:4}" --frames 4 --png-depth 16
+is "numbered files" "$(echo stills-*)" "stills-00.png stills-01.png stills-02.png stills-03.png"
+is "the third of them" "$(reds stills-02.png 8)" "$(bar 00000000ffff0000)"
+is "their depth" "$(od -An -j24 -N1 -tu1 stills-02.png | xargs)" 16
+
 # Each field at its time: four fields in two frames.
 for field in 1 2; do
     expect 0 "2 frames" "${flight[@]}" --frames 2 --dst-field $field --rate 50
@@ -178,7 +183,7 @@ done
 refuse "--to knows position" out/x.y4m --frames 2 --to quality=3
 refuse "--to wants NAME=VALUE" out/x.y4m --frames 2 --to rotate
 refuse "--to is for a flight" out/x.png --to rotate=3
-refuse "name it .y4m" out/x.png --frames 3
+refuse "a flight is a Y4M stream, or numbered files" out/x.png --frames 3
 refuse "tell --frames" out/x.y4m
 refuse "tell --frames" -
 for frames in 0 -1 x 1000000; do refuse "--frames" out/x.y4m --frames=$frames; done

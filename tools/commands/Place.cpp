@@ -1,18 +1,18 @@
 // pixelkiln place: a picture moved, scaled and turned over another, once or as a flight.
 
-#include "Placing.h"
+#include "Flight.h"
 
 #include "Blending.h"
 #include "Centring.h"
 #include "Command.h"
 #include "Failure.h"
 #include "FramePipe.h"
+#include "NumberedName.h"
 #include "Numbers.h"
 #include "Operations.h"
 #include "Png.h"
 #include "SharedWords.h"
 #include "Terminal.h"
-#include "Y4M.h"
 
 #include <algorithm>
 
@@ -26,8 +26,8 @@ output, which is BACK, or black. Where --size differs from BACK, the middle of B
 Quality 5 samples light, by a cubic, and fades the edges of SRC over what that reaches. Up to 4 it is bilinear, and at 3
 and 4 what gets smaller is blurred before.
 
-With --frames, SRC flies from the placing that is told to that of --to, and OUT is a Y4M stream, which players read; with
---dst-field its fields are half a frame apart.
+With --frames, SRC flies from the placing that is told to that of --to, and OUT is a Y4M stream, which players read, or
+a numbered PNG a frame; with --dst-field its fields are half a frame apart.
 
 Examples:
   pixelkiln place logo.png picture.png out.png --position 0.9,0.1 --scale 0.25,0.25 --rotate 10
@@ -44,7 +44,9 @@ struct Options : PipeOptions {
 };
 
 void Declare(Words& words, Options& options) {
-    words.Take("FILES", options.files, "SRC, BACK if there is one, and OUT: PNG files, or a .y4m of a flight")
+    words
+        .Take("FILES", options.files,
+              "SRC, BACK if there is one, and OUT: PNG files; OUT of a flight: .y4m, - or frame-%04d.png")
         .Required();
     words.Take("--size", options.size,
                "Of the output, such as 1920x1080; without it, that of BACK or of SRC");
@@ -142,7 +144,9 @@ void Check(const Options& options, const Placing& start, const Placing& end) {
     require(!isSoft || options.quality == 3 || options.quality == 4, "a softness is for --quality 3 or 4");
     const bool isPng = IsPngName(options.output);
     if (options.frames > 0) {
-        require(!isPng, "a flight is a Y4M stream: name it .y4m, not '" + options.output + "'");
+        require(!isPng || NumberedName(options.output).IsNumbered(),
+                "a flight is a Y4M stream, or numbered files such as frame-%04d.png, and not '" +
+                    options.output + "'");
     } else {
         require(isPng, "'" + options.output +
                            "' is no name of a PNG; for a flight, which is a Y4M stream, tell --frames");
@@ -165,35 +169,6 @@ Frame BackOf(const Options& options, const Frame& source) {
     return Centred(back, size.width, size.height);
 }
 
-/// One frame of a flight; its fields are drawn one after the other, each at its time.
-void PlaceAt(const Options& options, const Placing& start, const Placing& end, int32_t frame,
-             const Frame& source, Frame& back) {
-    const int32_t fields = start.destinationField == 0 ? 1 : 2, steps = fields * options.frames - 1;
-    for (int32_t field = 0; field < fields; ++field) {
-        const int32_t step = fields * frame + field;
-        Placing placing = Between(start, end, steps > 0 ? double(step) / steps : 0);
-        if (fields > 1)
-            placing.renderField = field == 0 ? start.destinationField : 3 - start.destinationField;
-        Place(source, placing, back);
-    }
-}
-
-void Fly(const Options& options, const Placing& start, const Placing& end, const Frame& source,
-         const Frame& back) {
-    Y4MWriter writer(options.output, {back.Width(), back.Height(), options.rate, start.destinationField});
-    Progress progress("frames", options.frames);
-    for (int32_t i = 0; i < options.frames; ++i) {
-        Frame frame = Copied(back);
-        PlaceAt(options, start, end, i, source, frame);
-        writer.Write(frame);
-        progress.Advance();
-    }
-    writer.Commit();
-    if (!IsSilent(options))
-        Print(options.output + ": " + std::to_string(options.frames) +
-              (options.frames == 1 ? " frame " : " frames ") + SizeText(back) + "\n");
-}
-
 void Run(const Options& told) {
     if (told.files.size() < 2 || told.files.size() > 3)
         throw Failure(kExitUsage, "place takes SRC, BACK if there is one, and OUT");
@@ -203,7 +178,13 @@ void Run(const Options& told) {
     Check(options, start, end);
     const Frame picture = ReadPng(options.files.front());
     const Frame back = BackOf(options, picture), source = ToBePlaced(picture, start.quality);
-    if (options.frames > 0) return Fly(options, start, end, source, back);
+    if (options.frames > 0) {
+        Fly({start, end, options.frames, options.rate, options.pngDepth}, source, back, options.output);
+        if (!IsSilent(options))
+            Print(options.output + ": " + std::to_string(options.frames) +
+                  (options.frames == 1 ? " frame " : " frames ") + SizeText(back) + "\n");
+        return;
+    }
     options.size = SizeText(back);
     WriteMadeFrame(options, [&](Frame& frame) {
         Convert(back, frame, kDefaultQuality);
