@@ -88,6 +88,9 @@ identical in/rows.png x.png
 is "black beside it" "$(placed 5 in/white.png in/six.png --size 5x4 --opacity 0 x.png)" \
     "0000000000 0004050600 0001020300 0000000000"
 is "cut" "$(placed 1 in/white.png in/six.png --size 1x2 --opacity 0 x.png)" "05 02"
+is "an odd pixel goes to the right and below" "$(placed 4 in/white.png in/six.png --size 4x3 --opacity 0 x.png)" \
+    "04050600 01020300 00000000"
+is "and is cut there" "$(placed 2 in/white.png in/six.png --size 2x1 --opacity 0 x.png)" "0405"
 is "no back" "$(placed 4 in/white.png --size 4x2 x.png)" "00ffff00 00ffff00"
 expect 0 "x.png: 1 frame 3x2, BGRA_4444_32f" place in/six.png x.png --png-depth 16
 expect 0 "size                3x2" compare in/six.png x.png --limit 0.001
@@ -155,6 +158,7 @@ for size in 1278x2 1280x2 2x576 2x577; do
     expect 0 "" place in/red.png red.y4m --frames 1
     is "red of $size" "$(tail -n +2 red.y4m | tail -c +7 | hex | cut -c 1-2)" "$([[ $size =~ 1278|576 ]] && echo 51 || echo 3f)"
 done
+is "chroma of red in Rec. 601, V last" "$("$program" place in/red.png - --size 1x1 --frames 1 | tail -c 3 | hex)" "51 5a f0"
 expect 0 "" fill in/glass.png --size 2x2 --colour 255,255,255,128
 expect 0 "" place in/white.png in/glass.png glass.y4m --opacity 0 --frames 1
 is "glass is seen over black" "$(tail -c 12 glass.y4m | hex)" "7e 7e 7e 7e 80 80 80 80 80 80 80 80"
