@@ -202,6 +202,7 @@ for quality in 2 5; do
     refuse "a softness is for --quality 3 or 4" out/x.png --softness 0.5 --quality $quality
     refuse "a softness is for --quality 3 or 4" out/x.y4m --frames 2 --to softness=0.5 --quality $quality
 done
+refuse "a softness is for --quality 3 or 4" out/x.y4m --frames 2 --softness 0.5 --to softness=0 --quality 2
 refuse "--soft-edges is for a quality up to 4" out/x.png --soft-edges
 refuse "there is no blend mode 'screen'" out/x.png --mode screen
 refuse "place takes SRC" in/white.png out/x.png
