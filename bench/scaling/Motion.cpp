@@ -1,4 +1,4 @@
-// PK_Motion, on floats and on one processor's worth of pixels at a time.
+// PK_Motion, on pixels of floats.
 
 #include "Scaler.h"
 
