@@ -83,6 +83,12 @@ public:
                           "such as frame-%04d.png");
     }
 
+    /// Of the frames that were written.
+    std::string SizeIfNot(const Frame& frame) const {
+        if (fConverted->Width() == frame.Width() && fConverted->Height() == frame.Height()) return "";
+        return " at " + SizeText(*fConverted);
+    }
+
     int64_t Finish() {
         if (fRawFile) fRawFile->Commit();
         return fFrameCount;
@@ -177,7 +183,7 @@ void PipeFrames(const PipeOptions& options, const Step& step) {
     const int64_t count = output.Finish();
     if (IsSilent(options)) return;
     Print(options.input + " -> " + options.output + ": " + CountAndSize(count, frame) + " to " +
-          FormatName(plan.to) + "\n");
+          FormatName(plan.to) + output.SizeIfNot(frame) + "\n");
 }
 
 void PipeFramesInTheirFormat(PipeOptions options, const Step& step) {

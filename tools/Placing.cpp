@@ -17,11 +17,6 @@ PK_Point Between(PK_Point from, PK_Point to, double way) {
     return {std::lerp(from.x, to.x, w), std::lerp(from.y, to.y, w)};
 }
 
-/// The highest quality samples this alone.
-PK_PixelFormat FormatOf(const Frame& picture, int32_t quality) {
-    return quality == kDefaultQuality ? PK_PixelFormat_BGRP_4444_32f_Linear : picture.Format();
-}
-
 } // namespace
 
 Placing Between(const Placing& from, const Placing& to, double way) {
@@ -35,16 +30,20 @@ Placing Between(const Placing& from, const Placing& to, double way) {
     return placing;
 }
 
+Frame ToBePlaced(const Frame& picture, int32_t quality) {
+    constexpr int32_t kCubic = 5; // samples one format alone
+    return Converted(picture, quality == kCubic ? PK_PixelFormat_BGRP_4444_32f_Linear : picture.Format(),
+                     kDefaultQuality);
+}
+
 void Place(const Frame& picture, const Placing& placing, Frame& back) {
-    const PK_PixelFormat format = FormatOf(picture, placing.quality);
-    if (format != picture.Format()) return Place(Converted(picture, format, kDefaultQuality), placing, back);
     Require(PK_MotionWithBlendMode(picture.Pixels(), picture.RowBytes(), picture.Width(), picture.Height(),
                                    picture.Format(), placing.sourceField, nullptr, back.Pixels(),
                                    back.RowBytes(), back.Width(), back.Height(), back.Format(),
                                    placing.destinationField, 1, 1, FromBottom(placing.position),
                                    FromBottom(placing.anchor), placing.scale, placing.rotation,
                                    static_cast<float>(placing.opacity), placing.softness, placing.smoothEdges,
-                                   0, placing.mode, placing.quality, false),
+                                   placing.renderField, placing.mode, placing.quality, false),
             "place", picture);
 }
 

@@ -24,8 +24,7 @@ struct Grid {
     double Height() const { return kHeadingHeight + rows * (tileHeight + kGap); }
 };
 
-// As near to a square as the words allow, and no wider than a screen.
-Grid ChooseGrid(size_t tileCount, size_t picturesInTile) {
+Grid ChooseGrid(size_t tileCount, size_t picturesInTile, int32_t columns) {
     Grid grid{};
     const auto pictures = static_cast<double>(picturesInTile);
     grid.tileWidth = pictures * kPictureSide + (pictures - 1) * kBetweenPictures;
@@ -33,7 +32,7 @@ Grid ChooseGrid(size_t tileCount, size_t picturesInTile) {
     const auto count = static_cast<double>(tileCount);
     const double square = std::ceil(std::sqrt(count * grid.tileHeight / grid.tileWidth));
     const double fitting = std::floor((kMaximalWidth - kGap) / (grid.tileWidth + kGap));
-    grid.columns = static_cast<int>(std::max(1.0, std::min(square, fitting)));
+    grid.columns = columns > 0 ? columns : static_cast<int>(std::max(1.0, std::min(square, fitting)));
     grid.rows = static_cast<int>(std::ceil(count / grid.columns));
     return grid;
 }
@@ -57,14 +56,15 @@ void DrawTile(cairo_t* context, const Tile& tile, double x, double y) {
 
 } // namespace
 
-void WriteSheet(const std::vector<Tile>& tiles, const std::string& heading, const std::string& name) {
-    const Grid grid = ChooseGrid(tiles.size(), tiles.front().pictures.size());
+void WriteSheet(const std::vector<Tile>& tiles, const std::string& heading, const std::string& name,
+                int32_t columns) {
+    const Grid grid = ChooseGrid(tiles.size(), tiles.front().pictures.size(), columns);
     const auto draw = [&](cairo_t* context) {
         DrawText(context, heading, kGap, kHeadingHeight - 16, {.size = 18, .bold = true});
         for (size_t i = 0; i < tiles.size(); ++i) {
-            const auto columns = static_cast<size_t>(grid.columns);
-            DrawTile(context, tiles[i], kGap + static_cast<double>(i % columns) * (grid.tileWidth + kGap),
-                     kHeadingHeight + static_cast<double>(i / columns) * (grid.tileHeight + kGap));
+            const auto inRow = static_cast<size_t>(grid.columns);
+            DrawTile(context, tiles[i], kGap + static_cast<double>(i % inRow) * (grid.tileWidth + kGap),
+                     kHeadingHeight + static_cast<double>(i / inRow) * (grid.tileHeight + kGap));
         }
     };
     WritePngDrawing(static_cast<int32_t>(grid.Width()), static_cast<int32_t>(grid.Height()), draw, name);

@@ -22,6 +22,8 @@ struct Tile {
 };
 
 /// Writes a PNG of all tiles, at least one, each with the same number of pictures.
-void WriteSheet(const std::vector<Tile>& tiles, const std::string& heading, const std::string& name);
+/// \param columns  of tiles; 0: as near to a square as the words allow, and no wider than a screen.
+void WriteSheet(const std::vector<Tile>& tiles, const std::string& heading, const std::string& name,
+                int32_t columns = 0);
 
 } // namespace tool

@@ -3,6 +3,9 @@
 
 expect 0 "2 pictures" sheet sheet.png "$media/coffee.png" "$media/chelsea.png"
 expect 0 "identical" compare sheet.png sheet.png
+expect 0 "5 pictures" sheet sheet.png "$media"/{coffee,chelsea,coffee,chelsea,coffee}.png --columns 5 --heading Five
+expect 0 "size                1376x364" compare sheet.png sheet.png
+expect 2 "--columns" sheet x.png "$media/coffee.png" --columns 0
 
 expect 0 "demo/sheet.png shows all 12" demo "$media/chelsea.png" demo
 is "pictures of the demonstration" "$(ls -A demo | wc -l)" 16

@@ -15,7 +15,7 @@ is "counterclockwise" "$(turned -90)" "03 02 01"
 is "a half the other way" "$(turned -180)" "03 02 01"
 is "three quarters the other way" "$(turned -270)" "01 02 03"
 
-expect 0 "451x300, BGRA_4444_8u to BGRA_4444_8u" rotate "$media/chelsea.png" quarter.png --degrees 90
+expect 0 "451x300, BGRA_4444_8u to BGRA_4444_8u at 300x451" rotate "$media/chelsea.png" quarter.png --degrees 90
 expect 0 "1 frame 300x451" rotate quarter.png back.png --degrees 270
 identical "$media/chelsea.png" back.png
 cat in/column.raw in/column.raw > in/two.raw

@@ -1,28 +1,17 @@
 // pixelkiln blendsheet: two pictures by every blend mode.
 
 #include "Blending.h"
+#include "Centring.h"
 #include "Command.h"
 #include "Png.h"
 #include "Sheet.h"
 #include "Terminal.h"
 
 #include <algorithm>
-#include <cstring>
 #include <filesystem>
 
 namespace tool {
 namespace {
-
-/// The middle of a picture.
-Frame Cropped(const Frame& picture, int32_t width, int32_t height) {
-    const Frame whole = Converted(picture, PK_PixelFormat_BGRA_4444_8u, kDefaultQuality);
-    Frame middle(whole.Format(), width, height);
-    const int32_t left = (whole.Width() - width) / 2, above = (whole.Height() - height) / 2;
-    for (int32_t row = 0; row < height; ++row)
-        std::memcpy(middle.Row(row), whole.Row(above + row) + int64_t{4} * left,
-                    size_t{4} * static_cast<size_t>(width));
-    return middle;
-}
 
 struct Options {
     std::string top, back, output;
@@ -39,10 +28,11 @@ std::string FileName(const std::string& path) {
 }
 
 void Run(const Options& options) {
-    const Frame first = ReadPng(options.top), second = ReadPng(options.back);
+    const Frame first = Converted(ReadPng(options.top), PK_PixelFormat_BGRA_4444_8u, kDefaultQuality);
+    const Frame second = Converted(ReadPng(options.back), PK_PixelFormat_BGRA_4444_8u, kDefaultQuality);
     const int32_t width = std::min(first.Width(), second.Width());
     const int32_t height = std::min(first.Height(), second.Height());
-    const Frame top = Cropped(first, width, height), back = Cropped(second, width, height);
+    const Frame top = Centred(first, width, height), back = Centred(second, width, height);
     std::vector<Tile> tiles;
     tiles.emplace_back("the top", FileName(options.top), Copied(top));
     tiles.emplace_back("the back", FileName(options.back), Copied(back));
