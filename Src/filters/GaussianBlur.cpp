@@ -167,7 +167,7 @@ PK_Result BlurImage(const Images& images, const Blur& blur) {
 
 } // namespace
 
-PK_Result BlurForMotion(const void* source, int32_t sourceRowBytes, int32_t sourceWidth, int32_t sourceHeight,
+PK_Result BlurForMotion(const void* source, ptrdiff_t sourceRowBytes, int32_t sourceWidth, int32_t sourceHeight,
                         PK_PixelFormat sourceFormat, void* dest, int32_t destRowBytes, int32_t destWidth,
                         int32_t destHeight, PK_PixelFormat destFormat, double sigmaX, double sigmaY,
                         bool repeatEdge, bool linear, bool reuseDestination, int32_t direction,

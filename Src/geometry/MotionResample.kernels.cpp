@@ -111,36 +111,60 @@ struct HighQuality {
 
     explicit HighQuality(const MotionRow& from) : row(from), weightsX(from.kernelX), weightsY(from.kernelY) {}
 
-    void Edge(const Places& places, int32_t count, float* out) const { Sample(places, count, out); }
-    void Inside(const Places& places, int32_t count, float* out) const { Sample(places, count, out); }
+    void Edge(const Places& places, int32_t count, float* out) const { Inside(places, count, out); }
 
     /// What lies outside the source is left out, at the edges and inside, where a wide table reaches beyond the margin.
-    void Sample(const Places& places, int32_t count, float* out) const {
+    void Inside(const Places& places, int32_t count, float* out) const {
         const Reaches x(places.x, count, row.left, row.right, weightsX.Taps());
-        if (!row.rotated && SampleLevel(places, x, count, out)) return;
         const Reaches y(places.y, count, row.top, row.bottom, weightsY.Taps());
         Put(count, out,
             [&](int32_t i) { return SumOfArea(x.first[i], x.phase[i], y.first[i], y.phase[i]).Total(); });
     }
 
-    /// Where all places lie in the same rows these are added up first, once for many columns. Returns false where that
-    /// does not pay, as there are too many columns of the source between two of the destination.
-    bool SampleLevel(const Places& places, const Reaches& x, int32_t count, float* out) const {
-        constexpr int64_t kMostColumns =
-            5 * kBlock; // at a quarter of the size, the least that has a table of its own
-        const Range range = RangeOf(x.first, count);
-        const int64_t width = int64_t{range.most} - range.least + weightsX.Taps();
-        if (width > kMostColumns) return false;
+    static constexpr bool kFindsEdges = true;
+
+    void Locate(const float* places, int32_t* pixels, int32_t* phases, int32_t count) const {
+        for (int32_t i = 0; i < count; i += kLanes) {
+            const Reach reach(places + i, row.left, row.right, weightsX.Taps());
+            Store(pixels + i, reach.first);
+            Store(phases + i, reach.phase);
+        }
+    }
+
+    /// Where all places lie in the same rows, these are added up first, once for many columns. That does not pay where
+    /// there are too many columns of the source between two of the destination.
+    void Level(int32_t columns, float* out) const {
+        float y[kLanes];
+        Store(y, Floats(row.y));
+        const Reaches rows(y, 1, row.top, row.bottom, weightsY.Taps());
+        for (int32_t begin = 0; begin < columns; begin += kBlock) {
+            const int32_t count = columns - begin < kBlock ? columns - begin : kBlock;
+            const int32_t *const pixels = row.shared->pixels + begin, *const phases =
+                                                                          row.shared->weights + begin;
+            const Range range = RangeOf(pixels, count);
+            float* const to = out + int64_t{kPixelFloats} * begin;
+            if (int64_t{range.most} - range.least + kMostTaps <= kMostColumns)
+                SumRows(rows.first[0], rows.phase[0], range, pixels, phases, count, to);
+            else
+                Put(count, to, [&](int32_t i) {
+                    return SumOfArea(pixels[i], phases[i], rows.first[0], rows.phase[0]).Total();
+                });
+        }
+    }
+
+    static constexpr int32_t kMostColumns =
+        5 * kBlock; // at a quarter of the size, the least that has a table of its own
+
+    void SumRows(int32_t firstLine, int32_t phase, const Range& range, const int32_t* pixels,
+                 const int32_t* phases, int32_t count, float* out) const {
         alignas(64) float sums[kMostColumns * kPixelFloats];
-        const Reaches y(places.y, 1, row.top, row.bottom, weightsY.Taps());
-        AddRows(y.first[0], y.phase[0], range.least, static_cast<int32_t>(width), sums);
+        AddRows(firstLine, phase, range.least, range.most - range.least + weightsX.Taps(), sums);
         Put(count, out, [&](int32_t i) {
             TapSums taps;
-            taps.Add(sums + int64_t{x.first[i] - range.least} * kPixelFloats, weightsX.Phase(x.phase[i]),
+            taps.Add(sums + int64_t{pixels[i] - range.least} * kPixelFloats, weightsX.Phase(phases[i]),
                      weightsX.Taps());
             return taps.Total();
         });
-        return true;
     }
 
     const float* PixelAt(int32_t column, int32_t line) const {

@@ -3,6 +3,7 @@
 #include "convert/RasterFormats.h"
 #include "frame/Bands.h"
 #include "geometry/MotionFields.h"
+#include "geometry/V210Groups.h"
 #include "primitives/Thresholds.h"
 
 #include <algorithm>
@@ -26,6 +27,10 @@ std::optional<int32_t> WholePlace(float x) {
     constexpr float kFar = 1e9f;
     if (!(std::abs(x) < kFar) || !IsWhole(x)) return std::nullopt;
     return static_cast<int32_t>(x);
+}
+
+constexpr uint64_t BytesOfInts(int32_t count) {
+    return sizeof(int32_t) * static_cast<uint64_t>(count);
 }
 
 /// Four channels, premultiplied floats, B, G, R, A or V, U, Y, A.
@@ -89,13 +94,17 @@ PK_Result MotionRows::DrawBand(const MotionSourceRows& source, PK_Point at, int3
     RowMemory memory(roomForUnits);
     memory.AddRow(fLineFormat);
     memory.AddRow(parted);
+    const int32_t shared = Columns() + MotionColumns::kMore;
+    memory.AddBytes(2 * BytesOfInts(shared));
     for (const ConversionChain* chain : {&fDirect, &fLine, &fFromUnits, &fToUnits}) memory.AddChain(*chain);
     return memory.With([&](TemporaryRows& rows) -> PK_Result {
         auto* const line = reinterpret_cast<float*>(rows.Take(BytesOfRow(fLineFormat, roomForUnits)));
         uint8_t* const units = rows.Take(BytesOfRow(parted, roomForUnits));
+        auto* const columns = reinterpret_cast<int32_t*>(rows.Take(2 * BytesOfInts(shared)));
+        MotionColumns columnsOfBand = {columns, columns + shared};
         for (int32_t row = first; row < end; ++row, at.x += fSteps.row.x, at.y += fSteps.row.y) {
             if (!IsOfField(row, field)) continue;
-            const Span span = SpanOfRow(source, at, line);
+            const Span span = SpanOfRow(source, at, columnsOfBand, line);
             if (span.count < 1) continue;
             if (const PK_Result result = DrawSpan(span, row, rows.Scratch(), units)) return result;
         }
@@ -107,7 +116,8 @@ bool MotionRows::IsOfField(int32_t row, int32_t field) const {
     return !IsInterlaced(fJob.destinationField) || field == 0 || (row % 2 == 0) == (field == 1);
 }
 
-MotionRows::Span MotionRows::SpanOfRow(const MotionSourceRows& source, PK_Point at, float* line) const {
+MotionRows::Span MotionRows::SpanOfRow(const MotionSourceRows& source, PK_Point at, MotionColumns& columns,
+                                       float* line) const {
     if (fSteps.isExact) {
         const auto column = WholePlace(at.x), row = WholePlace(at.y);
         if (column && row) return ExactSpan(source, *column, *row);
@@ -127,7 +137,8 @@ MotionRows::Span MotionRows::SpanOfRow(const MotionSourceRows& source, PK_Point 
                            fIsRotated,
                            fJob.smoothEdges,
                            fKernelX,
-                           fKernelY};
+                           fKernelY,
+                           &columns};
     const MotionSpan span = fSample(row, line);
     if (span.count < 1) return {};
     float* const pixels = line + int64_t{4} * span.first;
@@ -164,16 +175,26 @@ PK_Result MotionRows::DrawSpan(const Span& span, int32_t row, const ChainScratch
 PK_Result MotionRows::DrawInUnits(const Span& span, uint8_t* row, const ChainScratch& scratch,
                                   uint8_t* units) const {
     const PK_PixelFormat parted = fToUnits.source;
-    const int32_t unit = UnitOfRow(fDestination.format).pixels, first = span.column / unit * unit;
-    const int32_t end = (span.column + span.count + unit - 1) / unit * unit;
-    const int32_t count = std::min(end, fDestination.width) - first;
+    const int32_t unit = UnitOfRow(fDestination.format).pixels;
+    const int32_t first = span.column / unit * unit, spanEnd = span.column + span.count;
+    const int32_t last = (spanEnd - 1) / unit * unit; // where the last unit begins
+    const int32_t count = std::min(last + unit, fDestination.width) - first;
     uint8_t* const to = row + BytesOfRow(fDestination.format, first);
     fFromUnits.ConvertRow(to, units, count, scratch);
     if (const PK_Result result =
             fDrawer.Draw(span.pixels, 0, span.format, units + BytesOfRow(parted, span.column - first), 0,
                          parted, span.count, 1))
         return result;
+    if (!IsV210(fDestination.format)) {
+        fToUnits.ConvertRow(units, to, count, scratch);
+        return PK_Success;
+    }
+    // Its chroma reaches across pairs.
+    uint8_t* const lastTo = row + BytesOfRow(fDestination.format, last);
+    const V210Group firstGroup(to), lastGroup(lastTo);
     fToUnits.ConvertRow(units, to, count, scratch);
+    firstGroup.RestoreBeside(to, span.column - first, unit);
+    lastGroup.RestoreBeside(lastTo, 0, spanEnd - last);
     return PK_Success;
 }
 

@@ -44,7 +44,7 @@ private:
     PK_Result DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end,
                        int32_t field) const;
     bool IsOfField(int32_t row, int32_t field) const;
-    Span SpanOfRow(const MotionSourceRows& source, PK_Point at, float* line) const;
+    Span SpanOfRow(const MotionSourceRows& source, PK_Point at, MotionColumns& columns, float* line) const;
     Span ExactSpan(const MotionSourceRows& source, int32_t column, int32_t row) const;
     PK_Result DrawSpan(const Span& span, int32_t row, const ChainScratch& scratch, uint8_t* units) const;
     PK_Result DrawInUnits(const Span& span, uint8_t* row, const ChainScratch& scratch, uint8_t* units) const;

@@ -201,104 +201,27 @@ struct Bilinear {
         for (int32_t n = 0; n < count; n += kLanes) StorePixels(out + 4 * n, Zero::Value(), count - n);
     }
 
-    void Inside(const Places& places, int32_t count, float* out) const {
-        if (row.rotated || !InsideLevel(places, count, out)) InsideByCells(places, count, out);
-    }
-
-    /// The place in the columns of the source, for all columns of a block.
-    struct Columns {
-        Columns(const Places& places, int32_t count, const MotionRow& row) {
-            for (int32_t n = 0; n < count; n += kLanes) {
-                const InnerCell cell(places.x + n, row.left, row.right);
-                Store(first + n, cell.first);
-                Store(fraction + n, cell.fraction);
-            }
-            FillGroup(first, count);
-        }
-
-        alignas(64) int32_t first[kBlock];
-        alignas(64) float fraction[kBlock];
-    };
-
-    /// Where all places lie between the same two rows these are mixed first, once for many columns. Returns false where
-    /// that does not pay, as there are too many columns of the source between two of the destination.
-    bool InsideLevel(const Places& places, int32_t count, float* out) const {
-        constexpr int32_t kMostColumns = 2 * kBlock + 2;
-        Columns columns(places, count, row);
-        const Range range = RangeOf(columns.first, count);
-        // A vector's worth at least, which the source has: its margins are two pixels each.
-        const int32_t least =
-            range.least < row.right - kVectorPixels ? range.least : row.right - kVectorPixels;
-        const int32_t width = range.most + 2 - least;
-        if (width > kMostColumns) return false;
-        constexpr int32_t kFloats = 4 * (kMostColumns + kVectorPixels);
-        alignas(64) float mixed[kFloats], shares[kFloats];
-        const LevelRows rows(*this, places, least, width < kVectorPixels ? kVectorPixels : width);
-        const bool isPlain = rows.Mix(mixed);
-        if (!isPlain) rows.TakeShares(shares);
-        for (int32_t n = 0; n < count; n += kLanes)
-            Store(columns.first + n, LoadInts(columns.first + n) - Ints(least));
-        const bool isNear = AreNear(columns.first, count);
-        for (int32_t n = 0; n < count; n += kVectorPixels) {
-            const int32_t* const first = columns.first + n;
-            const F32 fx = LoadOnePerBlock(columns.fraction + n);
-            F32 left, right;
-            LoadSideBySide(mixed, first, isNear, left, right);
-            F32 sum = left + (right - left) * fx;
-            if (!isPlain) {
-                LoadSideBySide(shares, first, isNear, left, right);
-                sum = FromBits(IsSeen(Max(left * (Floats(1) - fx), right * fx)) & Bits(sum));
-            }
-            StorePixels(out + 4 * n, Zero::kIsZero ? sum : sum + InterleavedZero(), count - n);
-        }
-        return true;
-    }
-
-    static I32 IsSeen(F32 shares) { return Less(Floats(0x1p-17f), BroadcastAlpha<AlphaPlace::last>(shares)); }
-
-    /// Whether the pixels of each vector begin no further from its first than it is wide.
-    static bool AreNear(const int32_t* first, int32_t count) {
-        I32 far = Ints(0);
-        for (int32_t n = 0; n < count; n += kVectorPixels)
-            far = far | (LoadOneIntPerBlock(first + n) - Ints(first[n]));
-        return !AnyNegative(Ints(kVectorPixels - 1) - far) && !AnyNegative(far);
-    }
-
-    /// The pixels of some columns of a row, and those right of them.
-    [[gnu::always_inline]] static void LoadSideBySide(const float* pixels, const int32_t* first, bool isNear,
-                                                      F32& left, F32& right) {
-        if (isNear) {
-            const float* const near = pixels + 4 * int64_t{*first};
-            const I32 lanes = ShiftLeft<2>(LoadOneIntPerBlock(first) - Ints(*first)) + PixelInts(0, 1, 2, 3);
-            left = LoadBlocksNear(near, lanes);
-            right = LoadBlocksNear(near + 4, lanes);
-        } else {
-            left = LoadBlocksOf(pixels, first);
-            right = LoadBlocksOf(pixels + 4, first);
-        }
-    }
-
-    /// Two rows of the source, one after the other, from a column on, and a row between them.
+    /// Two rows of the source, one after the other, and a row between them.
     class LevelRows {
     public:
-        LevelRows(const Bilinear& sampler, const Places& places, int32_t first, int32_t width)
-            : fWidth(width), fRowBytes(sampler.row.rowBytes) {
-            const MotionRow& row = sampler.row;
-            const InnerCell cell(places.y, row.top, row.bottom);
-            int32_t rows[kLanes];
+        explicit LevelRows(const MotionRow& row) : fRowBytes(row.rowBytes) {
+            float places[kLanes];
+            Store(places, Floats(row.y));
+            const InnerCell cell(places, row.top, row.bottom);
+            int32_t firsts[kLanes];
             float fractions[kLanes];
-            Store(rows, cell.first);
+            Store(firsts, cell.first);
             Store(fractions, cell.fraction);
-            fUpper = row.pixels + rows[0] * row.rowBytes + int64_t{first} * Layout::kPixelBytes;
-            fFraction = fractions[0];
+            upper = row.pixels + firsts[0] * row.rowBytes;
+            fraction = fractions[0];
         }
 
-        /// Returns whether all pixels have so much alpha that, of any two, the share of one of the four in the source is
-        /// enough to be seen.
-        bool Mix(float* mixed) const {
-            const F32 fy = Floats(fFraction);
+        /// So many pixels from one on. Returns whether all have so much alpha that, of any two, the share of one of the
+        /// four in the source is enough to be seen.
+        bool Mix(int32_t first, int32_t width, float* mixed) const {
+            const F32 fy = Floats(fraction);
             I32 isMuch = Ints(-1);
-            Go([&](int32_t at, F32 above, F32 below) {
+            Go(first, width, [&](int32_t at, F32 above, F32 below) {
                 const F32 sum = above + (below - above) * fy;
                 Store(mixed + at, sum);
                 if constexpr (kAlpha != MotionAlpha::none) isMuch = isMuch & Less(Floats(0x1p-13f), sum);
@@ -307,25 +230,116 @@ struct Bilinear {
         }
 
         /// The greater of two alphas by the weight of its row.
-        void TakeShares(float* shares) const {
-            const F32 fy = Floats(fFraction), gy = Floats(1 - fFraction);
-            Go([&](int32_t at, F32 above, F32 below) { Store(shares + at, Max(above * gy, below * fy)); });
+        void TakeShares(int32_t first, int32_t width, float* shares) const {
+            const F32 fy = Floats(fraction), gy = Floats(1 - fraction);
+            Go(first, width,
+               [&](int32_t at, F32 above, F32 below) { Store(shares + at, Max(above * gy, below * fy)); });
         }
+
+        const uint8_t* upper;
+        float fraction;
 
     private:
         template <class Use>
-        void Go(Use use) const {
-            ByVectors(4 * fWidth, [&](int32_t at) {
-                const uint8_t* const pixels = fUpper + int64_t{at} * Layout::kPixelBytes / 4;
+        void Go(int32_t first, int32_t width, Use use) const {
+            const uint8_t* const begin = upper + int64_t{first} * Layout::kPixelBytes;
+            ByVectors(4 * width, [&](int32_t at) {
+                const uint8_t* const pixels = begin + int64_t{at} * Layout::kPixelBytes / 4;
                 use(at, LoadLevel(pixels), LoadLevel(pixels + fRowBytes));
             });
         }
 
-        const uint8_t* fUpper;
-        int32_t fWidth;
         int64_t fRowBytes;
-        float fFraction;
     };
+
+    static constexpr bool kFindsEdges = false;
+
+    void Locate(const float* places, int32_t* pixels, int32_t* fractions, int32_t count) const {
+        for (int32_t n = 0; n < count; n += kLanes) {
+            const InnerCell cell(places + n, row.left, row.right);
+            Store(pixels + n, cell.first);
+            Store(fractions + n, Bits(cell.fraction));
+        }
+    }
+
+    /// Where all places lie between the same two rows, these are mixed first, once for many columns. That does not pay
+    /// where there are too many columns of the source between two of the destination.
+    void Level(int32_t columns, float* out) const {
+        if (columns < 1) return;
+        const LevelRows rows(row);
+        for (int32_t begin = 0; begin < columns; begin += kBlock) {
+            const int32_t count = columns - begin < kBlock ? columns - begin : kBlock;
+            const int32_t* const pixels = row.shared->pixels + begin;
+            const auto* const fractions = reinterpret_cast<const float*>(row.shared->weights + begin);
+            const Range range = RangeOf(pixels, count);
+            if (range.most - range.least <= kMostColumns)
+                BlendRows(rows, range, pixels, fractions, count, out + int64_t{4} * begin);
+            else
+                BlendCells(rows, pixels, fractions, count, out + int64_t{4} * begin);
+        }
+    }
+
+    static constexpr int32_t kMostColumns = 2 * kBlock;
+
+    void BlendRows(const LevelRows& rows, const Range& range, const int32_t* pixels, const float* fractions,
+                   int32_t count, float* out) const {
+        // A vector's worth at least, which the source has: its margins are two pixels each.
+        const int32_t most = row.right - kVectorPixels, least = range.least < most ? range.least : most;
+        const int32_t needed = range.most + 2 - least,
+                      width = needed < kVectorPixels ? kVectorPixels : needed;
+        constexpr int32_t kFloats = 4 * (kMostColumns + 2 + kVectorPixels);
+        alignas(64) float mixed[kFloats], shares[kFloats];
+        const bool isPlain = rows.Mix(least, width, mixed);
+        if (!isPlain) rows.TakeShares(least, width, shares);
+        const Pairs pairs = {mixed, shares, pixels, fractions, least};
+        if (isPlain && row.shared->areNear)
+            BlendPairs<true>(pairs, isPlain, count, out);
+        else
+            BlendPairs<false>(pairs, isPlain, count, out);
+    }
+
+    struct Pairs {
+        const float *mixed, *shares; // from pixel `least` on
+        const int32_t* pixels;
+        const float* fractions;
+        int32_t least;
+    };
+
+    template <bool kPlainAndNear>
+    void BlendPairs(const Pairs& pairs, bool isPlain, int32_t count, float* out) const {
+        const auto& [mixed, shares, pixels, fractions, least] = pairs;
+        for (int32_t n = 0; n < count; n += kVectorPixels) {
+            const F32 fx = LoadOnePerBlock(fractions + n);
+            F32 left, right;
+            LoadSideBySide<kPlainAndNear>(mixed, pixels + n, least, left, right);
+            F32 sum = left + (right - left) * fx;
+            if (!kPlainAndNear && !isPlain) {
+                LoadSideBySide<false>(shares, pixels + n, least, left, right);
+                sum = FromBits(IsSeen(Max(left * (Floats(1) - fx), right * fx)) & Bits(sum));
+            }
+            StorePixels(out + 4 * n, Zero::kIsZero ? sum : sum + InterleavedZero(), count - n);
+        }
+    }
+
+    static I32 IsSeen(F32 shares) { return Less(Floats(0x1p-17f), BroadcastAlpha<AlphaPlace::last>(shares)); }
+
+    /// The pixels of some columns, and those right of them, of a row that begins with pixel `least`.
+    template <bool kNear>
+    [[gnu::always_inline]] static void LoadSideBySide(const float* line, const int32_t* pixels, int32_t least,
+                                                      F32& left, F32& right) {
+        if constexpr (kNear) {
+            const float* const near = line + 4 * int64_t{*pixels - least};
+            const I32 lanes =
+                ShiftLeft<2>(LoadOneIntPerBlock(pixels) - Ints(*pixels)) + PixelInts(0, 1, 2, 3);
+            left = LoadBlocksNear(near, lanes);
+            right = LoadBlocksNear(near + 4, lanes);
+        } else {
+            int32_t index[kVectorPixels];
+            for (int32_t i = 0; i < kVectorPixels; ++i) index[i] = pixels[i] - least;
+            left = LoadBlocksOf(line, index);
+            right = LoadBlocksOf(line + 4, index);
+        }
+    }
 
     /// Interleaved pixels as they are weighed: differences from the zeros, multiplied by alpha.
     static F32 LoadLevel(const uint8_t* pixels) {
@@ -343,23 +357,10 @@ struct Bilinear {
     static F32 InterleavedZero() { return Zero::kIsZero ? Floats(0) : PixelFloats(128, 128, 16, 0); }
 
     /// Places first, all of them, so that no load waits for what has just been stored.
-    void InsideByCells(const Places& places, int32_t count, float* out) const {
+    void Inside(const Places& places, int32_t count, float* out) const {
         alignas(64) float fx[kBlock], fy[kBlock];
-        alignas(64) int64_t offsets[kBlock];
-        FindInside(places, count, fx, fy, offsets);
-        for (int32_t n = 0; n < count; n += kLanes) {
-            Four pixels;
-            LoadNeighbours(Layout(), row.pixels, offsets + n, pixels[0], pixels[1]);
-            LoadNeighbours(Layout(), row.pixels + row.rowBytes, offsets + n, pixels[2], pixels[3]);
-            for (Channels& pixel : pixels) pixel = Prepare(pixel);
-            const Weighed weighed = Weigh(pixels, LoadFloats(fx + n), LoadFloats(fy + n));
-            StorePixels(out + 4 * n, Finish(weighed.sum, IsVisible(weighed)), count - n);
-        }
-    }
-
-    /// The fractions of the places, and the bytes from pixel (0, 0) to the upper left pixel of their cells.
-    void FindInside(const Places& places, int32_t count, float* fx, float* fy, int64_t* offsets) const {
         alignas(64) int32_t columns[kBlock], rows[kBlock];
+        alignas(64) int64_t offsets[kBlock];
         for (int32_t n = 0; n < count; n += kLanes) {
             const InnerCell x(places.x + n, row.left, row.right), y(places.y + n, row.top, row.bottom);
             Store(columns + n, x.first);
@@ -367,10 +368,36 @@ struct Bilinear {
             Store(fx + n, x.fraction);
             Store(fy + n, y.fraction);
         }
-        const int64_t rowBytes = row.rowBytes;
-        const int32_t end = (count + kLanes - 1) / kLanes * kLanes;
-        for (int32_t i = 0; i < end; ++i)
-            offsets[i] = rows[i] * rowBytes + int64_t{columns[i]} * Layout::kPixelBytes;
+        for (int32_t i = 0; i < WholeGroups(count); ++i)
+            offsets[i] = rows[i] * row.rowBytes + int64_t{columns[i]} * Layout::kPixelBytes;
+        BlendCells(
+            row.pixels, offsets, fx, [&](int32_t n) { return LoadFloats(fy + n); }, count, out);
+    }
+
+    /// The same between two rows.
+    void BlendCells(const LevelRows& rows, const int32_t* pixels, const float* fractions, int32_t count,
+                    float* out) const {
+        alignas(64) int64_t offsets[kBlock];
+        for (int32_t i = 0; i < WholeGroups(count); ++i)
+            offsets[i] = int64_t{pixels[i]} * Layout::kPixelBytes;
+        BlendCells(
+            rows.upper, offsets, fractions, [&](int32_t) { return Floats(rows.fraction); }, count, out);
+    }
+
+    static int32_t WholeGroups(int32_t count) { return (count + kLanes - 1) / kLanes * kLanes; }
+
+    /// Of four pixels each, the first at an offset in bytes.
+    template <class FractionOfRows>
+    void BlendCells(const uint8_t* base, const int64_t* offsets, const float* fx, FractionOfRows fy,
+                    int32_t count, float* out) const {
+        for (int32_t n = 0; n < count; n += kLanes) {
+            Four pixels;
+            LoadNeighbours(Layout(), base, offsets + n, pixels[0], pixels[1]);
+            LoadNeighbours(Layout(), base + row.rowBytes, offsets + n, pixels[2], pixels[3]);
+            for (Channels& pixel : pixels) pixel = Prepare(pixel);
+            const Weighed weighed = Weigh(pixels, LoadFloats(fx + n), fy(n));
+            StorePixels(out + 4 * n, Finish(weighed.sum, IsVisible(weighed)), count - n);
+        }
     }
 
     /// Inside the source a pixel is seen as soon as one of the four is.

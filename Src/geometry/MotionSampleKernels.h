@@ -14,6 +14,24 @@ struct ResampleTable {
     int32_t width;
 };
 
+/// first to inner is sampled with a look at the edges of the source, as is right to end; what is between lies inside.
+struct MotionParts {
+    int32_t first, inner, right, end;
+
+    bool operator==(const MotionParts&) const = default;
+};
+
+/// Where the columns of rows that are not turned lie in the source, the same for all rows of a band. The first of them that
+/// is sampled fills it.
+struct MotionColumns {
+    static constexpr int32_t kMore = 16; // that are written behind the last one
+
+    int32_t* pixels;  // for each column the first pixel that it takes
+    int32_t* weights; // bits of its fraction of the way to the next one, or the phase of a table
+    MotionParts parts = {0, 0, 0, 0};
+    bool areNear = false; // those of a vector are no further apart than it is wide
+};
+
 struct MotionRow {
     const uint8_t* pixels; // column 0 of row 0, which need not be in the rectangle
     int64_t rowBytes;
@@ -24,6 +42,7 @@ struct MotionRow {
     bool rotated;                   // else y is the same for all columns
     bool smoothEdges;               // what lies outside is transparent; else the nearest pixel stands for it
     ResampleTable kernelX, kernelY; // only read at the highest quality
+    MotionColumns* shared;          // by the rows of a band; not read where they are turned
 };
 
 /// The columns that the source reaches. Others are not written.
@@ -33,11 +52,6 @@ struct MotionSpan {
 
 /// \param line  a pixel of four floats for each column.
 using SampleMotionRow = MotionSpan (*)(const MotionRow& row, float* line);
-
-/// first to inner is sampled with a look at the edges of the source, as is right to end; what is between lies inside.
-struct MotionParts {
-    int32_t first, inner, right, end;
-};
 
 /// \param margin  that a place inside keeps from the edges, and that one outside may have.
 MotionParts PartsOfRow(const MotionRow& row, int32_t margin) noexcept;

@@ -30,20 +30,23 @@ PK_Result BlurredSource::Blur(int32_t pass, MotionSourceRows& blurred) const {
     const PK_Rect& crop = fJob.crop;
     const MotionSourceRows from = ChooseMotionRows(fJob, fSource, crop.left, crop.top, pass);
     const int32_t width = crop.right - crop.left, height = HeightOf(from);
+    PK_Rect lies = from.rectangle;
+    lies.bottom = lies.top + height;
+    blurred = from;
+    blurred.rectangle = lies;
+    if (height < 1) return PK_Success; // no rows, which are not read
     const int32_t direction = (fBlur.x > 0 ? 1 : 0) + (fBlur.y > 0 ? 2 : 0);
     if (const PK_Result result =
-            BlurForMotion(from.pixels, static_cast<int32_t>(from.rowBytes), width, height, fJob.source.format,
-                          fBuffer.Pixels(), fBuffer.RowBytes(), fWidth, fHeight, fFormat, fBlur.x, fBlur.y,
+            BlurForMotion(from.pixels, from.rowBytes, width, height, fJob.source.format, fBuffer.Pixels(),
+                          fBuffer.RowBytes(), fWidth, height + 2 * fMarginY, fFormat, fBlur.x, fBlur.y,
                           !fJob.smoothEdges, sMotionBlurLinear != 0, true, direction, fJob.quality))
         return result;
-    const PK_Rect& lies = from.rectangle;
-    const int64_t above = lies.top - (fHeight - height) / 2, before = lies.left - (fWidth - width) / 2;
-    blurred = {fBuffer.Pixels() - above * fBuffer.RowBytes() - before * BytesOfRow(fFormat, 1),
-               fBuffer.RowBytes(),
-               fFormat,
-               {lies.left - fMarginX, lies.top - fMarginY, lies.right + fMarginX, lies.bottom + fMarginY},
-               from.isSameLine,
-               from.firstRow};
+    blurred.rectangle = {lies.left - fMarginX, lies.top - fMarginY, lies.right + fMarginX,
+                         lies.bottom + fMarginY};
+    blurred.pixels = fBuffer.Pixels() - int64_t{blurred.rectangle.top} * fBuffer.RowBytes() -
+                     int64_t{blurred.rectangle.left} * static_cast<int64_t>(BytesOfRow(fFormat, 1));
+    blurred.rowBytes = fBuffer.RowBytes();
+    blurred.format = fFormat;
     return PK_Success;
 }
 
@@ -52,7 +55,7 @@ int32_t BlurredSource::RowsOfCrop() const {
     return IsInterlaced(fJob.sourceField) ? crop.bottom / 2 - crop.top / 2 : crop.bottom - crop.top;
 }
 
-/// The later field of a crop may have one row less.
+/// A field of an odd crop may end a row early, or have none.
 int32_t BlurredSource::HeightOf(const MotionSourceRows& rows) const {
     if (!IsInterlaced(fJob.sourceField)) return RowsOfCrop();
     return std::min(RowsOfCrop(), (fJob.crop.bottom - rows.firstRow + 1) / 2);

@@ -50,46 +50,50 @@ private:
     F32 fGroup, fFourSteps;
 };
 
-/// Goes over count columns in blocks: use(columns of the block).
-template <class Use>
-void InBlocks(int32_t count, Use use) {
-    for (; count > 0; count -= kBlock) use(count < kBlock ? count : kBlock);
-}
+/// Goes along a row in blocks, which are given to use(columns) one after the other, their places in `places`.
+class RowWalk {
+public:
+    RowWalk(const MotionRow& row, int32_t first)
+        : fX{row.x, row.stepX}, fY{row.y, row.rotated ? row.stepY : 0}, fIsTurned(row.rotated) {
+        Skip(first);
+    }
 
-/// A sampler has kMargin, and makes pixels of places: Edge(places, count, out), Inside(places, count, out).
-template <class Sampler>
-MotionSpan SampleRow(const MotionRow& row, float* line) {
-    const MotionParts parts = PartsOfRow(row, Sampler::kMargin);
-    const MotionSpan span = {parts.first, parts.end - parts.first};
-    if (span.count < 1) return span;
-    const Sampler sampler(row);
-    Axis x = {row.x, row.stepX}, y = {row.y, row.rotated ? row.stepY : 0};
-    x.Skip(parts.first);
-    y.Skip(parts.first);
-    float* out = line + 4 * int64_t{parts.first};
-    Places places;
-    const auto sampleEdge = [&](int32_t columns) {
+    void Skip(int32_t columns) {
+        fX.Skip(columns);
+        fY.Skip(columns);
+    }
+
+    template <class Use>
+    void OneByOne(int32_t columns, Use use) {
         InBlocks(columns, [&](int32_t count) {
-            x.OneByOne(places.x, count);
-            y.OneByOne(places.y, count);
-            sampler.Edge(places, count, out);
-            out += 4 * count;
+            fX.OneByOne(places.x, count);
+            fY.OneByOne(places.y, count);
+            use(count);
         });
-    };
-    sampleEdge(parts.inner - parts.first);
-    ByFours fourX(x), fourY(y);
-    fourY.Take(places.y, kBlock);
-    InBlocks(parts.right - parts.inner, [&](int32_t count) {
-        fourX.Take(places.x, count);
-        sampler.Inside(places, count, out);
-        if (row.rotated) fourY.Take(places.y, kBlock);
-        out += 4 * count;
-    });
-    x.Skip(parts.right - parts.inner);
-    y.Skip(parts.right - parts.inner);
-    sampleEdge(parts.end - parts.right);
-    return span;
-}
+    }
+
+    template <class Use>
+    void ByFours(int32_t columns, Use use) {
+        PK_TARGET::ByFours x(fX), y(fY);
+        InBlocks(columns, [&](int32_t count) {
+            x.Take(places.x, count);
+            if (fIsTurned) y.Take(places.y, count);
+            use(count);
+        });
+        Skip(columns);
+    }
+
+    Places places;
+
+private:
+    template <class Use>
+    static void InBlocks(int32_t count, Use use) {
+        for (; count > 0; count -= kBlock) use(count < kBlock ? count : kBlock);
+    }
+
+    Axis fX, fY;
+    bool fIsTurned;
+};
 
 /// As many pixels of a group as there are.
 [[gnu::always_inline]] inline void StorePixels(float* out, const Channels& pixels, int32_t count) {
@@ -113,9 +117,17 @@ inline I32 Floor(F32 x) {
 }
 
 /// The last of so many numbers once more up to the end of the group.
-template <class Number>
-inline void FillGroup(Number* numbers, int32_t count) {
+inline void FillGroup(int32_t* numbers, int32_t count) {
     for (int32_t i = count; i % kLanes != 0; ++i) numbers[i] = numbers[count - 1];
+}
+
+/// Whether, of so many numbers in whole groups, those for the pixels of each vector are at least the first and no more
+/// than its width above it.
+inline bool AreNear(const int32_t* numbers, int32_t count) {
+    I32 far = Ints(0);
+    for (int32_t n = 0; n < count; n += kVectorPixels)
+        far = far | (LoadOneIntPerBlock(numbers + n) - Ints(numbers[n]));
+    return !AnyNegative(Ints(kVectorPixels - 1) - far) && !AnyNegative(far);
 }
 
 /// From each group of four lanes the one that wins against the other three.
@@ -155,6 +167,79 @@ inline void ByVectors(int32_t floats, Use use) {
     int32_t at = 0;
     for (; at + kLanes <= floats; at += kLanes) use(at);
     if (at < floats) use(floats - kLanes);
+}
+
+/// A sampler has kMargin and makes pixels of places: Edge(places, count, out), Inside(places, count, out). Of a row that is
+/// not turned it finds the columns, Locate(places, pixels, weights, count), and makes pixels of them: Level(columns from
+/// the first that were found, count, out); of those inside, or at the edges too if it kFindsEdges.
+template <class Sampler>
+class RowSampler {
+public:
+    RowSampler(const MotionRow& row, const MotionParts& parts, float* line)
+        : fRow(row), fParts(parts), fSampler(row), fWalk(row, parts.first),
+          fOut(line + 4 * int64_t{parts.first}) {}
+
+    void Run() {
+        const int32_t left = fParts.inner - fParts.first, inside = fParts.right - fParts.inner,
+                      right = fParts.end - fParts.right;
+        if (fRow.rotated) {
+            Edge(left);
+            fWalk.ByFours(inside, [&](int32_t count) {
+                fSampler.Inside(fWalk.places, count, fOut);
+                fOut += 4 * count;
+            });
+            Edge(right);
+        } else if constexpr (Sampler::kFindsEdges) {
+            if (!(fRow.shared->parts == fParts)) Locate(left, inside, right);
+            fSampler.Level(left + inside + right, fOut);
+        } else {
+            Edge(left);
+            if (!(fRow.shared->parts == fParts)) Locate(0, inside, 0);
+            fSampler.Level(inside, fOut);
+            fOut += int64_t{4} * inside;
+            fWalk.Skip(inside);
+            Edge(right);
+        }
+    }
+
+private:
+    void Edge(int32_t columns) {
+        fWalk.OneByOne(columns, [&](int32_t count) {
+            fSampler.Edge(fWalk.places, count, fOut);
+            fOut += 4 * count;
+        });
+    }
+
+    void Locate(int32_t left, int32_t inside, int32_t right) {
+        MotionColumns& shared = *fRow.shared;
+        RowWalk walk = fWalk;
+        int32_t found = 0;
+        const auto locate = [&](int32_t count) {
+            fSampler.Locate(walk.places.x, shared.pixels + found, shared.weights + found, count);
+            found += count;
+        };
+        walk.OneByOne(left, locate);
+        walk.ByFours(inside, locate);
+        walk.OneByOne(right, locate);
+        FillGroup(shared.pixels, found);
+        FillGroup(shared.weights, found);
+        shared.areNear = AreNear(shared.pixels, found);
+        shared.parts = fParts;
+    }
+
+    const MotionRow& fRow;
+    const MotionParts& fParts;
+    const Sampler fSampler;
+    RowWalk fWalk;
+    float* fOut;
+};
+
+template <class Sampler>
+MotionSpan SampleRow(const MotionRow& row, float* line) {
+    const MotionParts parts = PartsOfRow(row, Sampler::kMargin);
+    const MotionSpan span = {parts.first, parts.end - parts.first};
+    if (span.count > 0) RowSampler<Sampler>(row, parts, line).Run();
+    return span;
 }
 
 } // namespace PK::PK_TARGET

@@ -5,6 +5,9 @@
 
 #include <libyuv.h>
 
+#include <memory>
+#include <vector>
+
 namespace OperationBench {
 namespace {
 
@@ -71,6 +74,19 @@ Run Enlarge(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// The same, and then all samples.
+Run EnlargeToFloats(const uint8_t* source, uint8_t* destination) {
+    const auto scaled = std::make_shared<std::vector<uint8_t>>(4 * static_cast<size_t>(kPixels));
+    return [=, enlarge = Enlarge(source, scaled->data())] {
+        enlarge();
+        for (int32_t row = 0; row < kHeight; ++row) {
+            const ptrdiff_t at = ptrdiff_t{row} * kBGRARowBytes;
+            libyuv::ByteToFloat(scaled->data() + at, reinterpret_cast<float*>(destination) + at, 1.0F / 255,
+                                kBGRARowBytes);
+        }
+    };
+}
+
 const AddPeers add = {
     {"Premultiplied BGRA 8u over opaque at full opacity", "libyuv ARGBBlend", false, Blend},
     {"Premultiplied BGRA 8u over premultiplied at full opacity", "libyuv ARGBBlend", false, Blend},
@@ -78,7 +94,8 @@ const AddPeers add = {
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"Placing of BGRP 8u at twice the size, bilinear", "libyuv ARGBScale", false, Enlarge},
-    {"Placing of BGRP 8u at twice the size to 32f, bilinear", "libyuv ARGBScale (to 8u)", false, Enlarge},
+    {"Placing of BGRP 8u at twice the size to 32f, bilinear", "libyuv ARGBScale, ByteToFloat", false,
+     EnlargeToFloats},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
     {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
     {"Transpose pixels of 1 byte", "libyuv TransposePlane", true, TransposeBytes},
