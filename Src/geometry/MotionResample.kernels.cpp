@@ -3,6 +3,8 @@
 
 #include "geometry/MotionWalk.h"
 
+#include <utility>
+
 namespace PK::PK_TARGET {
 namespace {
 
@@ -72,20 +74,21 @@ struct TapSums {
         for (F32& sum : sums) sum = Zero();
     }
 
-    /// Taps come in pairs.
-    void Add(const float* pixels, const float* weights, int32_t taps) {
-        int32_t tap = 0;
-        for (; tap + kTogether <= taps; tap += kTogether)
-            for (int32_t i = 0; i < kVectors; ++i)
-                AddVector(i, LoadFloats(pixels + tap * kPixelFloats + i * kLanes), weights + tap);
-        if (tap == taps) return;
-        constexpr int32_t kPair = 2, kPairVectors = kVectors == 1 ? 1 : kVectors / 2;
-        for (int32_t i = 0; i < kPairVectors; ++i)
-            AddVector(i, LoadFirstBlocks<kPair>(pixels + tap * kPixelFloats + i * kLanes), weights + tap);
+    /// Taps come in pairs. kTaps is their number where it is known.
+    template <int32_t kTaps>
+    [[gnu::always_inline]] void Add(const float* pixels, const float* weights, int32_t taps) {
+        if constexpr (kTaps > 0) {
+            AddGroups(pixels, weights, std::make_integer_sequence<int32_t, kTaps / kTogether>());
+            if constexpr (kTaps % kTogether != 0) AddPair(pixels, weights, kTaps / kTogether * kTogether);
+        } else {
+            int32_t tap = 0;
+            for (; tap + kTogether <= taps; tap += kTogether) AddGroup(pixels, weights, tap);
+            if (tap < taps) AddPair(pixels, weights, tap);
+        }
     }
 
     /// The sums of a row by its weight.
-    void Add(const TapSums& row, F32 weight) {
+    [[gnu::always_inline]] void Add(const TapSums& row, F32 weight) {
         for (int32_t i = 0; i < kVectors; ++i) sums[i] = sums[i] + row.sums[i] * weight;
     }
 
@@ -100,7 +103,24 @@ struct TapSums {
     }
 
 private:
-    void AddVector(int32_t i, F32 pixels, const float* weights) {
+    template <int32_t... kGroups>
+    [[gnu::always_inline]] void AddGroups(const float* pixels, const float* weights,
+                                          std::integer_sequence<int32_t, kGroups...>) {
+        (AddGroup(pixels, weights, kTogether * kGroups), ...);
+    }
+
+    [[gnu::always_inline]] void AddGroup(const float* pixels, const float* weights, int32_t tap) {
+        for (int32_t i = 0; i < kVectors; ++i)
+            AddVector(i, LoadFloats(pixels + tap * kPixelFloats + i * kLanes), weights + tap);
+    }
+
+    [[gnu::always_inline]] void AddPair(const float* pixels, const float* weights, int32_t tap) {
+        constexpr int32_t kPair = 2, kPairVectors = kVectors == 1 ? 1 : kVectors / 2;
+        for (int32_t i = 0; i < kPairVectors; ++i)
+            AddVector(i, LoadFirstBlocks<kPair>(pixels + tap * kPixelFloats + i * kLanes), weights + tap);
+    }
+
+    [[gnu::always_inline]] void AddVector(int32_t i, F32 pixels, const float* weights) {
         sums[i] = sums[i] + pixels * LoadOnePerBlock(weights + i * kVectorPixels);
     }
 };
@@ -117,8 +137,25 @@ struct HighQuality {
     void Inside(const Places& places, int32_t count, float* out) const {
         const Reaches x(places.x, count, row.left, row.right, weightsX.Taps());
         const Reaches y(places.y, count, row.top, row.bottom, weightsY.Taps());
-        Put(count, out,
-            [&](int32_t i) { return SumOfArea(x.first[i], x.phase[i], y.first[i], y.phase[i]).Total(); });
+        WithTaps([&]<int32_t kTaps>() {
+            Put(count, out,
+                [&](int32_t i) { return SumOfArea<kTaps>(x.first[i], x.phase[i], y.first[i], y.phase[i]); });
+        });
+    }
+
+    /// Calls use with the number of taps if it is one of those that tables mostly have, else with 0.
+    template <class Use>
+    void WithTaps(Use use) const {
+        switch (weightsX.Taps()) {
+        case 4: // whatever gets larger
+            return use.template operator()<4>();
+        case 6:
+            return use.template operator()<6>();
+        case 8: // at half the size
+            return use.template operator()<8>();
+        default:
+            return use.template operator()<0>();
+        }
     }
 
     static constexpr bool kFindsEdges = true;
@@ -147,7 +184,7 @@ struct HighQuality {
                 SumRows(rows.first[0], rows.phase[0], range, pixels, phases, count, to);
             else
                 Put(count, to, [&](int32_t i) {
-                    return SumOfArea(pixels[i], phases[i], rows.first[0], rows.phase[0]).Total();
+                    return SumOfArea<0>(pixels[i], phases[i], rows.first[0], rows.phase[0]);
                 });
         }
     }
@@ -159,11 +196,13 @@ struct HighQuality {
                  const int32_t* phases, int32_t count, float* out) const {
         alignas(64) float sums[kMostColumns * kPixelFloats];
         AddRows(firstLine, phase, range.least, range.most - range.least + weightsX.Taps(), sums);
-        Put(count, out, [&](int32_t i) {
-            TapSums taps;
-            taps.Add(sums + int64_t{pixels[i] - range.least} * kPixelFloats, weightsX.Phase(phases[i]),
-                     weightsX.Taps());
-            return taps.Total();
+        WithTaps([&]<int32_t kTaps>() {
+            Put(count, out, [&](int32_t i) {
+                TapSums taps;
+                taps.Add<kTaps>(sums + int64_t{pixels[i] - range.least} * kPixelFloats,
+                                weightsX.Phase(phases[i]), weightsX.Taps());
+                return taps.Total();
+            });
         });
     }
 
@@ -221,27 +260,46 @@ struct HighQuality {
         std::memcpy(sums, last, bytes);
     }
 
-    /// An area of its own for one pixel.
-    TapSums SumOfArea(int32_t first, int32_t phase, int32_t firstLine, int32_t phaseOfLines) const {
+    /// An area of its own for one pixel: a vector whose blocks add up to it.
+    template <int32_t kTaps>
+    [[gnu::always_inline]] F32 SumOfArea(int32_t first, int32_t phase, int32_t firstLine,
+                                         int32_t phaseOfLines) const {
         const int32_t taps = weightsX.Taps();
-        const Overlap inside(row, first, taps);
         const float* const weights = weightsX.Phase(phase);
+        const float* const weightsOfLines = weightsY.Phase(phaseOfLines);
+        const int32_t begin = firstLine < row.top ? row.top - firstLine : 0;
+        const int32_t end =
+            row.bottom - firstLine < weightsY.Taps() ? row.bottom - firstLine : weightsY.Taps();
+        if (first < row.left || first + taps > row.right)
+            return SumOfPart(first, weights, firstLine, weightsOfLines, begin, end);
         TapSums sum;
-        for (int32_t tap = 0; tap < weightsY.Taps() && inside.begin < inside.end; ++tap) {
-            const int32_t line = firstLine + tap;
-            if (line < row.top || line >= row.bottom) continue;
+        const float* pixels = PixelAt(first, firstLine + begin);
+        for (int32_t tap = begin; tap < end; ++tap, pixels = NextLine(pixels)) {
             TapSums ofRow;
-            if (inside.end - inside.begin == taps) {
-                ofRow.Add(PixelAt(first, line), weights, taps);
-            } else {
-                alignas(64) float pixels[kMostTaps * kPixelFloats] = {};
-                std::memcpy(pixels + inside.begin * kPixelFloats, PixelAt(first + inside.begin, line),
-                            static_cast<size_t>(inside.end - inside.begin) * kPixelBytes);
-                ofRow.Add(pixels, weights, taps);
-            }
-            sum.Add(ofRow, Floats(weightsY.Phase(phaseOfLines)[tap]));
+            ofRow.Add<kTaps>(pixels, weights, taps);
+            sum.Add(ofRow, Floats(weightsOfLines[tap]));
         }
-        return sum;
+        return sum.Total();
+    }
+
+    /// The same of an area that has columns outside the source, or all.
+    [[gnu::noinline]] F32 SumOfPart(int32_t first, const float* weights, int32_t firstLine,
+                                    const float* weightsOfLines, int32_t begin, int32_t end) const {
+        const Overlap inside(row, first, weightsX.Taps());
+        TapSums sum;
+        for (int32_t tap = begin; tap < end && inside.begin < inside.end; ++tap) {
+            alignas(64) float pixels[kMostTaps * kPixelFloats] = {};
+            std::memcpy(pixels + inside.begin * kPixelFloats, PixelAt(first + inside.begin, firstLine + tap),
+                        static_cast<size_t>(inside.end - inside.begin) * kPixelBytes);
+            TapSums ofRow;
+            ofRow.Add<0>(pixels, weights, weightsX.Taps());
+            sum.Add(ofRow, Floats(weightsOfLines[tap]));
+        }
+        return sum.Total();
+    }
+
+    const float* NextLine(const float* pixels) const {
+        return reinterpret_cast<const float*>(reinterpret_cast<const uint8_t*>(pixels) + row.rowBytes);
     }
 
     /// total(column) is a vector whose blocks add up to its pixel. Alpha is limited to 0 to 1, not-a-number becoming 0;
