@@ -7,6 +7,7 @@
 #include "geometry/MotionSampleKernels.h"
 #include "reference/ReferenceMotionSample.h"
 #include "support/Allocations.h"
+#include "support/ColumnsOfBand.h"
 #include "support/GuardedRows.h"
 #include "support/Random.h"
 #include "support/Samples.h"
@@ -139,8 +140,13 @@ Sampled SampleRow(SampleMotionRow sample, const MotionRow& row, Guard guard = Gu
     const GuardedRows memory(16 * columns, guard);
     auto* const line = reinterpret_cast<float*>(memory.Bytes());
     std::fill_n(line, 4 * columns, kUntouched);
-    Sampled sampled = {sample(row, line), std::vector<Pixel>(columns)};
+    ColumnsOfBand band(row.columns);
+    MotionRow ofBand = row;
+    ofBand.shared = band.Shared();
+    Sampled sampled = {sample(ofBand, line), std::vector<Pixel>(columns)};
     if (columns > 0) std::memcpy(sampled.line.data(), line, 16 * columns);
+    sample(ofBand, line); // like a further row of the band
+    EXPECT_TRUE(columns == 0 || std::memcmp(sampled.line.data(), line, 16 * columns) == 0);
     return sampled;
 }
 
@@ -404,6 +410,8 @@ TEST(MotionSample, TakesNoMemory) {
         MotionRow row = RowOf(crop.Source(true), {{0, 20}, {50.0f / 40000, 0}, 40000, false});
         row.kernelX = row.kernelY = {table.Weights(), table.Width()};
         const SampleMotionRow sample = ChooseMotionSampler(PK_PixelFormat_BGRP_4444_32f_Linear, quality);
+        ColumnsOfBand band(row.columns);
+        row.shared = band.Shared();
         const int before = AllocationCount();
         const MotionSpan span = sample(row, line.data());
         EXPECT_EQ(AllocationCount(), before);

@@ -117,6 +117,48 @@ PK_Rect Grown(const PK_Rect& r, int32_t by) {
     return {r.left - by, r.top - by, r.right + by, r.bottom + by};
 }
 
+template <class Real>
+std::array<Real, 4> WithZeros(std::array<Real, 4> pixel, const Layout& layout) {
+    if (layout.hasVideoZero)
+        for (int c = 0; c < 3; ++c) pixel[static_cast<size_t>(c)] += Real(layout.Zero(c));
+    return pixel;
+}
+
+/// By blocks of 128 columns that go over no more than 256 of the source.
+void MarkMixed(std::vector<MotionPlace>& places, int32_t begin, int32_t end) {
+    const auto pixel = [](const MotionPlace& place) { return std::floor(place.at.x - 0.5f); };
+    for (int32_t block = begin; block < end; block += 128) {
+        const auto first = places.begin() + block, last = places.begin() + std::min(block + 128, end);
+        const auto [least, most] = std::minmax_element(
+            first, last, [&](const MotionPlace& a, const MotionPlace& b) { return pixel(a) < pixel(b); });
+        const bool isMixed = pixel(*most) - pixel(*least) <= 256;
+        std::for_each(first, last, [isMixed](MotionPlace& place) { place.isMixed = isMixed; });
+    }
+}
+
+/// Pixels of two rows as they are weighed, premultiplied where alpha is.
+template <class Real>
+std::array<Real, 4> Mix(const std::array<Neighbour<Real>, 4>& n, const MotionSource& source, Real fx,
+                        Real fy) {
+    const Layout layout(source.format);
+    const Real scale = Real(1.0f / layout.full);
+    const auto weighed = [&](size_t k, size_t c) {
+        const Real alpha = n[k].channels[3];
+        if (c == 3 || (source.format & kAlpha) != kStraight) return n[k].channels[c];
+        return n[k].channels[c] * (alpha * scale);
+    };
+    const auto between = [](Real a, Real b, Real way) { return a + (b - a) * way; };
+    std::array<Real, 4> sum;
+    for (size_t c = 0; c < 4; ++c)
+        sum[c] =
+            between(between(weighed(0, c), weighed(2, c), fy), between(weighed(1, c), weighed(3, c), fy), fx);
+    const auto share = [&](size_t upper, size_t lower, Real way) {
+        return std::max(n[upper].channels[3] * (1 - fy), n[lower].channels[3] * fy) * way;
+    };
+    if (std::max(share(0, 2, 1 - fx), share(1, 3, fx)) <= Real(0x1p-17)) sum = {};
+    return sum;
+}
+
 } // namespace
 
 MotionPlaces WalkMotionLine(const PK_Rect& rect, const MotionLine& line, int32_t margin) {
@@ -145,6 +187,7 @@ MotionPlaces WalkMotionLine(const PK_Rect& rect, const MotionLine& line, int32_t
             walk.places.push_back({{before.x + step.x * 4, before.y + step.y * 4}, true});
         }
     }
+    if (!line.rotated) MarkMixed(walk.places, inner - start, right - start);
     const auto passed = static_cast<float>(right - inner);
     at = {at.x + step.x * passed, at.y + step.y * passed};
     for (int32_t i = right; i < end; ++i, at = {at.x + step.x, at.y + step.y})
@@ -165,6 +208,7 @@ std::array<Real, 4> SampleBilinear(const MotionSource& source, const MotionPlace
         Replace(n[0], n[1], before[2], before[3]);
         Replace(n[2], n[3], before[0], before[1]);
     }
+    if (place.isMixed) return WithZeros(Mix(n, source, fx, fy), Layout(source.format));
     const std::array<Real, 4> weights = {(1 - fx) * (1 - fy), fx * (1 - fy), (1 - fx) * fy, fx * fy};
     const Layout layout(source.format);
     const Real scale = Real(1.0f / layout.full);
@@ -182,9 +226,7 @@ std::array<Real, 4> SampleBilinear(const MotionSource& source, const MotionPlace
     }
     const bool isVisible = place.isInside ? anyShows : sum[3] - Real(8e-6f) > 0;
     if (!isVisible) sum = {};
-    if (layout.hasVideoZero)
-        for (int c = 0; c < 3; ++c) sum[static_cast<size_t>(c)] += Real(layout.Zero(c));
-    return sum;
+    return WithZeros(sum, layout);
 }
 
 template std::array<float, 4> SampleBilinear(const MotionSource&, const MotionPlace&);

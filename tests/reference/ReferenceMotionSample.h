@@ -26,10 +26,12 @@ struct MotionLine {
     bool rotated;
 };
 
-/// Where a column lies, and whether far from all edges.
+/// Where a column lies, and whether far from all edges. Where a row that is not turned has columns that are close enough,
+/// the two rows that it lies between are mixed first.
 struct MotionPlace {
     PK_Point at;
     bool isInside;
+    bool isMixed = false;
 };
 
 struct MotionPlaces {

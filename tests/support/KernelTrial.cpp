@@ -20,6 +20,7 @@
 #include "primitives/MultiplyConstant.h"
 #include "primitives/TransposeKernels.h"
 #include "scale/QuarterScaleKernels.h"
+#include "support/ColumnsOfBand.h"
 #include "support/Random.h"
 
 #include <algorithm>
@@ -372,6 +373,8 @@ KernelTrial MotionTrial(const KernelRow& kernel, int32_t size, Random& random) {
                 MotionRow here = row;
                 here.pixels = sources[0];
                 here.kernelX = here.kernelY = {table->Weights(), table->Width()};
+                ColumnsOfBand band(size);
+                here.shared = band.Shared();
                 const MotionSpan span = run(here, reinterpret_cast<float*>(destination));
                 const float told[] = {static_cast<float>(span.first), static_cast<float>(span.count)};
                 std::memcpy(destination + 16 * Count(size), told, sizeof told);
