@@ -32,8 +32,14 @@ extern "C" {
 /// Result. With \p composite each row goes over the destination as PK_CompositeWithBlendMode lays it, mode Normal. Else it
 /// replaces what is there, faded by PK_AlphaGain where the opacity is below 1 - 8e-6.
 ///
-/// Memory: row bytes may be of either sign; no alignment is asked for. Nothing outside the crop is read, and no source
-/// pixel where there is nothing to draw. Source and destination must not overlap.
+/// Crop. Nothing outside it is read or seen, with three exceptions: fields of an interlaced source have half of its rows from
+/// half of its top, rounded down, so that below an odd top the row above shows; at quality 5 such a source is made
+/// progressive as a whole; and a source that lies pixel on pixel on the whole destination is copied whole.
+///
+/// Destinations of pairs or groups of pixels (4:2:2, V210): those that are covered in part keep the pixels beside, the chroma
+/// of a pair becoming that of both.
+///
+/// Memory: row bytes may be of either sign; no alignment is asked for. Source and destination must not overlap.
 ///
 /// Threads: more than 32 rows are a task on all processors. May be called from any number of threads at the same time on
 /// different destinations. PK_Initialize must have been called. The floating-point mode is that of PK_Convert, and the
@@ -64,7 +70,8 @@ extern "C" {
 /// \param softness           0 to 1.
 /// \param smoothEdges        edges of the source fade.
 /// \param renderField        0: all rows.
-/// \param quality            render quality, 0 to 5. Above 4, sources other than premultiplied 32f RGB have 4.
+/// \param quality            render quality, 0 to 5. Above 4, sources other than premultiplied 32f RGB have 4; for those, a
+///                           number above 5 is like 4.
 /// \param compositeInLinear  as for PK_CompositeWithBlendMode.
 /// \return
 ///  - PK_ErrBadRect: \p srcRect is empty, inverted or not inside the source.

@@ -2,6 +2,7 @@
 #include "geometry/MotionPlacement.h"
 #include "support/AlignedPicture.h"
 #include "support/FloatEnvironment.h"
+#include "support/PlaceCall.h"
 #include "support/Random.h"
 #include "support/Targets.h"
 
@@ -13,7 +14,6 @@
 #include <cmath>
 #include <cstring>
 #include <limits>
-#include <optional>
 
 namespace {
 
@@ -22,28 +22,6 @@ using namespace PKTest;
 constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u, kBGRP = PK_PixelFormat_BGRP_4444_8u,
                          kBGRX = PK_PixelFormat_BGRX_4444_8u, kFloats = PK_PixelFormat_BGRP_4444_32f,
                          kLinear = PK_PixelFormat_BGRP_4444_32f_Linear;
-
-/// What a call asks for beside its images; the defaults lay the source in the middle of the destination.
-struct Call {
-    int32_t sourceField = 0, destinationField = 0;
-    std::optional<PK_Rect> crop;
-    uint32_t aspectNum = 1, aspectDen = 1;
-    PK_Point position = {0.5f, 0.5f}, anchor = {0.5f, 0.5f}, scale = {1, 1}; // y from the bottom
-    double rotation = 0;
-    float opacity = 1;
-    bool composite = false;
-    double softness = 0;
-    bool smoothEdges = false;
-    int32_t renderField = 0, quality = 2;
-
-    PK_Result operator()(const AlignedPicture& source, AlignedPicture& destination) const {
-        return PK_Motion(source.Pixels(), source.RowBytes(), source.width, source.height, source.format,
-                         sourceField, crop ? &*crop : nullptr, destination.Pixels(), destination.RowBytes(),
-                         destination.width, destination.height, destination.format, destinationField,
-                         aspectNum, aspectDen, position, anchor, scale, rotation, opacity, composite,
-                         softness, smoothEdges, renderField, quality, false);
-    }
-};
 
 /// The same bytes in every row.
 bool AreEqual(const AlignedPicture& a, const AlignedPicture& b) {
@@ -73,7 +51,7 @@ TEST(MotionCall, APictureOnItselfIsConverted) {
         for (const int32_t quality : {1, 4, 5}) {
             const AlignedPicture source = RandomPicture(kBGRA, 33, 21, random);
             AlignedPicture expected(to, 33, 21), actual(to, 33, 21);
-            Call call;
+            PlaceCall call;
             call.quality = quality;
             ASSERT_EQ(call(source, actual), PK_Success);
             ASSERT_EQ(PK_Convert(source.Pixels(), source.RowBytes(), kBGRA, expected.Pixels(),
@@ -88,7 +66,7 @@ TEST(MotionCall, AMoveByWholePixelsCopiesThem) {
     const AlignedPicture source = RandomPicture(kBGRA, 40, 30, random);
     AlignedPicture destination = RandomPicture(kBGRA, 40, 30, random);
     const AlignedPicture before = destination;
-    Call call;
+    PlaceCall call;
     call.position = {0.5f + 7.0f / 40, 0.5f - 3.0f / 30}; // right and down
     ASSERT_EQ(call(source, destination), PK_Success);
     for (int32_t row = 0; row < 30; ++row) {
@@ -107,7 +85,7 @@ TEST(MotionCall, NothingIsDrawnOfWhatIsNotThere) {
     AlignedPicture destination = RandomPicture(kBGRA, 8, 8, random);
     const AlignedPicture before = destination;
     for (int which = 0; which < 5; ++which) {
-        Call call;
+        PlaceCall call;
         call.quality = which == 4 ? 99 : 2;
         if (which == 0 || which == 4) call.opacity = 7e-6f;
         if (which == 1) call.scale.x = 0;
@@ -124,11 +102,11 @@ TEST(MotionCall, ChecksItsArgumentsInOrder) {
     AlignedPicture destination(kBGRA, 8, 6);
     for (const PK_Rect& bad :
          {PK_Rect{0, 0, 9, 6}, {0, 0, 8, 7}, {-1, 0, 8, 6}, {0, -1, 8, 6}, {4, 0, 4, 6}, {0, 5, 8, 5}}) {
-        Call call;
+        PlaceCall call;
         call.crop = bad;
         EXPECT_EQ(call(source, destination), PK_ErrBadRect);
     }
-    Call call;
+    PlaceCall call;
     call.crop = PK_Rect{0, 0, 8, 6};
     EXPECT_EQ(call(source, destination), PK_Success);
     call.softness = -0.01;
@@ -139,9 +117,9 @@ TEST(MotionCall, ChecksItsArgumentsInOrder) {
     EXPECT_EQ(call(source, destination), PK_ErrBadMotionParameter) << "before the opacity is looked at";
 
     const AlignedPicture pairs(PK_PixelFormat_UYVY_422_8u, 8, 6), three(PK_PixelFormat_RGB_444_10u, 8, 6);
-    EXPECT_EQ(Call()(pairs, destination), PK_ErrBadSrcFormat);
-    EXPECT_EQ(Call()(three, destination), PK_ErrBadSrcFormat);
-    Call highest;
+    EXPECT_EQ(PlaceCall()(pairs, destination), PK_ErrBadSrcFormat);
+    EXPECT_EQ(PlaceCall()(three, destination), PK_ErrBadSrcFormat);
+    PlaceCall highest;
     highest.quality = 5;
     EXPECT_EQ(highest(source, destination), PK_Success) << "unscaled";
     highest.scale = {1, 1.0001f};
@@ -158,7 +136,7 @@ TEST(MotionCall, HalfATurnMirrorsBothWays) {
     Random random(5);
     const AlignedPicture source = VisiblePicture(16, 12, random);
     AlignedPicture destination(kFloats, 16, 12);
-    Call call;
+    PlaceCall call;
     call.rotation = 180;
     ASSERT_EQ(call(source, destination), PK_Success);
     for (int32_t row = 0; row < 12; ++row)
@@ -177,7 +155,7 @@ TEST(MotionCall, AFieldWritesItsRowsAlone) {
     for (const int32_t field : {1, 2}) {
         AlignedPicture destination = RandomPicture(kBGRA, 24, 20, random);
         const AlignedPicture before = destination;
-        Call call;
+        PlaceCall call;
         call.destinationField = 1;
         call.renderField = field;
         call.scale = {1.3f, 1.2f};
@@ -192,7 +170,7 @@ TEST(MotionCall, AFieldWritesItsRowsAlone) {
 // Bilinear sampling from the definitions, in double precision, of premultiplied floats.
 class Reference {
 public:
-    Reference(const AlignedPicture& source, const Call& call, int32_t width, int32_t height)
+    Reference(const AlignedPicture& source, const PlaceCall& call, int32_t width, int32_t height)
         : fSource(source), fCall(call), fWidth(width), fHeight(height) {}
 
     /// The pixel of the destination, and whether the source reaches it.
@@ -221,7 +199,7 @@ private:
     }
 
     const AlignedPicture& fSource;
-    const Call& fCall;
+    const PlaceCall& fCall;
     int32_t fWidth, fHeight;
 };
 
@@ -234,7 +212,7 @@ TEST(MotionCall, SamplesBetweenFourPixels) {
                    height = static_cast<int32_t>(1 + random.Below(60));
         AlignedPicture destination(kFloats, width, height);
         const auto fraction = [&] { return static_cast<float>(random.Below(1000)) / 1000; };
-        Call call;
+        PlaceCall call;
         call.smoothEdges = true;
         call.position = {fraction(), fraction()};
         call.anchor = {fraction(), fraction()};
@@ -281,7 +259,7 @@ TEST(MotionCall, OddNumbersReturnAtOnceAndWriteNothingBeside) {
         for (int which = 0; which < 6; ++which)
             for (const int32_t quality : {2, 4}) {
                 AlignedPicture destination(kBGRP, 20, 20);
-                Call call;
+                PlaceCall call;
                 call.quality = quality;
                 if (which == 0) call.position.x = odd;
                 if (which == 1) call.anchor.y = odd;
@@ -300,7 +278,7 @@ TEST(MotionCall, LeavesTheFloatingPointModeOfTheCaller) {
     AlignedPicture destination(kBGRA, 50, 50);
     for (const int32_t quality : {2, 4, 5}) {
         const FloatEnvironment environment(kRoundDown | kExceptionFlags);
-        Call call;
+        PlaceCall call;
         call.quality = quality;
         call.scale = {0.7f, 1.4f};
         call.rotation = 12;
