@@ -68,48 +68,53 @@ MotionRows::MotionRows(const MotionJob& job, const DestinationImage& destination
                        const ResampleTable& kernelX, const ResampleTable& kernelY)
     : fJob(job), fDrawer(job), fDestination(destination), fBox(box), fSteps(steps), fIsRotated(isRotated),
       fKernelX(kernelX), fKernelY(kernelY), fSample(ChooseMotionSampler(sampled, job.quality)),
-      fScale(MotionLineScale(job.source.format)), fLineFormat(LineFormat(job.source.format)) {}
+      fScale(MotionLineScale(job.source.format)), fLineFormat(LineFormat(job.source.format)),
+      fRowMemory(ColumnsOfUnits()) {}
 
-bool MotionRows::Build() {
+PK_Result MotionRows::Build() {
     const PK_PixelFormat to = fDestination.format, parted = Packed4444(to, kAlphaMeaningless, kDepth32f);
-    return fDirect.Build(fJob.source.format, to, fJob.quality) &&
-           fLine.Build(fLineFormat, to, fJob.quality) && fFromUnits.Build(to, parted, fJob.quality) &&
-           fToUnits.Build(parted, to, fJob.quality);
+    if (!fDirect.Build(fJob.source.format, to, fJob.quality) || !fLine.Build(fLineFormat, to, fJob.quality) ||
+        !fFromUnits.Build(to, parted, fJob.quality) || !fToUnits.Build(parted, to, fJob.quality))
+        return PK_ErrFailed;
+    fRowMemory.AddRow(fLineFormat);
+    fRowMemory.AddRow(parted);
+    fRowMemory.AddBytes(2 * BytesOfInts(SharedColumns()));
+    for (const ConversionChain* chain : {&fDirect, &fLine, &fFromUnits, &fToUnits})
+        fRowMemory.AddChain(*chain);
+    return fBandMemory.emplace(fRowMemory.Bytes()).Result();
+}
+
+/// Those of the box, and of units that it has in part.
+int32_t MotionRows::ColumnsOfUnits() const {
+    return Columns() + 2 * UnitOfRow(fDestination.format).pixels;
 }
 
 PK_Result MotionRows::Draw(const MotionSourceRows& source, PK_Point start, int32_t field) const {
     const int32_t height = fBox.bottom - fBox.top;
     const auto bands = Bands::OfRows(kBandRows).AsTaskIf(height > kBandRows);
     return RunInBands(height, bands, [&](int32_t first, int32_t end) {
-        const auto rows = static_cast<float>(first);
-        const PK_Point at = {start.x + fSteps.row.x * rows, start.y + fSteps.row.y * rows};
-        return DrawBand(source, at, fBox.top + first, fBox.top + end, field);
+        const auto before = static_cast<float>(first);
+        const PK_Point at = {start.x + fSteps.row.x * before, start.y + fSteps.row.y * before};
+        return fBandMemory->With([&](uint8_t* memory) {
+            TemporaryRows rows = fRowMemory.In(memory);
+            return DrawBand(source, at, fBox.top + first, fBox.top + end, field, rows);
+        });
     });
 }
 
 PK_Result MotionRows::DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end,
-                               int32_t field) const {
-    const PK_PixelFormat parted = fToUnits.source;
-    const int32_t roomForUnits = Columns() + 2 * UnitOfRow(fDestination.format).pixels;
-    RowMemory memory(roomForUnits);
-    memory.AddRow(fLineFormat);
-    memory.AddRow(parted);
-    const int32_t shared = Columns() + MotionColumns::kMore;
-    memory.AddBytes(2 * BytesOfInts(shared));
-    for (const ConversionChain* chain : {&fDirect, &fLine, &fFromUnits, &fToUnits}) memory.AddChain(*chain);
-    return memory.With([&](TemporaryRows& rows) -> PK_Result {
-        auto* const line = reinterpret_cast<float*>(rows.Take(BytesOfRow(fLineFormat, roomForUnits)));
-        uint8_t* const units = rows.Take(BytesOfRow(parted, roomForUnits));
-        auto* const columns = reinterpret_cast<int32_t*>(rows.Take(2 * BytesOfInts(shared)));
-        MotionColumns columnsOfBand = {columns, columns + shared};
-        for (int32_t row = first; row < end; ++row, at.x += fSteps.row.x, at.y += fSteps.row.y) {
-            if (!IsOfField(row, field)) continue;
-            const Span span = SpanOfRow(source, at, columnsOfBand, line);
-            if (span.count < 1) continue;
-            if (const PK_Result result = DrawSpan(span, row, rows.Scratch(), units)) return result;
-        }
-        return PK_Success;
-    });
+                               int32_t field, TemporaryRows& rows) const {
+    auto* const line = reinterpret_cast<float*>(rows.Take(BytesOfRow(fLineFormat, ColumnsOfUnits())));
+    uint8_t* const units = rows.Take(BytesOfRow(fToUnits.source, ColumnsOfUnits()));
+    auto* const numbers = reinterpret_cast<int32_t*>(rows.Take(2 * BytesOfInts(SharedColumns())));
+    MotionColumns columns = {numbers, numbers + SharedColumns()};
+    for (int32_t row = first; row < end; ++row, at.x += fSteps.row.x, at.y += fSteps.row.y) {
+        if (!IsOfField(row, field)) continue;
+        const Span span = SpanOfRow(source, at, columns, line);
+        if (span.count < 1) continue;
+        if (const PK_Result result = DrawSpan(span, row, rows.Scratch(), units)) return result;
+    }
+    return PK_Success;
 }
 
 bool MotionRows::IsOfField(int32_t row, int32_t field) const {

@@ -5,6 +5,7 @@
 #include "convert/ConversionChain.h"
 #include "convert/Image.h"
 #include "convert/WorkingRows.h"
+#include "frame/BandMemory.h"
 #include "geometry/MotionDrawer.h"
 #include "geometry/MotionSample.h"
 #include "geometry/MotionSource.h"
@@ -30,8 +31,8 @@ public:
                const MotionSteps& steps, PK_PixelFormat sampled, bool isRotated, const ResampleTable& kernelX,
                const ResampleTable& kernelY);
 
-    /// Whether there are ways to the destination's format.
-    bool Build();
+    /// Finds the ways to the destination's format, and memory for all passes. PK_ErrFailed, PK_ErrOutOfMemory.
+    PK_Result Build();
 
     /// Draws all rows of the box, or those of a field.
     /// \param start  of the first row in the source's rows.
@@ -41,8 +42,10 @@ private:
     struct Span;
 
     int32_t Columns() const { return fBox.right - fBox.left; }
-    PK_Result DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end,
-                       int32_t field) const;
+    int32_t ColumnsOfUnits() const;
+    int32_t SharedColumns() const { return Columns() + MotionColumns::kMore; }
+    PK_Result DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end, int32_t field,
+                       TemporaryRows& rows) const;
     bool IsOfField(int32_t row, int32_t field) const;
     Span SpanOfRow(const MotionSourceRows& source, PK_Point at, MotionColumns& columns, float* line) const;
     Span ExactSpan(const MotionSourceRows& source, int32_t column, int32_t row) const;
@@ -61,8 +64,10 @@ private:
     std::optional<LineScale> fScale;
     PK_PixelFormat fLineFormat;
     ConversionChain fDirect, fLine;
-    ConversionChain fFromUnits,
-        fToUnits; // where a row of the destination cannot be parted between any two pixels
+    // Where a row of the destination cannot be parted between any two pixels.
+    ConversionChain fFromUnits, fToUnits;
+    RowMemory fRowMemory;
+    mutable std::optional<BandMemory> fBandMemory;
 };
 
 } // namespace PK

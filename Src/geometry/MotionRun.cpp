@@ -103,7 +103,7 @@ PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, co
         needsBlur ? WithAlpha(job.source.format, kAlphaPremultiplied) : job.source.format;
     MotionRows rows(job, FromTop(job.destination), box, steps, sampled, placement.IsRotated(),
                     TableOf(kernelX), TableOf(kernelY));
-    if (!rows.Build()) return PK_ErrFailed;
+    if (const PK_Result result = rows.Build()) return result;
     if (!needsBlur) return DrawSharp(job, source, steps, rows);
     const BlurredSource blurred(job, source, blur, sampled, marginX, marginY);
     if (!blurred.HasMemory()) return PK_ErrOutOfMemory;
