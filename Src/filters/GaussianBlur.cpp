@@ -167,10 +167,10 @@ PK_Result BlurImage(const Images& images, const Blur& blur) {
 
 } // namespace
 
-PK_Result BlurForMotion(const void* source, ptrdiff_t sourceRowBytes, int32_t sourceWidth, int32_t sourceHeight,
-                        PK_PixelFormat sourceFormat, void* dest, int32_t destRowBytes, int32_t destWidth,
-                        int32_t destHeight, PK_PixelFormat destFormat, double sigmaX, double sigmaY,
-                        bool repeatEdge, bool linear, bool reuseDestination, int32_t direction,
+PK_Result BlurForMotion(const void* source, ptrdiff_t sourceRowBytes, int32_t sourceWidth,
+                        int32_t sourceHeight, PK_PixelFormat sourceFormat, void* dest, int32_t destRowBytes,
+                        int32_t destWidth, int32_t destHeight, PK_PixelFormat destFormat, double sigmaX,
+                        double sigmaY, bool repeatEdge, bool linear, bool reuseDestination, int32_t direction,
                         int32_t quality) noexcept {
     return BlurImage(
         {{static_cast<const uint8_t*>(source), sourceRowBytes, sourceFormat, sourceWidth, sourceHeight},

@@ -70,7 +70,7 @@ RowMemory GaussianPass::MemoryOfStrip(int32_t length) const {
 }
 
 int32_t GaussianPass::ColumnsOfStrip() const {
-    return kStripBytes / BytesPerPixel(fIn.source);
+    return kStripBytes / std::max(BytesPerPixel(fIn.source), 1); // four channels are never less
 }
 
 uint64_t GaussianPass::StripStep(int32_t length) const {

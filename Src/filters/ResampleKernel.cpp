@@ -169,10 +169,11 @@ void ResampleKernel::CalculateDefaultKernel() {
 /// In integers, so that every row adds up.
 void ResampleKernel::CalculateLinearKernel() {
     fWidth = 2;
+    int16_t* weight = fKernel.data();
     for (int32_t i = 0; i < kPhases; ++i) {
         const int32_t second = kOne / kPhases * i;
-        fKernel[static_cast<size_t>(2 * i)] = static_cast<int16_t>(kOne - second);
-        fKernel[static_cast<size_t>(2 * i + 1)] = static_cast<int16_t>(second);
+        *weight++ = static_cast<int16_t>(kOne - second);
+        *weight++ = static_cast<int16_t>(second);
     }
 }
 
@@ -217,8 +218,10 @@ void ResampleKernel::Trim(int32_t low, int32_t high) {
     if (width >= fWidth) return;
     if (low <= high) {
         int16_t* packed = fKernel.data(); // never ahead of the weight that it takes
-        for (int32_t i = 0; i < kPhases; ++i)
-            for (int32_t k = low; k <= high; ++k) *packed++ = fKernel[static_cast<size_t>(i * fWidth + k)];
+        for (int32_t i = 0; i < kPhases; ++i) {
+            const int16_t* const row = fKernel.data() + int64_t{i} * fWidth;
+            for (int32_t k = low; k <= high; ++k) *packed++ = row[k];
+        }
     }
     fWidth = static_cast<int16_t>(width);
 }

@@ -6,7 +6,7 @@
 
 namespace PK {
 
-inline constexpr bool IsInterlaced(int32_t field) {
+constexpr bool IsInterlaced(int32_t field) {
     return field == 1 || field == 2;
 }
 

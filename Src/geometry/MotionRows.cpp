@@ -159,7 +159,7 @@ MotionRows::Span MotionRows::ExactSpan(const MotionSourceRows& source, int32_t c
     const int32_t skipped = std::max(0, rectangle.left - column);
     const int32_t count = std::min(Columns(), rectangle.right - column) - skipped;
     const uint8_t* const pixels =
-        source.pixels + row * source.rowBytes + (int64_t{column} + skipped) * BytesOfRow(source.format, 1);
+        source.pixels + row * source.rowBytes + (int64_t{column} + skipped) * BytesPerPixel(source.format);
     // What is only converted counts as the source's own format, even if it is blurred and has alpha in it.
     const PK_PixelFormat format = fDrawer.IsConversion() ? fDirect.source : source.format;
     return {pixels, format, &fDirect, fBox.left + skipped, count};

@@ -10,7 +10,7 @@ namespace PK {
 
 MotionSourceRows ChooseMotionRows(const MotionJob& job, const SourceImage& source, int32_t left, int32_t top,
                                   int32_t pass) {
-    const int64_t column = int64_t{left} * BytesOfRow(source.format, 1);
+    const int64_t column = int64_t{left} * BytesPerPixel(source.format);
     if (!IsInterlaced(job.sourceField))
         return {source.Row(top) + column, source.rowBytes, source.format, job.crop, true, top};
     const FieldOfSource field = ChooseFieldOfSource(job.sourceField, job.destinationField, pass);
@@ -44,7 +44,7 @@ PK_Result BlurredSource::Blur(int32_t pass, MotionSourceRows& blurred) const {
     blurred.rectangle = {lies.left - fMarginX, lies.top - fMarginY, lies.right + fMarginX,
                          lies.bottom + fMarginY};
     blurred.pixels = fBuffer.Pixels() - int64_t{blurred.rectangle.top} * fBuffer.RowBytes() -
-                     int64_t{blurred.rectangle.left} * static_cast<int64_t>(BytesOfRow(fFormat, 1));
+                     int64_t{blurred.rectangle.left} * BytesPerPixel(fFormat);
     blurred.rowBytes = fBuffer.RowBytes();
     blurred.format = fFormat;
     return PK_Success;
