@@ -568,16 +568,17 @@ TEST(MotionLineScale, TakesCodesToFloats) {
         {PK_PixelFormat_BGRA_4444_15u, {0, 16384, 32768, 32768}, {0, 0.5f, 1, 1}},
         {PK_PixelFormat_PRGB_4444_15u, {0, 16384, 32768, 32768}, {0, 0.5f, 1, 1}},
     };
-    for (const auto& [format, codes, floats] : cases) {
-        const auto scale = MotionLineScale(format);
-        ASSERT_TRUE(scale) << PK_PixelFormatName(format);
+    for (const auto& each : cases) {
+        const auto scale = MotionLineScale(each.format);
+        ASSERT_TRUE(scale) << PK_PixelFormatName(each.format);
         for (const int32_t count : {0, 1, 2, 3, 5, 33}) {
-            std::vector<Pixel> line(static_cast<size_t>(count) + 1, codes);
+            std::vector<Pixel> line(static_cast<size_t>(count) + 1, each.codes);
             AtEveryTarget([&] {
-                std::fill(line.begin(), line.end(), codes);
+                std::fill(line.begin(), line.end(), each.codes);
                 ScaleMotionLine(*scale, line[0].data(), count);
-                for (int32_t i = 0; i < count; ++i) ExpectPixel(line[static_cast<size_t>(i)], floats, 1e-7f);
-                ExpectPixel(line.back(), codes);
+                for (int32_t i = 0; i < count; ++i)
+                    ExpectPixel(line[static_cast<size_t>(i)], each.floats, 1e-7f);
+                ExpectPixel(line.back(), each.codes);
             });
         }
     }
