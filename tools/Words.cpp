@@ -2,6 +2,8 @@
 
 #include <CLI/CLI.hpp>
 
+#include <cmath>
+#include <cstdlib>
 #include <optional>
 
 namespace tool {
@@ -23,6 +25,10 @@ Word& Word::Between(int32_t least, int32_t most) {
 
 Word& Word::Between(double least, double most) {
     fOption->check(CLI::Range(least, most));
+    fOption->check([](const std::string& text) { // it passes a range
+        return std::isnan(std::strtod(text.c_str(), nullptr)) ? "'" + text + "' is not a number"
+                                                              : std::string();
+    });
     return *this;
 }
 

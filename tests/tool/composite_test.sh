@@ -30,7 +30,7 @@ expect 0 "27 modes" blendsheet "$media/chelsea.png" "$media/coffee.png" out/shee
 expect 2 "there is no blend mode 'multiply'; the modes are Color, ColorBurn" \
     composite in/white.png in/black.png out/y.png --mode multiply
 expect 2 "--linear is for the mode Normal" composite in/white.png in/black.png out/y.png --mode Screen --linear
-for opacity in -1 1.5 x; do
+for opacity in -1 1.5 x nan NaN; do
     expect 2 "--opacity" composite in/white.png in/black.png out/y.png "--opacity=$opacity"
 done
 expect 0 "" fill in/wide.png --size 5x4 --colour 0,0,0,255
