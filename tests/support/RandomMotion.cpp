@@ -138,24 +138,32 @@ void RandomMotion::DrawPlace(Random& random) {
     if (OneIn(random, 2))
         a.rotation = OneIn(random, 3) ? Pick(random, std::array{0.04, 0.06, 45.0, 90.0, 180.0, -90.0})
                                       : static_cast<double>(Between(random, -360.0f, 360.0f));
-    if (OneIn(random, 2)) return;
-    a.crop.left = Between(random, 0, source.width - 1);
-    a.crop.right = Between(random, a.crop.left + 1, source.width);
-    a.crop.top = Between(random, 0, source.height - 1);
-    a.crop.bottom = Between(random, a.crop.top + 1, source.height);
+    if (OneIn(random, 2)) DrawCrop(random);
 }
 
-/// Unscaled, some pixels beside where it would lie: copied row by row, or as a whole.
+void RandomMotion::DrawCrop(Random& random) {
+    PK_Rect& crop = fArguments.crop;
+    crop.left = Between(random, 0, source.width - 1);
+    crop.right = Between(random, crop.left + 1, source.width);
+    crop.top = Between(random, 0, source.height - 1);
+    crop.bottom = Between(random, crop.top + 1, source.height);
+}
+
+/// Unscaled, some pixels beside where it would lie, or so little from it that they count as whole: copied row by row, or as
+/// an image.
 void RandomMotion::DrawWholePlace(Random& random) {
     MotionArguments& a = fArguments;
     a.scale = {1, 1};
     a.anchor = {0.5f, 0.5f};
     const auto beside = [&](int32_t from, int32_t to) {
-        const auto pixels = static_cast<float>(OneIn(random, 2) ? 0 : Between(random, -5, 5));
-        return (static_cast<float>(from) / 2 + pixels) / static_cast<float>(to);
+        float pixels = static_cast<float>(from) / 2;
+        if (OneIn(random, 2)) pixels += static_cast<float>(Between(random, -5, 5));
+        if (OneIn(random, 3)) pixels += Pick(random, std::array{-6e-5f, -4e-5f, 4e-5f, 6e-5f});
+        return pixels / static_cast<float>(to);
     };
     a.position = {beside(source.width, destination.width), 1 - beside(source.height, destination.height)};
     if (OneIn(random, 2)) a.softness = 0;
+    if (OneIn(random, 2)) DrawCrop(random);
     if (OneIn(random, 2)) a.destinationField = a.sourceField;
 }
 

@@ -23,6 +23,7 @@ private:
     RandomMotion(const Formats& formats, Random& random);
 
     void DrawPlace(Random& random);
+    void DrawCrop(Random& random);
     void DrawWholePlace(Random& random);
     void DrawCover(Random& random);
     void DrawGroups(Random& random);
