@@ -43,10 +43,12 @@ bool FadesInBytes(const MotionArguments& a) {
 /// By how much of full scale a sample may leap where the last bit of a sum changes.
 ///
 /// To divide by a float alpha is to multiply by the processor's estimate of its reciprocal, of which there are 2048 between
-/// an alpha and twice as much; in linear light colours leap by up to 2.4 times as much. A byte leaps by one.
+/// an alpha and twice as much; in linear light colours leap by up to 2.4 times as much. A composite may divide twice. A byte
+/// leaps by one.
 double LeapOf(const MotionArguments& a) {
     if (FadesInBytes(a)) return 1.0 / 219;
-    return KeepsPremultiplied(a) ? 0 : 2.4 / 2048;
+    if (KeepsPremultiplied(a)) return 0;
+    return (a.composites ? 2 : 1) * 2.4 / 2048;
 }
 
 struct Counts {
@@ -70,9 +72,13 @@ public:
     /// Where they are too far from each other; empty if they are nowhere.
     std::string Difference() const {
         for (int32_t row = 0; row < fExpected.height; ++row)
-            for (size_t at = 0; at < fExpected.RowLength(); at += BytesOfWord())
-                if (!IsWordNear(fExpected.Row(row) + at, fActual.Row(row) + at))
-                    return "row " + std::to_string(row) + ", byte " + std::to_string(at);
+            for (size_t at = 0; at < fExpected.RowLength(); at += BytesOfWord()) {
+                const uint8_t *const expected = fExpected.Row(row) + at, *const actual =
+                                                                             fActual.Row(row) + at;
+                if (!IsWordNear(expected, actual))
+                    return "row " + std::to_string(row) + ", byte " + std::to_string(at) + ": " +
+                           FirstDifference(fExpected.format, BytesOfWord(), expected, actual);
+            }
         return IsRestAlike() ? "" : "bytes that are no pixels";
     }
 
@@ -181,9 +187,10 @@ TEST_F(MotionSweep, PlacesAsItIsTold) {
         ++placements;
         changes += !actual.HasMemoryOf(motion.destination);
     }
-    EXPECT_GT(changes, placements / 2);
-    EXPECT_LT(counts.otherCodes, counts.codes / 1000);
-    EXPECT_LT(counts.leaps, counts.samples / 1000);
+    constexpr int kFew = 20; // a walk that leaves most of them out has none to speak of
+    EXPECT_GT(changes + kFew, placements / 2);
+    EXPECT_LT(counts.otherCodes, counts.codes / 5000 + kFew);
+    EXPECT_LT(counts.leaps, counts.samples / 5000 + kFew);
 }
 
 TEST_F(MotionSweep, IsTheSameOnOneThreadAndOnAllProcessors) {

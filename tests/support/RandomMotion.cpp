@@ -155,11 +155,14 @@ void RandomMotion::DrawWholePlace(Random& random) {
     MotionArguments& a = fArguments;
     a.scale = {1, 1};
     a.anchor = {0.5f, 0.5f};
+    const auto offWhole = [&]() -> float {
+        if (!OneIn(random, 3)) return 0;
+        a.smoothEdges = false; // they would have an alpha of this size, by which nothing is to be divided
+        return Pick(random, std::array{-6e-5f, -4e-5f, 4e-5f, 6e-5f});
+    };
     const auto beside = [&](int32_t from, int32_t to) {
-        float pixels = static_cast<float>(from) / 2;
-        if (OneIn(random, 2)) pixels += static_cast<float>(Between(random, -5, 5));
-        if (OneIn(random, 3)) pixels += Pick(random, std::array{-6e-5f, -4e-5f, 4e-5f, 6e-5f});
-        return pixels / static_cast<float>(to);
+        const auto pixels = static_cast<float>(OneIn(random, 2) ? Between(random, -5, 5) : 0);
+        return (static_cast<float>(from) / 2 + pixels + offWhole()) / static_cast<float>(to);
     };
     a.position = {beside(source.width, destination.width), 1 - beside(source.height, destination.height)};
     if (OneIn(random, 2)) a.softness = 0;
