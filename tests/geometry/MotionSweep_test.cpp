@@ -163,8 +163,7 @@ MotionArguments Piece(const MotionArguments& whole, int32_t piece) {
 
 } // namespace
 
-// Places need not keep away from where one pixel gives way to the next: the restatement walks in float as well, and so
-// comes to the same pixels, between which it weighs in double precision.
+// The restatement walks in float, too, and so mostly comes to the same pixels, between which it weighs in double precision.
 TEST_F(MotionSweep, PlacesAsItIsTold) {
     const std::vector<Target>& targets = TargetsOfThisProcessor();
     Random random(5101);

@@ -135,9 +135,13 @@ void RandomMotion::DrawPlace(Random& random) {
     if (OneIn(random, 3)) a.scale.y = a.scale.x;
     a.anchor = place();
     a.position = place();
-    if (OneIn(random, 2))
-        a.rotation = OneIn(random, 3) ? Pick(random, std::array{0.04, 0.06, 45.0, 90.0, 180.0, -90.0})
-                                      : static_cast<double>(Between(random, -360.0f, 360.0f));
+    if (OneIn(random, 2)) a.rotation = static_cast<double>(Between(random, -360.0f, 360.0f));
+    if (OneIn(random, 8)) a.rotation = Pick(random, std::array{0.04, 0.06}); // none, and the least
+    if (OneIn(random, 8)) {
+        // A whole row may run along an edge, beside it or not by the last bit of its place: the edge has to fade.
+        a.rotation = Pick(random, std::array{90.0, 180.0, -90.0});
+        a.smoothEdges = true;
+    }
     if (OneIn(random, 2)) DrawCrop(random);
 }
 
