@@ -37,8 +37,9 @@ PK_Result CopyWhole(const MotionJob& job) {
         toStep *= 2;
         height /= 2;
     }
-    if (fromStep != static_cast<int32_t>(fromStep) || toStep != static_cast<int32_t>(toStep))
-        return PK_ErrFailed;
+    const bool haveSteps =
+        fromStep == static_cast<int32_t>(fromStep) && toStep == static_cast<int32_t>(toStep);
+    if (height > 1 && !haveSteps) return PK_ErrFailed;
     return MotionDrawer(job).Draw(from, static_cast<int32_t>(fromStep), job.source.format, to,
                                   static_cast<int32_t>(toStep), job.destination.format, job.source.width,
                                   height);
