@@ -206,9 +206,9 @@ struct HighQuality {
         });
     }
 
-    const float* PixelAt(int32_t column, int32_t line) const {
-        return reinterpret_cast<const float*>(row.pixels + line * row.rowBytes +
-                                              int64_t{column} * kPixelBytes);
+    /// Not aligned for floats.
+    const uint8_t* PixelAt(int32_t column, int32_t line) const {
+        return row.pixels + line * row.rowBytes + int64_t{column} * kPixelBytes;
     }
 
     /// Those of the columns from `first` on that lie in the source: some in the middle, or none.
@@ -223,7 +223,7 @@ struct HighQuality {
     /// Rows by their weights, for `width` columns from `first` on; 0 outside the source.
     void AddRows(int32_t firstLine, int32_t phase, int32_t first, int32_t width, float* sums) const {
         const Overlap inside(row, first, width);
-        const float* sources[kMostTaps];
+        const uint8_t* sources[kMostTaps];
         F32 weights[kMostTaps];
         int32_t count = 0;
         for (int32_t tap = 0; tap < weightsY.Taps() && inside.begin < inside.end; ++tap) {
@@ -237,7 +237,8 @@ struct HighQuality {
         if (end - begin >= kLanes)
             ByVectors(end - begin, [&](int32_t at) {
                 F32 sum = Zero();
-                for (int32_t i = 0; i < count; ++i) sum = sum + LoadFloats(sources[i] + at) * weights[i];
+                for (int32_t i = 0; i < count; ++i)
+                    sum = sum + LoadFloats(sources[i] + sizeof(float) * static_cast<size_t>(at)) * weights[i];
                 Store(sums + begin + at, sum);
             });
         else
@@ -247,7 +248,7 @@ struct HighQuality {
     }
 
     /// Less than a vector of each, if anything.
-    static void AddShortRows(const float* const* sources, const F32* weights, int32_t count, float* sums,
+    static void AddShortRows(const uint8_t* const* sources, const F32* weights, int32_t count, float* sums,
                              int32_t floats) {
         const size_t bytes = floats > 0 ? sizeof(float) * static_cast<size_t>(floats) : 0;
         alignas(64) float last[kLanes] = {};
@@ -273,10 +274,10 @@ struct HighQuality {
         if (first < row.left || first + taps > row.right)
             return SumOfPart(first, weights, firstLine, weightsOfLines, begin, end);
         TapSums sum;
-        const float* pixels = PixelAt(first, firstLine + begin);
-        for (int32_t tap = begin; tap < end; ++tap, pixels = NextLine(pixels)) {
+        const uint8_t* pixels = PixelAt(first, firstLine + begin);
+        for (int32_t tap = begin; tap < end; ++tap, pixels += row.rowBytes) {
             TapSums ofRow;
-            ofRow.Add<kTaps>(pixels, weights, taps);
+            ofRow.Add<kTaps>(reinterpret_cast<const float*>(pixels), weights, taps);
             sum.Add(ofRow, Floats(weightsOfLines[tap]));
         }
         return sum.Total();
@@ -296,10 +297,6 @@ struct HighQuality {
             sum.Add(ofRow, Floats(weightsOfLines[tap]));
         }
         return sum.Total();
-    }
-
-    const float* NextLine(const float* pixels) const {
-        return reinterpret_cast<const float*>(reinterpret_cast<const uint8_t*>(pixels) + row.rowBytes);
     }
 
     /// total(column) is a vector whose blocks add up to its pixel. Alpha is limited to 0 to 1, not-a-number becoming 0;

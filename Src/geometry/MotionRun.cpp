@@ -37,8 +37,9 @@ PK_Result CopyWhole(const MotionJob& job) {
         toStep *= 2;
         height /= 2;
     }
-    if (fromStep != static_cast<int32_t>(fromStep) || toStep != static_cast<int32_t>(toStep))
-        return PK_ErrFailed;
+    const bool haveSteps =
+        fromStep == static_cast<int32_t>(fromStep) && toStep == static_cast<int32_t>(toStep);
+    if (height > 1 && !haveSteps) return PK_ErrFailed;
     return MotionDrawer(job).Draw(from, static_cast<int32_t>(fromStep), job.source.format, to,
                                   static_cast<int32_t>(toStep), job.destination.format, job.source.width,
                                   height);
@@ -86,16 +87,16 @@ ResampleTable TableOf(const ResampleKernel& kernel) {
 
 PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, const MotionBlur& blur,
                       bool needsBlur) {
+    const int32_t marginX = job.smoothEdges && blur.x > 0 ? kSoftMargin : 0;
+    const int32_t marginY = job.smoothEdges && blur.y > 0 ? kSoftMargin : 0;
+    const PK_Rect box = placement.Reach(job.crop, marginX, marginY);
+    if (box.left == box.right) return PK_Success; // as of a scale that is no number
     ResampleKernel kernelX(kKeysCubic), kernelY(kKeysCubic);
     if (job.quality == kCubicQuality) {
         Scale(kernelX, placement.Scale().x);
         Scale(kernelY, placement.Scale().y);
         if (kernelX.Width() < 1 || kernelY.Width() < 1) return PK_ErrOutOfMemory;
     }
-    const int32_t marginX = job.smoothEdges && blur.x > 0 ? kSoftMargin : 0;
-    const int32_t marginY = job.smoothEdges && blur.y > 0 ? kSoftMargin : 0;
-    const PK_Rect box = placement.Reach(job.crop, marginX, marginY);
-    if (box.left == box.right) return PK_Success;
 
     const SourceImage source = Reversed(job.source); // four channels are stored from the bottom
     const MotionSteps steps = ChooseMotionSteps(placement, box, IsInterlaced(job.sourceField));

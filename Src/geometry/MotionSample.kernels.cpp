@@ -127,6 +127,7 @@ using Four = Channels[4];
 template <class Layout, class Zero, MotionAlpha kAlpha>
 struct Bilinear {
     static constexpr int32_t kMargin = 2;
+    static constexpr bool kIsFloat = Layout::kFull == 1;
 
     explicit Bilinear(const MotionRow& from) : row(from) {}
 
@@ -150,7 +151,7 @@ struct Bilinear {
             result.shares[i] = share;
             F32 factor = weights[i];
             if constexpr (kAlpha == MotionAlpha::straight)
-                factor = Layout::kFull == 1 ? share : share * Floats(1 / Layout::kFull);
+                factor = kIsFloat ? share : share * Floats(1 / Layout::kFull);
             const Channels part = {c.c0 * factor, c.c1 * factor, c.c2 * factor, share};
             Channels& sum = result.sum;
             sum = i == 0 ? part
@@ -217,7 +218,7 @@ struct Bilinear {
         }
 
         /// So many pixels from one on. Returns whether all have so much alpha that, of any two, the share of one of the
-        /// four in the source is enough to be seen.
+        /// four in the source is enough to be seen; and none is infinite, of which sums and shares tell different things.
         bool Mix(int32_t first, int32_t width, float* mixed) const {
             const F32 fy = Floats(fraction);
             I32 isMuch = Ints(-1);
@@ -225,6 +226,8 @@ struct Bilinear {
                 const F32 sum = above + (below - above) * fy;
                 Store(mixed + at, sum);
                 if constexpr (kAlpha != MotionAlpha::none) isMuch = isMuch & Less(Floats(0x1p-13f), sum);
+                if constexpr (kIsFloat && kAlpha != MotionAlpha::none)
+                    isMuch = isMuch & Less(sum, Floats(0x1p127f));
             });
             return !AnyNegative(Not(isMuch) & AlphaLanes<AlphaPlace::last>());
         }
@@ -348,8 +351,7 @@ struct Bilinear {
         if constexpr (kAlpha == MotionAlpha::none) return BlendBlocks<8>(Floats(Layout::kFull), c);
         if constexpr (kAlpha == MotionAlpha::straight) {
             const F32 alpha = BroadcastAlpha<AlphaPlace::last>(c);
-            return BlendBlocks<8>(alpha,
-                                  c * (Layout::kFull == 1 ? alpha : alpha * Floats(1 / Layout::kFull)));
+            return BlendBlocks<8>(alpha, c * (kIsFloat ? alpha : alpha * Floats(1 / Layout::kFull)));
         }
         return c;
     }

@@ -1,10 +1,11 @@
-// Images that are turned, deinterlaced, warped, blurred and stamped.
+// Images that are turned, deinterlaced, warped, blurred, placed and stamped.
 
 #include "allocations/Call.h"
 
 #include <PixelKiln/PixelKiln.h>
 
 #include <array>
+#include <optional>
 
 namespace {
 
@@ -128,6 +129,73 @@ void AddGaussianBlurs(Calls& calls) {
     }
 }
 
+struct Placing {
+    PK_PixelFormat source, destination;
+    int32_t width, height, quality;
+    PK_Point position, scale;
+    Memory memory;
+    int32_t sourceField = 0, destinationField = 0;
+    std::optional<PK_BlendMode> mode = {}; ///< else in the destination's place
+};
+
+/// Of images of one size. Where there are more rows than one band has, or both fields of a progressive source that was
+/// interlaced, a part is drawn before there is no memory for the rest.
+void AddPlacings(Calls& calls) {
+    constexpr int32_t kLong = 9001, kShort = 5, kSide = 30;
+    constexpr PK_PixelFormat kLinear = PK_PixelFormat_BGRP_4444_32f_Linear,
+                             kUYVY = PK_PixelFormat_UYVY_422_8u;
+    constexpr PK_Point kMiddle = {0.5f, 0.5f}, kMoved = {0.48f, 0.51f}, kWhole = {1, 1},
+                       kLarge = {1.5f, 1.2f}, kSmall = {0.7f, 0.4f};
+    constexpr Memory kShortRows = TakesNone("has short rows on the stack"),
+                     kRows = TakesOrRefuses("rows above 256 KiB"),
+                     kBlurred = TakesOrRefuses("the blurred source"),
+                     kWeights = TakesOrRefuses("tables of weights"),
+                     kProgressive = TakesOrRefuses("the progressive source, and tables of weights");
+    const Placing placings[] = {
+        {kBGRA, kBGRA, kWidth, kHeight, 2, kMiddle, kWhole, TakesNone("copies pixels themselves")},
+        {kBGRA, kBGRA, kSide, kSide, 2, kMoved, kSmall, kShortRows},
+        {kBGRA, kUYVY, kSide, kSide, 4, kMoved, kLarge, kShortRows},
+        {kBGRA, kBGRA, kSide, kSide, 2, kMoved, kWhole, kShortRows, 1, 2},
+        {kLinear, kBGRA, kSide, kSide, 5, kMoved, kSmall, kWeights},
+        {kBGRA, kUYVY, kSide, kSide, 2, kMoved, kLarge, kShortRows, 0, 0, PK_BlendMode_Multiply},
+        {kBGRA, kBGRA, kLong, kShort, 2, kMoved, kLarge, kRows},
+        {kBGRA, kUYVY, kLong, kShort, 2, kMoved, kLarge, kRows, 1, 2},
+        {kBGRA, kBGRA, kLong, kShort, 2, kMoved, kWhole, kRows, 0, 0, PK_BlendMode_Multiply},
+        {kLinear, kBGRA, kLong, kShort, 5, kMoved, kLarge, TakesOrRefuses("tables of weights, and rows")},
+        {kBGRA, kBGRA, kSide, kSide, 4, kMoved, kSmall, kBlurred},
+        {kBGRA, kUYVY, kSide, kSide, 3, kMoved, kSmall, kBlurred, 2, 1},
+        {kBGRA, kBGRA, kLong, kShort, 4, kMoved, kSmall,
+         TakesOrRefuses("the blurred source, lines and rows")},
+        {kBGRA, kUYVY, kSide, kSide, 4, kMoved, kSmall, kBlurred, 0, 0, PK_BlendMode_Screen},
+        {kLinear, kBGRA, kSide, kSide, 5, kMoved, kSmall, kProgressive, 1},
+        {kLinear, kUYVY, kSide, kSide, 5, kMoved, kWhole, kProgressive, 2},
+        {kLinear, kBGRA, kSide, kSide, 5, kMoved, kLarge, kProgressive, 1, 0, PK_BlendMode_Screen},
+    };
+    for (const Placing& job : placings) {
+        const auto rowBytes = [&](PK_PixelFormat format) {
+            return PK_PixelFormatRowBytes(format, job.width);
+        };
+        const auto bytes = [&](PK_PixelFormat format) {
+            return Content(static_cast<size_t>(PK_PixelFormatSize(format, job.width, job.height)));
+        };
+        const auto place = [=, step = rowBytes(job.source), to = rowBytes(job.destination),
+                            source = bytes(job.source)](uint8_t* block) {
+            if (job.mode)
+                return PK_MotionWithBlendMode(
+                    source.data(), step, job.width, job.height, job.source, job.sourceField, nullptr, block,
+                    to, job.width, job.height, job.destination, job.destinationField, 1, 1, job.position,
+                    kMiddle, job.scale, 0, 0.9f, 0, false, 0, *job.mode, job.quality, false);
+            return PK_Motion(source.data(), step, job.width, job.height, job.source, job.sourceField, nullptr,
+                             block, to, job.width, job.height, job.destination, job.destinationField, 1, 1,
+                             job.position, kMiddle, job.scale, 0, 1, false, 0, false, 0, job.quality, false);
+        };
+        calls.push_back({{job.mode ? "PK_MotionWithBlendMode" : "PK_Motion"},
+                         job.memory,
+                         std::vector<uint8_t>(bytes(job.destination).size(), 99),
+                         place});
+    }
+}
+
 void AddStamps(Calls& calls) {
     constexpr int32_t kStampWidth = 900, kStampHeight = 300;
     calls.push_back({{"PK_PrintNum"},
@@ -140,6 +208,6 @@ void AddStamps(Calls& calls) {
 }
 
 const Family sTurns(AddTurns), sFields(AddFields), sWarps(AddWarps), sBlurs(AddBlurs),
-    sGaussianBlurs(AddGaussianBlurs), sStamps(AddStamps);
+    sGaussianBlurs(AddGaussianBlurs), sPlacings(AddPlacings), sStamps(AddStamps);
 
 } // namespace

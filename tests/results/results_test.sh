@@ -19,7 +19,7 @@ hash() {
 
 for part in plain/convert/BGRA_4444_8u/ plain/streams/PALDV25/ plain/alpha/ plain/arrays/ plain/buffers/ plain/box-blur/ \
     plain/mask/BGR plain/composite/over/BGR plain/composite/mode/1 plain/matte/ plain/alpha-gain/ plain/accumulate/ plain/planar \
-    plain/row-bridges/ plain/rotate/ plain/quad-warp/skew/q3/ once/formats/ once/colour-; do
+    plain/row-bridges/ plain/rotate/ plain/quad-warp/skew/q3/ plain/motion/BGRA_4444_8u/ plain/motion/fields/ once/formats/ once/colour-; do
     first=$(MALLOC_PERTURB_=85 "$program" "$part")
     second=$(MALLOC_PERTURB_=170 "$program" "$part")
     [ -z "$(cut -d' ' -f1 <<<"$first" | uniq -d)" ] || fail "lines of $part share a name"
