@@ -1,119 +1,10 @@
 // Samples between four pixels: a layout, the zeros of its colours, and a way to weigh by alpha.
 
-#include "geometry/MotionWalk.h"
+#include "geometry/MotionMixedRows.h"
 #include "primitives/lanes/RowDriver.h"
 
 namespace PK::PK_TARGET {
 namespace {
-
-// Where a colour has its zero, which is also what transparent pixels show.
-
-struct NoZero {
-    static constexpr bool kIsZero = true;
-    static Channels Value() { return {Floats(0), Floats(0), Floats(0), Floats(0)}; }
-};
-struct VideoZero {
-    static constexpr bool kIsZero = false;
-    static Channels Value() { return {Floats(128), Floats(128), Floats(16), Floats(0)}; }
-};
-
-inline Channels And(I32 mask, const Channels& c) {
-    const auto masked = [mask](F32 x) { return FromBits(Bits(x) & mask); };
-    return {masked(c.c0), masked(c.c1), masked(c.c2), masked(c.c3)};
-}
-
-// Two pixels side by side for each lane, the left ones at the offsets.
-
-template <AlphaPlace kAlpha>
-[[gnu::always_inline]] inline void LoadNeighbours(Pixels8<kAlpha>, const uint8_t* base,
-                                                  const int64_t* offsets, Channels& left, Channels& right) {
-    I32 lefts, rights;
-    LoadLanePairsAt(base, offsets, lefts, rights);
-    left = ToFloat(InOrder<kAlpha>(ByteChannels(lefts)));
-    right = ToFloat(InOrder<kAlpha>(ByteChannels(rights)));
-}
-
-template <AlphaPlace kAlpha>
-inline Channels LoadPixelsAt(Pixels15<kAlpha>, const uint8_t* base, const int64_t* offsets) {
-    I32 first, second;
-    LoadLanePairsAt(base, offsets, first, second);
-    return ToFloat(InOrder<kAlpha>(WordChannels(first, second)));
-}
-
-template <AlphaPlace kAlpha>
-inline Channels LoadPixelsAt(Pixels32f<kAlpha>, const uint8_t* base, const int64_t* offsets) {
-    Channels c = {LoadFloatBlocksAt(base, offsets), LoadFloatBlocksAt(base, offsets + 1),
-                  LoadFloatBlocksAt(base, offsets + 2), LoadFloatBlocksAt(base, offsets + 3)};
-    TransposePixels(c.c0, c.c1, c.c2, c.c3);
-    return InOrder<kAlpha>(c);
-}
-
-template <class Layout>
-[[gnu::always_inline]] inline void LoadNeighbours(Layout layout, const uint8_t* base, const int64_t* offsets,
-                                                  Channels& left, Channels& right) {
-    left = LoadPixelsAt(layout, base, offsets);
-    right = LoadPixelsAt(layout, base + Layout::kPixelBytes, offsets);
-}
-
-// Interleaved pixels, alpha last.
-
-template <AlphaPlace kAlpha>
-inline F32 InOrder(F32 pixels) {
-    return kAlpha == AlphaPlace::last ? pixels : ShufflePixel<3, 2, 1, 0>(pixels);
-}
-template <AlphaPlace kAlpha>
-inline F32 LoadInterleaved(Pixels8<kAlpha>, const uint8_t* pixels) {
-    return InOrder<kAlpha>(ToFloat(LoadBytes(pixels)));
-}
-template <AlphaPlace kAlpha>
-inline F32 LoadInterleaved(Pixels15<kAlpha>, const uint8_t* pixels) {
-    return InOrder<kAlpha>(ToFloat(LoadWords(pixels)));
-}
-template <AlphaPlace kAlpha>
-inline F32 LoadInterleaved(Pixels32f<kAlpha>, const uint8_t* pixels) {
-    return InOrder<kAlpha>(LoadFloats(pixels));
-}
-
-// Cells: the pixels between whose centres a place lies.
-
-inline I32 Limit(I32 x, int32_t low, int32_t high) {
-    return Max(Min(x, Ints(high)), Ints(low));
-}
-
-/// Not-a-number becomes the upper limit.
-inline F32 Limit(F32 x, int32_t low, int32_t high) {
-    return Max(Min(x, Floats(static_cast<float>(high))), Floats(static_cast<float>(low)));
-}
-
-/// Of pixels that are all in the source.
-struct InnerCell {
-    InnerCell(const float* places, int32_t low, int32_t high) {
-        const F32 place = Limit(LoadFloats(places) - Floats(0.5f), low, high - 1);
-        first = Limit(Floor(place), low, high - 2); // limited once more: a float may have rounded the bounds
-        fraction = place - ToFloat(first);
-    }
-
-    I32 first;
-    F32 fraction;
-};
-
-/// Of pixels that may lie outside; the nearest in the source stand for those.
-struct EdgeCell {
-    EdgeCell(const float* places, int32_t low, int32_t high) {
-        const F32 place = Limit(LoadFloats(places) - Floats(0.5f), low - 2, high + 1);
-        const I32 first = Floor(place), second = first + Ints(1);
-        fraction = place - ToFloat(first);
-        const I32 nearest[] = {Limit(first, low, high - 1), Limit(second, low, high - 1)};
-        Store(index[0], nearest[0]);
-        Store(index[1], nearest[1]);
-        isInside[0] = Equal(nearest[0], first);
-        isInside[1] = Equal(nearest[1], second);
-    }
-
-    int32_t index[2][kLanes];
-    I32 isInside[2];
-    F32 fraction;
-};
 
 /// What four pixels add up to, and the share of each in alpha.
 struct Weighed {
@@ -126,6 +17,7 @@ using Four = Channels[4];
 
 template <class Layout, class Zero, MotionAlpha kAlpha>
 struct Bilinear {
+    using Rows = MixedRows<Layout, Zero, kAlpha>;
     static constexpr int32_t kMargin = 2;
     static constexpr bool kIsFloat = Layout::kFull == 1;
 
@@ -202,59 +94,6 @@ struct Bilinear {
         for (int32_t n = 0; n < count; n += kLanes) StorePixels(out + 4 * n, Zero::Value(), count - n);
     }
 
-    /// Two rows of the source, one after the other, and a row between them.
-    class LevelRows {
-    public:
-        explicit LevelRows(const MotionRow& row) : fRowBytes(row.rowBytes) {
-            float places[kLanes];
-            Store(places, Floats(row.y));
-            const InnerCell cell(places, row.top, row.bottom);
-            int32_t firsts[kLanes];
-            float fractions[kLanes];
-            Store(firsts, cell.first);
-            Store(fractions, cell.fraction);
-            upper = row.pixels + firsts[0] * row.rowBytes;
-            fraction = fractions[0];
-        }
-
-        /// So many pixels from one on. Returns whether all have so much alpha that, of any two, the share of one of the
-        /// four in the source is enough to be seen; and none is infinite, of which sums and shares tell different things.
-        bool Mix(int32_t first, int32_t width, float* mixed) const {
-            const F32 fy = Floats(fraction);
-            I32 isMuch = Ints(-1);
-            Go(first, width, [&](int32_t at, F32 above, F32 below) {
-                const F32 sum = above + (below - above) * fy;
-                Store(mixed + at, sum);
-                if constexpr (kAlpha != MotionAlpha::none) isMuch = isMuch & Less(Floats(0x1p-13f), sum);
-                if constexpr (kIsFloat && kAlpha != MotionAlpha::none)
-                    isMuch = isMuch & Less(sum, Floats(0x1p127f));
-            });
-            return !AnyNegative(Not(isMuch) & AlphaLanes<AlphaPlace::last>());
-        }
-
-        /// The greater of two alphas by the weight of its row.
-        void TakeShares(int32_t first, int32_t width, float* shares) const {
-            const F32 fy = Floats(fraction), gy = Floats(1 - fraction);
-            Go(first, width,
-               [&](int32_t at, F32 above, F32 below) { Store(shares + at, Max(above * gy, below * fy)); });
-        }
-
-        const uint8_t* upper;
-        float fraction;
-
-    private:
-        template <class Use>
-        void Go(int32_t first, int32_t width, Use use) const {
-            const uint8_t* const begin = upper + int64_t{first} * Layout::kPixelBytes;
-            ByVectors(4 * width, [&](int32_t at) {
-                const uint8_t* const pixels = begin + int64_t{at} * Layout::kPixelBytes / 4;
-                use(at, LoadLevel(pixels), LoadLevel(pixels + fRowBytes));
-            });
-        }
-
-        int64_t fRowBytes;
-    };
-
     static constexpr bool kFindsEdges = false;
 
     void Locate(const float* places, int32_t* pixels, int32_t* fractions, int32_t count) const {
@@ -269,7 +108,7 @@ struct Bilinear {
     /// where there are too many columns of the source between two of the destination.
     void Level(int32_t columns, float* out) const {
         if (columns < 1) return;
-        const LevelRows rows(row);
+        const Rows rows(row);
         for (int32_t begin = 0; begin < columns; begin += kBlock) {
             const int32_t count = columns - begin < kBlock ? columns - begin : kBlock;
             const int32_t* const pixels = row.shared->pixels + begin;
@@ -284,7 +123,7 @@ struct Bilinear {
 
     static constexpr int32_t kMostColumns = 2 * kBlock;
 
-    void BlendRows(const LevelRows& rows, const Range& range, const int32_t* pixels, const float* fractions,
+    void BlendRows(const Rows& rows, const Range& range, const int32_t* pixels, const float* fractions,
                    int32_t count, float* out) const {
         // A vector's worth at least, which the source has: its margins are two pixels each.
         const int32_t most = row.right - kVectorPixels, least = range.least < most ? range.least : most;
@@ -320,7 +159,7 @@ struct Bilinear {
                 LoadSideBySide<false>(shares, pixels + n, least, left, right);
                 sum = FromBits(IsSeen(Max(left * (Floats(1) - fx), right * fx)) & Bits(sum));
             }
-            StorePixels(out + 4 * n, Zero::kIsZero ? sum : sum + InterleavedZero(), count - n);
+            StorePixels(out + 4 * n, Zero::kIsZero ? sum : sum + Zero::Interleaved(), count - n);
         }
     }
 
@@ -344,20 +183,6 @@ struct Bilinear {
         }
     }
 
-    /// Interleaved pixels as they are weighed: differences from the zeros, multiplied by alpha.
-    static F32 LoadLevel(const uint8_t* pixels) {
-        F32 c = LoadInterleaved(Layout(), pixels);
-        if constexpr (!Zero::kIsZero) c = c - InterleavedZero();
-        if constexpr (kAlpha == MotionAlpha::none) return BlendBlocks<8>(Floats(Layout::kFull), c);
-        if constexpr (kAlpha == MotionAlpha::straight) {
-            const F32 alpha = BroadcastAlpha<AlphaPlace::last>(c);
-            return BlendBlocks<8>(alpha, c * (kIsFloat ? alpha : alpha * Floats(1 / Layout::kFull)));
-        }
-        return c;
-    }
-
-    static F32 InterleavedZero() { return Zero::kIsZero ? Floats(0) : PixelFloats(128, 128, 16, 0); }
-
     /// Places first, all of them, so that no load waits for what has just been stored.
     void Inside(const Places& places, int32_t count, float* out) const {
         alignas(64) float fx[kBlock], fy[kBlock];
@@ -377,7 +202,7 @@ struct Bilinear {
     }
 
     /// The same between two rows.
-    void BlendCells(const LevelRows& rows, const int32_t* pixels, const float* fractions, int32_t count,
+    void BlendCells(const Rows& rows, const int32_t* pixels, const float* fractions, int32_t count,
                     float* out) const {
         alignas(64) int64_t offsets[kBlock];
         for (int32_t i = 0; i < WholeGroups(count); ++i)

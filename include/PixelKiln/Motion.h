@@ -81,9 +81,11 @@ extern "C" {
 ///  - PK_Success: drawn, or nothing to draw: an opacity or scale below 8e-6, negative ones included, an image of size 0, or
 ///    a source that reaches no pixel.
 ///  - PK_ErrFailed: a negative or too great size, or a null pointer where there are pixels.
-///  - PK_ErrOutOfMemory: no memory for the blurred or progressive source, or for rows.
+///  - PK_ErrOutOfMemory: no memory for the blurred or progressive source, for rows or for the weights of quality 5; or a
+///    field of the crop without rows, to be blurred without smooth edges.
 ///
-/// Arguments are checked in this order, before memory is touched.
+/// Arguments are checked in this order, before memory is touched. Memory for rows is there before the first is drawn; where a
+/// second field finds none for its source, the first is drawn.
 PK_API PK_Result PK_Motion(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
                            PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst,
                            int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,
