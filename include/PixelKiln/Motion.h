@@ -89,20 +89,22 @@ extern "C" {
 PK_API PK_Result PK_Motion(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
                            PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst,
                            int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,
-                           int32_t dstField, uint32_t aspectNum, uint32_t aspectDen, PK_Point position, PK_Point anchor,
-                           PK_Point scale, double rotation, float opacity, bool composite, double softness,
-                           bool smoothEdges, int32_t renderField, int32_t quality, bool compositeInLinear) noexcept;
+                           int32_t dstField, uint32_t aspectNum, uint32_t aspectDen, PK_Point position,
+                           PK_Point anchor, PK_Point scale, double rotation, float opacity, bool composite,
+                           double softness, bool smoothEdges, int32_t renderField, int32_t quality,
+                           bool compositeInLinear) noexcept;
 
 /// Places a source over a destination, as PK_Motion with \p composite does, by a blend mode. Parameters as there, and:
 /// \param blendMode  a blend mode; for PK_BlendMode_Dissolve the C runtime's random numbers are started anew by srand(1).
 /// \return what PK_Motion returns, and what PK_CompositeWithBlendMode returns for a mode that there is not.
-PK_API PK_Result PK_MotionWithBlendMode(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
-                                        PK_PixelFormat srcFormat, int32_t srcField, const PK_Rect* srcRect, void* dst,
-                                        int32_t dstRowBytes, int32_t dstWidth, int32_t dstHeight,
-                                        PK_PixelFormat dstFormat, int32_t dstField, uint32_t aspectNum,
-                                        uint32_t aspectDen, PK_Point position, PK_Point anchor, PK_Point scale,
-                                        double rotation, float opacity, double softness, bool smoothEdges,
-                                        int32_t renderField, PK_BlendMode blendMode, int32_t quality,
+PK_API PK_Result PK_MotionWithBlendMode(const void* src, int32_t srcRowBytes, int32_t srcWidth,
+                                        int32_t srcHeight, PK_PixelFormat srcFormat, int32_t srcField,
+                                        const PK_Rect* srcRect, void* dst, int32_t dstRowBytes,
+                                        int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,
+                                        int32_t dstField, uint32_t aspectNum, uint32_t aspectDen,
+                                        PK_Point position, PK_Point anchor, PK_Point scale, double rotation,
+                                        float opacity, double softness, bool smoothEdges, int32_t renderField,
+                                        PK_BlendMode blendMode, int32_t quality,
                                         bool compositeInLinear) noexcept;
 
 } // extern "C"

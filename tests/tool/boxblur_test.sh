@@ -32,7 +32,7 @@ for radius in -1 x 1e9; do
     expect 2 "--radius" boxblur in/grey.png out/x.png "--radius=$radius"
 done
 expect 2 "--radius" boxblur in/grey.png out/x.png
-expect 2 "the radius is no number" boxblur in/grey.png out/x.png --radius nan
+expect 2 "'nan' is not a number" boxblur in/grey.png out/x.png --radius nan
 for passes in 0 -1 101; do
     expect 2 "--passes" boxblur in/grey.png out/x.png --radius 1 "--passes=$passes"
 done

@@ -32,7 +32,7 @@ for ratio in -0.1 1.1 x; do
     expect 2 "--ratio" dissolve in/dark.png in/bright.png out/x.png "--ratio=$ratio"
 done
 expect 2 "--ratio" dissolve in/dark.png in/bright.png out/x.png
-expect 2 "the ratio is no number" dissolve in/dark.png in/bright.png out/x.png --ratio nan
+expect 2 "'nan' is not a number" dissolve in/dark.png in/bright.png out/x.png --ratio nan
 expect 2 "OUT" dissolve in/dark.png in/bright.png --ratio 0.5
 expect 1 "one has 8x6 and the other has 451x300" dissolve in/dark.png "$photo" out/x.png --ratio 0.5
 expect 3 "No such file" dissolve in/dark.png in/missing.png out/x.png --ratio 0.5

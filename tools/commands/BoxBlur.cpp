@@ -7,7 +7,6 @@
 #include "SharedWords.h"
 
 #include <algorithm>
-#include <cmath>
 #include <vector>
 
 namespace tool {
@@ -43,7 +42,6 @@ void Declare(Words& words, Options& options) {
 
 void Run(const Options& options) {
     BoxBlur blur = options.blur;
-    if (std::isnan(blur.radius)) throw Failure(kExitUsage, "the radius is no number");
     if (!blur.rows && !blur.columns) blur.rows = blur.columns = true;
     PipeFramesInTheirFormat(options, OnCopy([&](Frame& frame) { Blur(frame, blur); }));
 }

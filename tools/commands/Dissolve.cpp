@@ -6,7 +6,6 @@
 #include "Png.h"
 #include "SharedWords.h"
 
-#include <cmath>
 
 namespace tool {
 namespace {
@@ -24,7 +23,6 @@ void Declare(Words& words, Options& options) {
 }
 
 void Run(const Options& options) {
-    if (std::isnan(options.ratio)) throw Failure(kExitUsage, "the ratio is no number");
     const Frame second = ReadPng(options.second);
     PipeFramesInTheirFormat(options, [&](const Frame& frame) {
         return Dissolved(frame, second, options.ratio, options.quality);
