@@ -3,8 +3,6 @@
 
 #include "geometry/MotionWalk.h"
 
-#include <utility>
-
 namespace PK::PK_TARGET {
 namespace {
 
@@ -78,8 +76,7 @@ struct TapSums {
     template <int32_t kTaps>
     [[gnu::always_inline]] void Add(const float* pixels, const float* weights, int32_t taps) {
         if constexpr (kTaps > 0) {
-            AddGroups(pixels, weights, std::make_integer_sequence<int32_t, kTaps / kTogether>());
-            if constexpr (kTaps % kTogether != 0) AddPair(pixels, weights, kTaps / kTogether * kTogether);
+            AddFrom<0, kTaps>(pixels, weights);
         } else {
             int32_t tap = 0;
             for (; tap + kTogether <= taps; tap += kTogether) AddGroup(pixels, weights, tap);
@@ -103,10 +100,14 @@ struct TapSums {
     }
 
 private:
-    template <int32_t... kGroups>
-    [[gnu::always_inline]] void AddGroups(const float* pixels, const float* weights,
-                                          std::integer_sequence<int32_t, kGroups...>) {
-        (AddGroup(pixels, weights, kTogether * kGroups), ...);
+    template <int32_t kTap, int32_t kTaps>
+    [[gnu::always_inline]] void AddFrom(const float* pixels, const float* weights) {
+        if constexpr (kTap + kTogether <= kTaps) {
+            AddGroup(pixels, weights, kTap);
+            AddFrom<kTap + kTogether, kTaps>(pixels, weights);
+        } else if constexpr (kTap < kTaps) {
+            AddPair(pixels, weights, kTap);
+        }
     }
 
     [[gnu::always_inline]] void AddGroup(const float* pixels, const float* weights, int32_t tap) {

@@ -6,7 +6,6 @@
 #include "Png.h"
 #include "SharedWords.h"
 
-
 namespace tool {
 namespace {
 
