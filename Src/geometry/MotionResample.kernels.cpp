@@ -177,8 +177,8 @@ struct HighQuality {
         const Reaches rows(y, 1, row.top, row.bottom, weightsY.Taps());
         for (int32_t begin = 0; begin < columns; begin += kBlock) {
             const int32_t count = columns - begin < kBlock ? columns - begin : kBlock;
-            const int32_t *const pixels = row.shared->pixels + begin, *const phases =
-                                                                          row.shared->weights + begin;
+            const int32_t* const pixels = row.shared->pixels + begin;
+            const int32_t* const phases = row.shared->weights + begin;
             const Range range = RangeOf(pixels, count);
             float* const to = out + int64_t{kPixelFloats} * begin;
             if (int64_t{range.most} - range.least + kMostTaps <= kMostColumns)
@@ -190,8 +190,8 @@ struct HighQuality {
         }
     }
 
-    static constexpr int32_t kMostColumns =
-        5 * kBlock; // at a quarter of the size, the least that has a table of its own
+    // At a quarter of the size, the least that has a table of its own, it is a little more than four.
+    static constexpr int32_t kMostColumns = 5 * kBlock;
 
     void SumRows(int32_t firstLine, int32_t phase, const Range& range, const int32_t* pixels,
                  const int32_t* phases, int32_t count, float* out) const {
