@@ -30,7 +30,8 @@ inline F32 LoadInterleaved(Pixels32f<kAlpha>, const uint8_t* pixels) {
 template <class Layout, class Zero, MotionAlpha kAlpha>
 class MixedRows {
 public:
-    explicit MixedRows(const MotionRow& row) : fRowBytes(row.rowBytes) {
+    explicit MixedRows(const MotionRow& row)
+        : fOpaqueAlpha(row.isOpaque ? AlphaLanes<AlphaPlace::last>() : Ints(0)), fRowBytes(row.rowBytes) {
         float places[kLanes];
         Store(places, Floats(row.y));
         const InnerCell cell(places, row.top, row.bottom);
@@ -50,9 +51,8 @@ public:
         Go(first, width, [&](int32_t at, F32 above, F32 below) {
             const F32 sum = above + (below - above) * fy;
             Store(mixed + at, sum);
-            if constexpr (kAlpha != MotionAlpha::none) isMuch = isMuch & Less(Floats(0x1p-13f), sum);
-            if constexpr (kIsFloat && kAlpha != MotionAlpha::none)
-                isMuch = isMuch & Less(sum, Floats(0x1p127f));
+            isMuch = isMuch & Less(Floats(0x1p-13f), sum);
+            if constexpr (kIsFloat) isMuch = isMuch & Less(sum, Floats(0x1p127f));
         });
         return !AnyNegative(Not(isMuch) & AlphaLanes<AlphaPlace::last>());
     }
@@ -71,15 +71,14 @@ private:
     static constexpr bool kIsFloat = Layout::kFull == 1;
 
     /// Interleaved pixels as they are weighed: differences from the zeros, multiplied by alpha.
-    static F32 Load(const uint8_t* pixels) {
+    F32 Load(const uint8_t* pixels) const {
         F32 c = LoadInterleaved(Layout(), pixels);
         if constexpr (!Zero::kIsZero) c = c - Zero::Interleaved();
-        if constexpr (kAlpha == MotionAlpha::none) return BlendBlocks<8>(Floats(Layout::kFull), c);
         if constexpr (kAlpha == MotionAlpha::straight) {
             const F32 alpha = BroadcastAlpha<AlphaPlace::last>(c);
             return BlendBlocks<8>(alpha, c * (kIsFloat ? alpha : alpha * Floats(1 / Layout::kFull)));
         }
-        return c;
+        return Select(fOpaqueAlpha, Floats(Layout::kFull), c);
     }
 
     template <class Use>
@@ -91,6 +90,7 @@ private:
         });
     }
 
+    I32 fOpaqueAlpha; // where there is an alpha to be made full
     int64_t fRowBytes;
 };
 

@@ -67,9 +67,9 @@ MotionRows::MotionRows(const MotionJob& job, const DestinationImage& destination
                        const MotionSteps& steps, PK_PixelFormat sampled, bool isRotated,
                        const ResampleTable& kernelX, const ResampleTable& kernelY)
     : fJob(job), fDrawer(job), fDestination(destination), fBox(box), fSteps(steps), fIsRotated(isRotated),
-      fKernelX(kernelX), fKernelY(kernelY), fSample(ChooseMotionSampler(sampled, job.quality)),
-      fScale(MotionLineScale(job.source.format)), fLineFormat(LineFormat(job.source.format)),
-      fRowMemory(ColumnsOfUnits()) {}
+      fIsOpaque(AlphaOf(sampled) == kAlphaMeaningless), fKernelX(kernelX), fKernelY(kernelY),
+      fSample(ChooseMotionSampler(sampled, job.quality)), fScale(MotionLineScale(job.source.format)),
+      fLineFormat(LineFormat(job.source.format)), fRowMemory(ColumnsOfUnits()) {}
 
 PK_Result MotionRows::Build() {
     const PK_PixelFormat to = fDestination.format, parted = Packed4444(to, kAlphaMeaningless, kDepth32f);
@@ -141,6 +141,7 @@ MotionRows::Span MotionRows::SpanOfRow(const MotionSourceRows& source, PK_Point 
                            Columns(),
                            fIsRotated,
                            fJob.smoothEdges,
+                           fIsOpaque,
                            fKernelX,
                            fKernelY,
                            &columns};

@@ -58,7 +58,7 @@ private:
     DestinationImage fDestination;
     PK_Rect fBox;
     MotionSteps fSteps;
-    bool fIsRotated;
+    bool fIsRotated, fIsOpaque;
     ResampleTable fKernelX, fKernelY;
     SampleMotionRow fSample;
     std::optional<LineScale> fScale;

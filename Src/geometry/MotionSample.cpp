@@ -33,8 +33,7 @@ SampleMotionRow ChooseMotionSampler(PK_PixelFormat format, int32_t quality) noex
         return IsOrderReversed(format) ? kernels.alphaFirst : kernels.alphaLast;
     }
     const MotionSampleKernels& kernels = Best<MotionSampleKernels>();
-    if (isPremultiplied) return kernels.premultiplied[layout];
-    return AlphaOf(format) == kAlphaStraight ? kernels.straight[layout] : kernels.opaque[layout];
+    return AlphaOf(format) == kAlphaStraight ? kernels.straight[layout] : kernels.premultiplied[layout];
 }
 
 std::optional<LineScale> MotionLineScale(PK_PixelFormat format) noexcept {

@@ -21,15 +21,16 @@ struct Bilinear {
     static constexpr int32_t kMargin = 2;
     static constexpr bool kIsFloat = Layout::kFull == 1;
 
-    explicit Bilinear(const MotionRow& from) : row(from) {}
+    explicit Bilinear(const MotionRow& from) : row(from), opaque(Ints(from.isOpaque ? -1 : 0)) {}
 
-    /// As differences, and with full alpha if the layout has none.
-    static Channels Prepare(Channels c) {
+    /// As differences, and with full alpha where that of the source means nothing.
+    Channels Prepare(Channels c) const {
         if constexpr (!Zero::kIsZero) {
             const Channels zero = Zero::Value();
             c = {c.c0 - zero.c0, c.c1 - zero.c1, c.c2 - zero.c2, c.c3};
         }
-        if constexpr (kAlpha == MotionAlpha::none) c.c3 = Floats(Layout::kFull);
+        if constexpr (kAlpha == MotionAlpha::premultiplied)
+            c.c3 = Select(opaque, Floats(Layout::kFull), c.c3);
         return c;
     }
 
@@ -72,7 +73,7 @@ struct Bilinear {
         return Prepare(Layout::Load(copies));
     }
 
-    void Edge(const Places& places, int32_t count, float* out) const {
+    [[gnu::noinline]] void Edge(const Places& places, int32_t count, float* out) const {
         if (row.left >= row.right || row.top >= row.bottom) return Clear(count, out);
         for (int32_t n = 0; n < count; n += kLanes) {
             const EdgeCell x(places.x + n, row.left, row.right), y(places.y + n, row.top, row.bottom);
@@ -186,60 +187,56 @@ struct Bilinear {
     /// Places first, all of them, so that no load waits for what has just been stored.
     void Inside(const Places& places, int32_t count, float* out) const {
         alignas(64) float fx[kBlock], fy[kBlock];
-        alignas(64) int32_t columns[kBlock], rows[kBlock];
         alignas(64) int64_t offsets[kBlock];
         for (int32_t n = 0; n < count; n += kLanes) {
             const InnerCell x(places.x + n, row.left, row.right), y(places.y + n, row.top, row.bottom);
-            Store(columns + n, x.first);
-            Store(rows + n, y.first);
+            int32_t columns[kLanes], rows[kLanes];
+            Store(columns, x.first);
+            Store(rows, y.first);
             Store(fx + n, x.fraction);
             Store(fy + n, y.fraction);
+            for (int32_t i = 0; i < kLanes; ++i)
+                offsets[n + i] = rows[i] * row.rowBytes + int64_t{columns[i]} * Layout::kPixelBytes;
         }
-        for (int32_t i = 0; i < WholeGroups(count); ++i)
-            offsets[i] = rows[i] * row.rowBytes + int64_t{columns[i]} * Layout::kPixelBytes;
-        BlendCells(
-            row.pixels, offsets, fx, [&](int32_t n) { return LoadFloats(fy + n); }, count, out);
+        BlendCells(row.pixels, offsets, fx, fy, count, out);
     }
 
     /// The same between two rows.
     void BlendCells(const Rows& rows, const int32_t* pixels, const float* fractions, int32_t count,
                     float* out) const {
         alignas(64) int64_t offsets[kBlock];
-        for (int32_t i = 0; i < WholeGroups(count); ++i)
-            offsets[i] = int64_t{pixels[i]} * Layout::kPixelBytes;
-        BlendCells(
-            rows.upper, offsets, fractions, [&](int32_t) { return Floats(rows.fraction); }, count, out);
+        alignas(64) float fy[kBlock];
+        for (int32_t n = 0; n < count; n += kLanes) {
+            Store(fy + n, Floats(rows.fraction));
+            for (int32_t i = 0; i < kLanes; ++i)
+                offsets[n + i] = int64_t{pixels[n + i]} * Layout::kPixelBytes;
+        }
+        BlendCells(rows.upper, offsets, fractions, fy, count, out);
     }
 
-    static int32_t WholeGroups(int32_t count) { return (count + kLanes - 1) / kLanes * kLanes; }
-
     /// Of four pixels each, the first at an offset in bytes.
-    template <class FractionOfRows>
-    void BlendCells(const uint8_t* base, const int64_t* offsets, const float* fx, FractionOfRows fy,
-                    int32_t count, float* out) const {
+    [[gnu::noinline]] void BlendCells(const uint8_t* base, const int64_t* offsets, const float* fx,
+                                      const float* fy, int32_t count, float* out) const {
         for (int32_t n = 0; n < count; n += kLanes) {
             Four pixels;
             LoadNeighbours(Layout(), base, offsets + n, pixels[0], pixels[1]);
             LoadNeighbours(Layout(), base + row.rowBytes, offsets + n, pixels[2], pixels[3]);
             for (Channels& pixel : pixels) pixel = Prepare(pixel);
-            const Weighed weighed = Weigh(pixels, LoadFloats(fx + n), fy(n));
+            const Weighed weighed = Weigh(pixels, LoadFloats(fx + n), LoadFloats(fy + n));
             StorePixels(out + 4 * n, Finish(weighed.sum, IsVisible(weighed)), count - n);
         }
     }
 
     /// Inside the source a pixel is seen as soon as one of the four is.
     static I32 IsVisible(const Weighed& weighed) {
-        if constexpr (kAlpha == MotionAlpha::none) {
-            return Ints(-1);
-        } else {
-            const F32 least = Floats(0x1p-17f);
-            const F32(&shares)[4] = weighed.shares;
-            return (Less(least, shares[0]) | Less(least, shares[1])) |
-                   (Less(least, shares[2]) | Less(least, shares[3]));
-        }
+        const F32 least = Floats(0x1p-17f);
+        const F32(&shares)[4] = weighed.shares;
+        return (Less(least, shares[0]) | Less(least, shares[1])) |
+               (Less(least, shares[2]) | Less(least, shares[3]));
     }
 
     const MotionRow row; // a copy, which no store to the line can change in the compiler's eyes
+    const I32 opaque;    // everywhere or nowhere
 };
 
 template <MotionAlpha kAlpha>
@@ -269,7 +266,6 @@ constexpr MotionSampleKernels MakeKernels() {
     MotionSampleKernels kernels{};
     Enter<MotionAlpha::straight>(kernels.straight);
     Enter<MotionAlpha::premultiplied>(kernels.premultiplied);
-    Enter<MotionAlpha::none>(kernels.opaque);
     kernels.scaleLine = RowWith<ScaleLine, LineScale>;
     return kernels;
 }

@@ -41,6 +41,7 @@ struct MotionRow {
     int32_t columns;
     bool rotated;                   // else y is the same for all columns
     bool smoothEdges;               // what lies outside is transparent; else the nearest pixel stands for it
+    bool isOpaque;                  // alpha means nothing and counts as full; of what is not straight
     ResampleTable kernelX, kernelY; // only read at the highest quality
     MotionColumns* shared;          // by the rows of a band; not read where they are turned
 };
@@ -68,7 +69,7 @@ enum MotionLayout : int32_t {
     kMotionLayouts
 };
 
-enum class MotionAlpha : int32_t { straight, premultiplied, none };
+enum class MotionAlpha : int32_t { straight, premultiplied };
 
 /// (channel - zero) x scale, by channel.
 struct LineScale {
@@ -77,8 +78,7 @@ struct LineScale {
 
 struct MotionSampleKernels {
     SampleMotionRow straight[kMotionLayouts];
-    SampleMotionRow premultiplied[kMotionLayouts];
-    SampleMotionRow opaque[kMotionLayouts];
+    SampleMotionRow premultiplied[kMotionLayouts]; // and opaque
 
     // Takes a line to the range of floats; in place, too.
     RowKernelWith<LineScale> scaleLine;

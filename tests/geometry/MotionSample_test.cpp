@@ -126,6 +126,7 @@ MotionRow RowOf(const MotionSource& source, const MotionLine& line) {
     row.columns = line.columns;
     row.rotated = line.rotated;
     row.smoothEdges = source.smoothEdges;
+    row.isOpaque = AlphaOf(source.format) == kAlphaMeaningless;
     return row;
 }
 

@@ -347,6 +347,7 @@ MotionRow DrawMotionRow(Random& random, int32_t columns, int32_t pixelBytes) {
     row.rowBytes = int64_t{row.right} * pixelBytes;
     row.rotated = random.Below(2) != 0;
     row.smoothEdges = random.Below(2) != 0;
+    row.isOpaque = random.Below(3) == 0;
     row.x = DrawBetween(random, -3, 3);
     row.y = DrawBetween(random, 4, 13);
     row.stepX = DrawBetween(random, 0.45f, 0.55f);
