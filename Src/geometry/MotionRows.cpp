@@ -110,11 +110,24 @@ PK_Result MotionRows::DrawBand(const MotionSourceRows& source, PK_Point at, int3
     MotionColumns columns = {numbers, numbers + SharedColumns()};
     for (int32_t row = first; row < end; ++row, at.x += fSteps.row.x, at.y += fSteps.row.y) {
         if (!IsOfField(row, field)) continue;
-        const Span span = SpanOfRow(source, at, columns, line);
-        if (span.count < 1) continue;
+        float* const own = LineOf(row);
+        const Span span = SpanOfRow(source, at, columns, own != nullptr ? own : line);
+        if (span.count < 1 || IsDrawn(span, own)) continue;
         if (const PK_Result result = DrawSpan(span, row, rows.Scratch(), units)) return result;
     }
     return PK_Success;
+}
+
+/// The row of the destination itself, where it is one of lines that nothing more happens to.
+float* MotionRows::LineOf(int32_t row) const {
+    uint8_t* const line = fDestination.Row(row) + int64_t{fBox.left} * BytesPerPixel(fLineFormat);
+    const bool isAligned = reinterpret_cast<uintptr_t>(line) % alignof(float) == 0;
+    return fLine.IsCopy() && fDrawer.IsConversion() && isAligned ? reinterpret_cast<float*>(line) : nullptr;
+}
+
+/// Sampled where it belongs.
+bool MotionRows::IsDrawn(const Span& span, const float* own) const {
+    return own != nullptr && span.chain == &fLine;
 }
 
 bool MotionRows::IsOfField(int32_t row, int32_t field) const {

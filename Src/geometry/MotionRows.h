@@ -47,6 +47,8 @@ private:
     PK_Result DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end, int32_t field,
                        TemporaryRows& rows) const;
     bool IsOfField(int32_t row, int32_t field) const;
+    float* LineOf(int32_t row) const;
+    bool IsDrawn(const Span& span, const float* own) const;
     Span SpanOfRow(const MotionSourceRows& source, PK_Point at, MotionColumns& columns, float* line) const;
     Span ExactSpan(const MotionSourceRows& source, int32_t column, int32_t row) const;
     PK_Result DrawSpan(const Span& span, int32_t row, const ChainScratch& scratch, uint8_t* units) const;
