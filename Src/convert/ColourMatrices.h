@@ -99,10 +99,6 @@ inline Channels YUVToYUV(Channels vuya) {
             AddTerm(AddTerm(vuya.c2, kMatrix.yFromU, vuya.c1), kMatrix.yFromV, vuya.c0), vuya.c3};
 }
 
-inline Channels ToFloat(IntChannels codes) {
-    return {ToFloat(codes.c0), ToFloat(codes.c1), ToFloat(codes.c2), ToFloat(codes.c3)};
-}
-
 /// V, U, Y, A codes with chroma counted from 128 and luma from 16.
 inline Channels RemoveOffsets(Channels vuya) {
     return {vuya.c0 - Floats(128), vuya.c1 - Floats(128), vuya.c2 - Floats(16), vuya.c3};

@@ -17,8 +17,6 @@ struct ResampleTable {
 /// first to inner is sampled with a look at the edges of the source, as is right to end; what is between lies inside.
 struct MotionParts {
     int32_t first, inner, right, end;
-
-    bool operator==(const MotionParts&) const = default;
 };
 
 /// Where the columns of rows that are not turned lie in the source, the same for all rows of a band. The first of them that

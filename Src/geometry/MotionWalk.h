@@ -95,20 +95,30 @@ private:
     bool fIsTurned;
 };
 
-/// As many pixels of a group as there are.
-[[gnu::always_inline]] inline void StorePixels(float* out, const Channels& pixels, int32_t count) {
-    if (count >= kLanes) return StoreFloatChannels(out, pixels);
+/// Less than a group of pixels, or than a vector of interleaved ones.
+inline void StoreSome(float* out, const Channels& pixels, int32_t count) {
     alignas(64) float scratch[4 * kLanes];
     StoreFloatChannels(scratch, pixels);
     std::memcpy(out, scratch, sizeof(float) * 4 * static_cast<size_t>(count));
 }
-
-/// The same of a vector of interleaved pixels.
-[[gnu::always_inline]] inline void StorePixels(float* out, F32 pixels, int32_t count) {
-    if (count >= kVectorPixels) return Store(out, pixels);
+inline void StoreSome(float* out, F32 pixels, int32_t count) {
     alignas(64) float scratch[kLanes];
     Store(scratch, pixels);
     std::memcpy(out, scratch, sizeof(float) * 4 * static_cast<size_t>(count));
+}
+
+/// As many as there are.
+[[gnu::always_inline]] inline void StorePixels(float* out, const Channels& pixels, int32_t count) {
+    if (count >= kLanes)
+        StoreFloatChannels(out, pixels);
+    else
+        StoreSome(out, pixels, count);
+}
+[[gnu::always_inline]] inline void StorePixels(float* out, F32 pixels, int32_t count) {
+    if (count >= kVectorPixels)
+        Store(out, pixels);
+    else
+        StoreSome(out, pixels, count);
 }
 
 inline I32 Floor(F32 x) {
@@ -169,6 +179,10 @@ inline void ByVectors(int32_t floats, Use use) {
     if (at < floats) use(floats - kLanes);
 }
 
+inline bool AreEqual(const MotionParts& a, const MotionParts& b) {
+    return a.first == b.first && a.inner == b.inner && a.right == b.right && a.end == b.end;
+}
+
 /// A sampler has kMargin and makes pixels of places: Edge(places, count, out), Inside(places, count, out). Of a row that is
 /// not turned it finds the columns, Locate(places, pixels, weights, count), and makes pixels of them: Level(columns from
 /// the first that were found, count, out); of those inside, or at the edges too if it kFindsEdges.
@@ -190,11 +204,11 @@ public:
             });
             Edge(right);
         } else if constexpr (Sampler::kFindsEdges) {
-            if (!(fRow.shared->parts == fParts)) Locate(left, inside, right);
+            if (!AreEqual(fRow.shared->parts, fParts)) Locate(left, inside, right);
             fSampler.Level(left + inside + right, fOut);
         } else {
             Edge(left);
-            if (!(fRow.shared->parts == fParts)) Locate(0, inside, 0);
+            if (!AreEqual(fRow.shared->parts, fParts)) Locate(0, inside, 0);
             fSampler.Level(inside, fOut);
             fOut += int64_t{4} * inside;
             fWalk.Skip(inside);

@@ -33,10 +33,6 @@ inline I32 NearestCode(F32 x) {
     return Max(Nearest(AtMost(Floats(kLimit), x)), Ints(0));
 }
 
-inline Channels ToFloat(IntChannels codes) {
-    return {ToFloat(codes.c0), ToFloat(codes.c1), ToFloat(codes.c2), ToFloat(codes.c3)};
-}
-
 /// How the codes of an integer layout become floats and come back.
 template <class Layout, int32_t kFullCode>
 struct CodesAsFloats {

@@ -43,6 +43,10 @@ struct IntChannels {
     I32 c0, c1, c2, c3;
 };
 
+inline Channels ToFloat(IntChannels codes) {
+    return {ToFloat(codes.c0), ToFloat(codes.c1), ToFloat(codes.c2), ToFloat(codes.c3)};
+}
+
 /// The four bytes of each lane.
 inline IntChannels ByteChannels(I32 pixels) {
     const I32 low = Ints(0xff);
