@@ -151,11 +151,7 @@ const AddPeers add = {
     {"Box blur of rows, radius 10", "OpenCV boxFilter 21 x 1", false, BoxFilter<21, 1>},
     {"Box blur of columns, radius 10", "OpenCV boxFilter 1 x 21", false, BoxFilter<1, 21>},
     {"Gaussian blur of BGRP 8u, sigma 1", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 1>},
-    {"Gaussian blur of BGRP 8u, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 10>},
-    {"Gaussian blur of BGRP 8u, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 40>},
     {"Gaussian blur of BGRP 32f, sigma 1", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 1>},
-    {"Gaussian blur of BGRP 32f, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 10>},
-    {"Gaussian blur of BGRP 32f, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 40>},
     {"Placing of BGRP 8u turned, bilinear", "OpenCV warpAffine", false, Turn<CV_8UC4, cv::INTER_LINEAR>},
     {"Placing of BGRP 32f turned, bilinear", "OpenCV warpAffine", false, Turn<CV_32FC4, cv::INTER_LINEAR>},
     {"Placing of BGRP 32f turned, cubic", "OpenCV warpAffine", false, Turn<CV_32FC4, cv::INTER_CUBIC>},
@@ -168,6 +164,18 @@ const AddPeers add = {
     {"Quad warp, bilinear", "OpenCV warpAffine", false, Warp<cv::INTER_LINEAR>},
     {"Quad warp, nearest", "OpenCV warpAffine", false, Warp<cv::INTER_NEAREST>},
 };
+
+// They take seconds on large frames.
+const bool areWideBlursAdded = [] {
+    if (kHeight > 1080) return false;
+    AddPeers{
+        {"Gaussian blur of BGRP 8u, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 10>},
+        {"Gaussian blur of BGRP 8u, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_8UC4, 40>},
+        {"Gaussian blur of BGRP 32f, sigma 10", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 10>},
+        {"Gaussian blur of BGRP 32f, sigma 40", "OpenCV GaussianBlur", false, GaussianBlur<CV_32FC4, 40>},
+    };
+    return true;
+}();
 
 const bool onOneThread = [] {
     cv::setNumThreads(1);
