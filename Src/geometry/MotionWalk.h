@@ -95,13 +95,13 @@ private:
     bool fIsTurned;
 };
 
-/// Less than a group of pixels, or than a vector of interleaved ones.
-inline void StoreSome(float* out, const Channels& pixels, int32_t count) {
+/// Less than a group of pixels, or than a vector of interleaved ones; to a line of any alignment.
+inline void StoreSome(void* out, const Channels& pixels, int32_t count) {
     alignas(64) float scratch[4 * kLanes];
     StoreFloatChannels(scratch, pixels);
     std::memcpy(out, scratch, sizeof(float) * 4 * static_cast<size_t>(count));
 }
-inline void StoreSome(float* out, F32 pixels, int32_t count) {
+inline void StoreSome(void* out, F32 pixels, int32_t count) {
     alignas(64) float scratch[kLanes];
     Store(scratch, pixels);
     std::memcpy(out, scratch, sizeof(float) * 4 * static_cast<size_t>(count));
