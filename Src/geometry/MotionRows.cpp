@@ -72,16 +72,26 @@ MotionRows::MotionRows(const MotionJob& job, const DestinationImage& destination
       fLineFormat(LineFormat(job.source.format)), fRowMemory(ColumnsOfUnits()) {}
 
 PK_Result MotionRows::Build() {
-    const PK_PixelFormat to = fDestination.format, parted = Packed4444(to, kAlphaMeaningless, kDepth32f);
-    if (!fDirect.Build(fJob.source.format, to, fJob.quality) || !fLine.Build(fLineFormat, to, fJob.quality) ||
-        !fFromUnits.Build(to, parted, fJob.quality) || !fToUnits.Build(parted, to, fJob.quality))
+    const PK_PixelFormat to = fDestination.format;
+    if (!fDirect.Build(fJob.source.format, to, fJob.quality) || !fLine.Build(fLineFormat, to, fJob.quality))
         return PK_ErrFailed;
     fRowMemory.AddRow(fLineFormat);
-    fRowMemory.AddRow(parted);
     fRowMemory.AddBytes(2 * BytesOfInts(SharedColumns()));
-    for (const ConversionChain* chain : {&fDirect, &fLine, &fFromUnits, &fToUnits})
-        fRowMemory.AddChain(*chain);
+    fRowMemory.AddChain(fDirect);
+    fRowMemory.AddChain(fLine);
+    if (HasUnits()) {
+        const PK_PixelFormat parted = Packed4444(to, kAlphaMeaningless, kDepth32f);
+        if (!fFromUnits.Build(to, parted, fJob.quality) || !fToUnits.Build(parted, to, fJob.quality))
+            return PK_ErrFailed;
+        fRowMemory.AddRow(parted);
+        fRowMemory.AddChain(fFromUnits);
+        fRowMemory.AddChain(fToUnits);
+    }
     return fBandMemory.emplace(fRowMemory.Bytes()).Result();
+}
+
+bool MotionRows::HasUnits() const {
+    return UnitOfRow(fDestination.format).pixels > 1;
 }
 
 /// Those of the box, and of units that it has in part.
@@ -105,7 +115,7 @@ PK_Result MotionRows::Draw(const MotionSourceRows& source, PK_Point start, int32
 PK_Result MotionRows::DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end,
                                int32_t field, TemporaryRows& rows) const {
     auto* const line = reinterpret_cast<float*>(rows.Take(BytesOfRow(fLineFormat, ColumnsOfUnits())));
-    uint8_t* const units = rows.Take(BytesOfRow(fToUnits.source, ColumnsOfUnits()));
+    uint8_t* const units = HasUnits() ? rows.Take(BytesOfRow(fToUnits.source, ColumnsOfUnits())) : nullptr;
     auto* const numbers = reinterpret_cast<int32_t*>(rows.Take(2 * BytesOfInts(SharedColumns())));
     MotionColumns columns = {numbers, numbers + SharedColumns()};
     for (int32_t row = first; row < end; ++row, at.x += fSteps.row.x, at.y += fSteps.row.y) {

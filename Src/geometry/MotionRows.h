@@ -42,6 +42,7 @@ private:
     struct Span;
 
     int32_t Columns() const { return fBox.right - fBox.left; }
+    bool HasUnits() const;
     int32_t ColumnsOfUnits() const;
     int32_t SharedColumns() const { return Columns() + MotionColumns::kMore; }
     PK_Result DrawBand(const MotionSourceRows& source, PK_Point at, int32_t first, int32_t end, int32_t field,

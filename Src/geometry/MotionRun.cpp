@@ -91,10 +91,12 @@ PK_Result DrawSampled(const MotionJob& job, const MotionPlacement& placement, co
     const int32_t marginY = job.smoothEdges && blur.y > 0 ? kSoftMargin : 0;
     const PK_Rect box = placement.Reach(job.crop, marginX, marginY);
     if (box.left == box.right) return PK_Success; // as of a scale that is no number
-    ResampleKernel kernelX(kKeysCubic), kernelY(kKeysCubic);
+    ResampleKernel kernelX(kKeysCubic), ownKernelY(kKeysCubic);
+    const auto [scaleX, scaleY] = placement.Scale();
+    ResampleKernel& kernelY = scaleX == scaleY ? kernelX : ownKernelY;
     if (job.quality == kCubicQuality) {
-        Scale(kernelX, placement.Scale().x);
-        Scale(kernelY, placement.Scale().y);
+        Scale(kernelX, scaleX);
+        if (&kernelY != &kernelX) Scale(kernelY, scaleY);
         if (kernelX.Width() < 1 || kernelY.Width() < 1) return PK_ErrOutOfMemory;
     }
 
