@@ -12,6 +12,7 @@
 #include "composite/OverKernels.h"
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
+#include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/KernelTable.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
@@ -39,6 +40,8 @@ template <>
 inline constexpr Shape kShapeOf<QuarterScaleKernels::Interleave> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<SumKernels::Sum> = Shape::SeveralRows;
+template <>
+inline constexpr Shape kShapeOf<NV12Kernels::PartPairs> = Shape::SeveralRows;
 
 namespace {
 
@@ -115,6 +118,11 @@ constexpr KernelRow kBridges[] = {
     Entry<&W210Kernels::averageToV210>("AverageW210ToV210Row", {Words(1), Words(1, 2), kV210}),
     Entry<&W210Kernels::quarterToV210>("QuarterW210ToV210Row", {Words(2), Words(1), kV210}),
     Entry<&W210Kernels::quarterToVUYX>("QuarterW210ToVUYXRow", {Words(2), Words(1), Bytes(4)}),
+};
+
+constexpr KernelRow kNV12[] = {
+    Entry<&NV12Kernels::copySurface>("CopySurfaceRow", {Bytes(1), Bytes(1)}),
+    Entry<&NV12Kernels::partPairs>("PartPairsRow", {Bytes(2), Bytes(2)}),
 };
 
 constexpr KernelRow kOperations[] = {
@@ -344,6 +352,7 @@ std::vector<KernelRow> KernelRegister() {
         all.insert(all.end(), rows.begin(), rows.end());
     };
     add(kBridges);
+    add(kNV12);
     add(kPrimitives);
     add(kOperations);
     add(kComposites);

@@ -16,6 +16,7 @@
 //                            NaN give INT32_MIN
 //   Select(mask, a, b)       a where the mask's bits are set, else b
 //   ...Pixel...              work on each block of four lanes, that is on each interleaved pixel
+//   LoadStreamed             from aligned places, for memory that has no cache in front of it
 //   LoadBytes                kLanes bytes to lanes
 //   ...Blocks, ...Threes, ...Sixes       work on blocks of four lanes, a wider vector's part each, that have
 //                            places of their own in memory

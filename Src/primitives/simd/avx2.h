@@ -79,6 +79,10 @@ inline I32 Lookup(const uint32_t* table, I32 index) {
     return {_mm256_i32gather_epi32(reinterpret_cast<const int*>(table), index.v, 4)};
 }
 
+/// From a place aligned to the vector's size. Where the instruction set can, uncached memory is read by whole lines.
+inline I32 LoadStreamed(const void* source) {
+    return {_mm256_stream_load_si256(static_cast<__m256i*>(const_cast<void*>(source)))};
+}
 inline I32 LoadBytes(const void* source) {
     return {_mm256_cvtepu8_epi32(_mm_loadl_epi64(static_cast<const __m128i*>(source)))};
 }
@@ -119,6 +123,16 @@ inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
     const __m256 lower = _mm256_castsi256_ps(a.v), upper = _mm256_castsi256_ps(b.v);
     const __m256i evens = _mm256_castps_si256(_mm256_shuffle_ps(lower, upper, _MM_SHUFFLE(2, 0, 2, 0)));
     const __m256i odds = _mm256_castps_si256(_mm256_shuffle_ps(lower, upper, _MM_SHUFFLE(3, 1, 3, 1)));
+    even.v = _mm256_permute4x64_epi64(evens, _MM_SHUFFLE(3, 1, 2, 0));
+    odd.v = _mm256_permute4x64_epi64(odds, _MM_SHUFFLE(3, 1, 2, 0));
+}
+
+/// The same of bytes: those of a and b at even places, a first, and those at odd places.
+inline void SeparateBytes(I32 a, I32 b, I32& even, I32& odd) {
+    const __m256i order =
+        _mm256_broadcastsi128_si256(_mm_setr_epi8(0, 2, 4, 6, 8, 10, 12, 14, 1, 3, 5, 7, 9, 11, 13, 15));
+    const __m256i first = _mm256_shuffle_epi8(a.v, order), second = _mm256_shuffle_epi8(b.v, order);
+    const __m256i evens = _mm256_unpacklo_epi64(first, second), odds = _mm256_unpackhi_epi64(first, second);
     even.v = _mm256_permute4x64_epi64(evens, _MM_SHUFFLE(3, 1, 2, 0));
     odd.v = _mm256_permute4x64_epi64(odds, _MM_SHUFFLE(3, 1, 2, 0));
 }

@@ -51,6 +51,10 @@ inline F32 LoadFloats(const void* source) {
 inline I32 LoadInts(const void* source) {
     return {_mm512_loadu_si512(source)};
 }
+/// From a place aligned to the vector's size. Where the instruction set can, uncached memory is read by whole lines.
+inline I32 LoadStreamed(const void* source) {
+    return {_mm512_stream_load_si512(const_cast<void*>(source))};
+}
 inline void Store(void* destination, F32 x) {
     _mm512_storeu_ps(destination, x.v);
 }
@@ -293,6 +297,16 @@ inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
     const __m512i odds = _mm512_setr_epi32(1, 3, 5, 7, 9, 11, 13, 15, 17, 19, 21, 23, 25, 27, 29, 31);
     even.v = _mm512_permutex2var_epi32(a.v, evens, b.v);
     odd.v = _mm512_permutex2var_epi32(a.v, odds, b.v);
+}
+
+/// The same of bytes: those of a and b at even places, a first, and those at odd places.
+inline void SeparateBytes(I32 a, I32 b, I32& even, I32& odd) {
+    const __m128i order = _mm_setr_epi8(0, 2, 4, 6, 8, 10, 12, 14, 1, 3, 5, 7, 9, 11, 13, 15);
+    const I32 first = ShuffleBytes(a, order), second = ShuffleBytes(b, order);
+    const __m512i evens = _mm512_setr_epi64(0, 2, 4, 6, 8, 10, 12, 14);
+    const __m512i odds = _mm512_setr_epi64(1, 3, 5, 7, 9, 11, 13, 15);
+    even.v = _mm512_permutex2var_epi64(first.v, evens, second.v);
+    odd.v = _mm512_permutex2var_epi64(first.v, odds, second.v);
 }
 
 /// The lanes of `lanes` moved up by one, with the last lane of `before` in front.

@@ -65,6 +65,10 @@ inline F32 LoadFloats(const void* source) {
 inline I32 LoadInts(const void* source) {
     return LoadVector<I32>(source);
 }
+/// From a place aligned to the vector's size. Where the instruction set can, uncached memory is read by whole lines.
+inline I32 LoadStreamed(const void* source) {
+    return LoadInts(source);
+}
 inline void Store(void* destination, F32 x) {
     std::memcpy(destination, &x, sizeof x);
 }
@@ -291,6 +295,16 @@ inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
         even.lane[i + kLanes / 2] = b.lane[2 * i];
         odd.lane[i + kLanes / 2] = b.lane[2 * i + 1];
     }
+}
+
+/// The same of bytes: those of a and b at even places, a first, and those at odd places.
+inline void SeparateBytes(I32 a, I32 b, I32& even, I32& odd) {
+    uint8_t from[32], parted[2][16];
+    Store(from, a);
+    Store(from + 16, b);
+    for (int i = 0; i < 32; ++i) parted[i % 2][i / 2] = from[i];
+    even = LoadInts(parted[0]);
+    odd = LoadInts(parted[1]);
 }
 
 /// The lanes of `lanes` moved up by one, with the last lane of `before` in front.

@@ -45,6 +45,14 @@ inline F32 LoadFloats(const void* source) {
 inline I32 LoadInts(const void* source) {
     return {_mm_loadu_si128(static_cast<const __m128i*>(source))};
 }
+/// From a place aligned to the vector's size. Where the instruction set can, uncached memory is read by whole lines.
+inline I32 LoadStreamed(const void* source) {
+    if constexpr (kHasSSE41) {
+        return {_mm_stream_load_si128(static_cast<__m128i*>(const_cast<void*>(source)))};
+    } else {
+        return LoadInts(source);
+    }
+}
 inline void Store(void* destination, F32 x) {
     _mm_storeu_ps(static_cast<float*>(destination), x.v);
 }
@@ -278,6 +286,20 @@ inline void SeparateLanes(I32 a, I32 b, I32& even, I32& odd) {
     const __m128 lower = _mm_castsi128_ps(a.v), upper = _mm_castsi128_ps(b.v);
     even.v = _mm_castps_si128(_mm_shuffle_ps(lower, upper, _MM_SHUFFLE(2, 0, 2, 0)));
     odd.v = _mm_castps_si128(_mm_shuffle_ps(lower, upper, _MM_SHUFFLE(3, 1, 3, 1)));
+}
+
+/// The same of bytes: those of a and b at even places, a first, and those at odd places.
+inline void SeparateBytes(I32 a, I32 b, I32& even, I32& odd) {
+    if constexpr (kHasByteShuffle) {
+        const __m128i order = _mm_setr_epi8(0, 2, 4, 6, 8, 10, 12, 14, 1, 3, 5, 7, 9, 11, 13, 15);
+        const __m128i first = _mm_shuffle_epi8(a.v, order), second = _mm_shuffle_epi8(b.v, order);
+        even.v = _mm_unpacklo_epi64(first, second);
+        odd.v = _mm_unpackhi_epi64(first, second);
+    } else {
+        const __m128i low = _mm_set1_epi16(0xff);
+        even.v = _mm_packus_epi16(_mm_and_si128(a.v, low), _mm_and_si128(b.v, low));
+        odd.v = _mm_packus_epi16(_mm_srli_epi16(a.v, 8), _mm_srli_epi16(b.v, 8));
+    }
 }
 
 /// The lanes of `lanes` moved up by one, with the last lane of `before` in front.
