@@ -12,6 +12,7 @@
 #include "composite/OverKernels.h"
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
+#include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/KernelTable.h"
 #include "convert/PlanarKernels.h"
 #include "filters/BoxBlurKernels.h"
@@ -40,6 +41,8 @@ template <>
 inline constexpr Shape kShapeOf<QuarterScaleKernels::Interleave> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<SumKernels::Sum> = Shape::SeveralRows;
+template <>
+inline constexpr Shape kShapeOf<NV12Kernels::PartPairs> = Shape::SeveralRows;
 
 namespace {
 
@@ -141,6 +144,11 @@ constexpr KernelRow kPlanar[] = {
     Entry<&PlanarWidenKernels::toBGRX709>("FloatPlanesToBGRXRow_709", {Floats(1), Floats(1, 2), kBGRA8}),
     Entry<&PlanarEncodeKernels::luma>("PixelsToLumaRow", {kVUYA8, Bytes(1)}),
     Entry<&PlanarEncodeKernels::chroma>("PixelsToChromaRow", {kVUYA8, kVUYA8, Bytes(2, 2)}, {}, {.group = 2}),
+};
+
+constexpr KernelRow kNV12[] = {
+    Entry<&NV12Kernels::copySurface>("CopySurfaceRow", {Bytes(1), Bytes(1)}),
+    Entry<&NV12Kernels::partPairs>("PartPairsRow", {Bytes(2), Bytes(2)}),
 };
 
 constexpr KernelRow kOperations[] = {
@@ -369,6 +377,7 @@ std::vector<KernelRow> KernelRegister() {
     };
     add(kBridges);
     add(kPlanar);
+    add(kNV12);
     add(kPrimitives);
     add(kOperations);
     add(kComposites);

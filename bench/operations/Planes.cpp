@@ -62,6 +62,15 @@ Run CopyPlanar(const uint8_t* source, uint8_t* destination) {
         [=] { PK_CopyPlanar_8u(Readable(from), from.rowBytes, Writable(to), to.rowBytes, kWidth, kHeight); };
 }
 
+/// Chroma pairs lie behind luma.
+Run PartSurface(const uint8_t* source, uint8_t* destination) {
+    const Planar420 to(destination, kWidth, kHeight);
+    return [=] {
+        PK_ConvertNV12toYV12_SSE4<0>(source, kWidth, source + kCount, kWidth, Writable(to), to.rowBytes,
+                                     kWidth, kHeight);
+    };
+}
+
 /// The source's second image lies behind the first, and the mask behind both.
 Run Mask(const uint8_t* source, uint8_t* destination) {
     constexpr PK_PixelFormat kFormat = PK_PixelFormat_BGRA_4444_8u;
@@ -105,6 +114,7 @@ const AddOperations add = {
     {"Quarter of 4:2:0", kPlanar, kPlanar / 4, Samples::Bytes, Against::Nothing, 0, QuarterScale},
     {"Field of 4:2:0 to UYVY", kPlanar, kCount, Samples::Bytes, Against::Nothing, 0, QuarterScaleTo422},
     {"Copy of 4:2:0 planes", kPlanar, kPlanar, Samples::Bytes, Against::Peer, 0.95, CopyPlanar},
+    {"NV12 to planes", kPlanar, kPlanar, Samples::Bytes, Against::Peer, 0.95, PartSurface},
     {"Composite of two BGRA 8u by a one-bit mask", 8 * kCount + kCount / 8, 4 * kCount, Samples::Bytes,
      Against::Peer, 0.95, Mask},
     {"Opaque alpha, in place", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Nothing, 0, SetAlpha},

@@ -1,7 +1,7 @@
 #pragma once
 
 /// \file
-/// Copies of planar 4:2:0 images.
+/// Copies of planar 4:2:0 images, and planes from surfaces whose chroma is interleaved.
 ///
 /// A planar image is three first bytes and three row bytes, each an array in the order luma, first chroma,
 /// second chroma. All samples are bytes. The chroma planes have half the width and half the height of the luma
@@ -105,3 +105,53 @@ PK_API PK_Result DecompressYUV_420_8u(const void* const planes[3], const int32_t
                                       int32_t quality) noexcept;
 
 } // namespace PK
+
+/// Takes an NV12 surface, luma and a plane of interleaved pairs of chroma samples, to three planes.
+///
+/// Bytes change their place and keep their values. With k the number of a pixel or pair in its row, and r that of a
+/// row of the destination plane:
+///
+/// | Member | luma                  | first chroma plane      | second chroma plane         |
+/// |--------|-----------------------|-------------------------|-----------------------------|
+/// | 0      | Y[r][k] = luma[r][k]  | chroma[r][2 k]          | chroma[r][2 k + 1]          |
+/// | 1      | Y[r][k] = luma[2r][k] | chroma[2 r][2 k]        | chroma[2 r][2 k + 1]        |
+///
+/// Member 0 takes a whole surface. Member 1 takes one field of a surface whose two fields lie in turns, in luma as in
+/// chroma; the caller points the source at the first luma row and the first chroma row of the field. The planes are in
+/// the order Y, U, V for NV12 (U first in each pair), and Y, V, U for NV21.
+///
+/// The source is meant to lie in the write-combining memory of a decoder: from SSE4.1 on (switch 6 of
+/// PK_SetDebugFlag) whole lines of 64 bytes are read by streaming loads, each once and in order. Rows that begin on a
+/// boundary of 64 bytes are read by nothing else. Any other memory and alignment will do, and so will processors
+/// without SSE4.1.
+///
+/// Memory: row bytes may be of either sign, and only bytes of samples are read and written. Source and destination
+/// must not overlap. Nothing is allocated, so that the picture is always converted.
+///
+/// Threads: bands of 32 rows run on all processors; may be called from any number of threads at the same time on
+/// different destinations.
+///
+/// \param luma                 first byte of the luma plane.
+/// \param lumaRowBytes         bytes from one row of it to the next, of both fields for member 1 too.
+/// \param chroma               first byte of the plane of pairs.
+/// \param chromaRowBytes       bytes from one row of it to the next, as for luma.
+/// \param destinationPlanes    first bytes of the planes that are written: luma, the first sample of each pair, the
+///                             second one. Chroma planes have half as many samples in a row, rounded down.
+/// \param destinationRowBytes  bytes from one row of each to the next.
+/// \param width                luma samples in a row. Of a chroma row width / 2 pairs are taken, rounded down.
+/// \param height               luma rows of the destination, for both members. Chroma planes get half as many, rounded
+///                             down; member 1 reads luma up to row 2 height - 2.
+///
+/// Nothing is returned. A width or height below 1, a null array, or a null pointer to a plane that has samples leaves
+/// all memory untouched; chroma may be null where the size leaves no chroma samples.
+template <int Member>
+void PK_ConvertNV12toYV12_SSE4(const void* luma, int32_t lumaRowBytes, const void* chroma,
+                               int32_t chromaRowBytes, void* const destinationPlanes[3],
+                               const int32_t destinationRowBytes[3], int32_t width, int32_t height) noexcept;
+
+extern template PK_API void PK_ConvertNV12toYV12_SSE4<0>(const void*, int32_t, const void*, int32_t,
+                                                         void* const[3], const int32_t[3], int32_t,
+                                                         int32_t) noexcept;
+extern template PK_API void PK_ConvertNV12toYV12_SSE4<1>(const void*, int32_t, const void*, int32_t,
+                                                         void* const[3], const int32_t[3], int32_t,
+                                                         int32_t) noexcept;

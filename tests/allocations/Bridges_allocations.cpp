@@ -129,7 +129,29 @@ void AddPlanes(Calls& calls) {
                      }});
 }
 
+template <int kMember>
+Call SurfaceToPlanes(const std::vector<uint8_t>& block, int32_t width, int32_t height) {
+    const size_t luma = static_cast<size_t>(width) * static_cast<size_t>(height);
+    return {{"PK_ConvertNV12toYV12_SSE4<" + std::to_string(kMember) + ">"},
+            TakesNone("has its scratch on the stack"),
+            block,
+            [=, surface = Content(3 * luma * (1 + kMember))](uint8_t* to) {
+                void* const planes[3] = {to, to + luma, to + 2 * luma};
+                const int32_t rowBytes[3] = {width, width, width};
+                PK_ConvertNV12toYV12_SSE4<kMember>(surface.data(), width,
+                                                   surface.data() + luma * (1 + kMember), width, planes,
+                                                   rowBytes, width, height);
+                return PK_Success;
+            }};
+}
+
+void AddSurfaces(Calls& calls) {
+    const std::vector<uint8_t> block(size_t{3} * kWidth * kHeight);
+    calls.push_back(SurfaceToPlanes<0>(block, kWidth, kHeight));
+    calls.push_back(SurfaceToPlanes<1>(block, kWidth / 40, 40 * kHeight)); // in bands
+}
+
 const Family sRowBridges(AddRowBridges), sInPlaceBridges(AddInPlaceBridges), sPlanarBridges(AddPlanarBridges),
-    sPlanes(AddPlanes);
+    sPlanes(AddPlanes), sSurfaces(AddSurfaces);
 
 } // namespace

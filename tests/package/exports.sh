@@ -23,7 +23,8 @@ if ! same "interface.txt (<) and the headers (>)" "$(cat "$here/interface.txt")"
     echo "    tests/package/interface.py include > tests/package/interface.txt"
     exit 1
 fi
-# The functions are the first paragraph. C names leave the library without their parameters.
-declared=$(sed -E '/^$/Q; s/ -> .*//; /^PK::|^[a-z ]* for /!s/\(.*//' "$here/interface.txt" | sort -u)
+# The functions are the first paragraph. C names leave the library without their parameters, and
+# templates with the type that they return.
+declared=$(sed -E '/^$/Q; s/ -> .*//; /^PK::|^[a-z ]* for |^void /!s/\(.*//' "$here/interface.txt" | sort -u)
 exported=$(nm -DC --defined-only "$library" | sed 's/^[0-9a-f]* . //' | sort -u)
 same "declared (<) and exported (>) names" "$declared" "$exported"

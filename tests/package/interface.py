@@ -179,7 +179,7 @@ def main():
     include = pathlib.Path(sys.argv[1]).resolve()
     text = " ".join(re.sub("//.*|#.*", "", header.read_text()) for header in sorted(include.glob("PixelKiln/*.h")))
     # The debug information has those functions of which an address is taken.
-    exported = re.findall(r"PK_API[^;({]*\b(\w+)\(", text, re.ASCII)
+    exported = re.findall(r"PK_API[^;({]*\b(\w+(?:<\w+>)?)\(", text, re.ASCII)
     source = "#include <PixelKiln/PixelKiln.h>\nusing namespace PK;\nvoid* const addresses[] = {" + "".join(
         f"\n    reinterpret_cast<void*>({name})," for name in exported) + "\n};\n"
     classes, debug = compiled(include, source)

@@ -66,8 +66,24 @@ void Pack(Line& line, const Shape& shape, bool yuyvOrder, int32_t field) {
     destination.AddTo(line.results);
 }
 
+/// A surface, and the planes of all of it or of a field.
+template <int kMember>
+void Part(Line& line, const Shape& shape) {
+    constexpr int32_t kTimes = 1 + kMember;
+    Image luma(static_cast<size_t>(shape.width), kTimes * shape.height, shape.from, line.random);
+    Image chroma(static_cast<size_t>(shape.width / 2 * 2), kTimes * (shape.height / 2), shape.from,
+                 line.random);
+    PlaneImages destination = Planes(shape.width, shape.height, shape.to, line.random);
+    PK_ConvertNV12toYV12_SSE4<kMember>(luma.First(), luma.Step(), chroma.First(), chroma.Step(),
+                                       destination.Destinations().data(), destination.Steps().data(),
+                                       shape.width, shape.height);
+    destination.AddTo(line.results);
+}
+
 void AddShapes(Lines& lines) {
     for (const Shape& shape : kShapes) {
+        lines.Add("part/" + NameOf(shape), [&](Line& line) { Part<0>(line, shape); });
+        lines.Add("part-field/" + NameOf(shape), [&](Line& line) { Part<1>(line, shape); });
         lines.Add("copy/" + NameOf(shape), [&](Line& line) { Copy(line, shape); });
         for (const int32_t field : {-1, 0, 1, 2, 3}) {
             const std::string name = NameOf(shape) + "/" + std::to_string(field);
@@ -76,6 +92,9 @@ void AddShapes(Lines& lines) {
             lines.Add("pack-yuyv/" + name, [&](Line& line) { Pack(line, shape, true, field); });
         }
     }
+    static constexpr Shape kBands = {210, 97, kSpread, kUpwards};
+    lines.Add("part/" + NameOf(kBands), [](Line& line) { Part<0>(line, kBands); });
+    lines.Add("part-field/" + NameOf(kBands), [](Line& line) { Part<1>(line, kBands); });
     lines.Add("copy/1024x512", [](Line& line) { Copy(line, {1024, 512, kTight, kTight}); }); // past the cache
 }
 
@@ -129,7 +148,25 @@ void AddAllOdd(Lines& lines) {
            });
 }
 
+/// The two planes of the surface are the first two of the source.
+template <int kMember>
+void AddOddParts(Lines& lines, const std::string& name) {
+    AddOddCalls(lines, name, 7, [](Line& line, Nulls nulls, int32_t width, int32_t height) {
+        PlaneImages source = Planes(kOddWidth, kOddHeight, kTight, line.random, 2);
+        PlaneImages destination = Planes(kOddWidth, kOddHeight, kTight, line.random);
+        auto planes = destination.Destinations();
+        for (size_t i = 0; i < 3; ++i) planes[i] = nulls(static_cast<int>(4 + i), planes[i]);
+        const auto steps = destination.Steps();
+        PK_ConvertNV12toYV12_SSE4<kMember>(nulls(0, source.Plane(0).First()), source.Plane(0).Step() / 2,
+                                           nulls(1, source.Plane(1).First()), source.Plane(1).Step() / 2,
+                                           nulls(2, planes.data()), nulls(3, steps.data()), width, height);
+        destination.AddTo(line.results);
+    });
+}
+
 void AddPlanar(Lines& lines) {
+    AddOddParts<0>(lines, "part");
+    AddOddParts<1>(lines, "part-field");
     AddShapes(lines);
     AddAllOdd(lines);
 }

@@ -38,7 +38,7 @@ pair=convert/BGRA_4444_8u
 "$program" no-such-name && fail "a name that no line has is accepted"
 "$program" --help 2>/dev/null && fail "an option is accepted"
 
-exported=$(cat "$headers"/PixelKiln/*.h | sed 's|//.*||' | tr '\n' ' ' | grep -oP 'PK_API[^;({]*\b\KPK_\w+(?=\()' | sort -u)
+exported=$(cat "$headers"/PixelKiln/*.h | sed 's|//.*||' | tr '\n' ' ' | grep -oP 'PK_API[^;({]*\b\KPK_\w+(?=[<(])' | sort -u)
 [ "$(wc -l <<<"$exported")" -gt 50 ] || fail "few exported functions: $exported"
 for function in $exported; do
     grep -qw "$function" "$here"/*_results.cpp || fail "$function has no line"

@@ -1,4 +1,4 @@
-// Reductions and copies of planar images.
+// Reductions and copies of planar images, and planes of surfaces.
 
 #include "stress/Calls.h"
 #include "stress/Operation.h"
@@ -63,6 +63,20 @@ Call ReduceToPacked(bool yuyvOrder, int32_t field, PKTest::Random& random) {
             }};
 }
 
+/// Of a surface with luma and pairs in rows of one length, in bands.
+template <int kMember>
+Call PartSurface(PKTest::Random& random) {
+    static constexpr Size kPicture = {262, 131};
+    static constexpr size_t kLuma = size_t{262} * 131 * (1 + kMember);
+    return {RandomPlanes(kPicture, random), [surface = random.Bytes(2 * kLuma)](uint8_t* image) {
+                const Planes to(image, kPicture);
+                PK_ConvertNV12toYV12_SSE4<kMember>(surface.data(), kPicture.width, surface.data() + kLuma,
+                                                   kPicture.width, to.first, to.rowBytes, kPicture.width,
+                                                   kPicture.height);
+                return PK_Success;
+            }};
+}
+
 std::function<bool()> PrepareQuarterScale() {
     PKTest::Random random(41);
     return Repeat({Reduce(1, random), Reduce(2, random), ReduceToPacked(false, 1, random),
@@ -74,7 +88,13 @@ std::function<bool()> PrepareCopyPlanar() {
     return Repeat({Copy(kSize, random), Copy(kLarge, random)});
 }
 
+std::function<bool()> PrepareSurfaces() {
+    PKTest::Random random(43);
+    return Repeat({PartSurface<0>(random), PartSurface<1>(random)});
+}
+
 const Operation sQuarterScale("quarter-scale", PrepareQuarterScale);
 const Operation sCopyPlanar("copy-planar", PrepareCopyPlanar);
+const Operation sSurfaces("nv12-to-planes", PrepareSurfaces);
 
 } // namespace

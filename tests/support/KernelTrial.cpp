@@ -7,6 +7,7 @@
 #include "composite/MatteKernels.h"
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
+#include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/PlanarKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/GaussianCoefficients.h"
@@ -203,6 +204,16 @@ KernelTrial InterleaveTrial(const KernelRow& kernel, int32_t size, Random&) {
             RowOf(kernel.operands.destination, size),
             Typed<Interleave>([=](Interleave run, const Sources& sources, uint8_t* destination) {
                 run(sources[0], sources[1], sources[2], destination, size);
+            })};
+}
+
+/// Both planes are written one after the other.
+KernelTrial PartPairsTrial(const KernelRow& kernel, int32_t size, Random&) {
+    using PartPairs = NV12Kernels::PartPairs;
+    return {{RowOf(kernel.operands.source, size)},
+            RowOf(kernel.operands.destination, size),
+            Typed<PartPairs>([=](PartPairs run, const Sources& sources, uint8_t* destination) {
+                run(sources[0], destination, destination + size, size);
             })};
 }
 
@@ -419,6 +430,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"PlanarDecode", TwoRowTrialWith<ChromaWeights, DrawWeights>, "Blend"},
     {"PlanarDecode", PlanesTrial<1>},
     {"PlanarWiden", PlanesTrial<1>, "Float"},
+    {"NV12", PartPairsTrial, "PartPairs"},
     {"QuarterScale", InterleaveTrial, "Interleave"},
     {"Mask", MaskTrial},
     {"Black", TrialWith<float, DrawAmount>},

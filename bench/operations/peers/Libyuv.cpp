@@ -44,6 +44,15 @@ Run CopyPlanes(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// Chroma pairs lie behind luma.
+Run PartSurface(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        uint8_t* const first = destination + kPixels;
+        libyuv::NV12ToI420(source, kWidth, source + kPixels, kWidth, destination, kWidth, first, kWidth / 2,
+                           first + kPixels / 4, kWidth / 2, kWidth, kHeight);
+    };
+}
+
 Run Shade(const uint8_t* source, uint8_t* destination) {
     return [=] {
         constexpr uint32_t kConstants = 0xff3264c8; // alpha, red, green and blue
@@ -92,6 +101,7 @@ const AddPeers add = {
     {"Premultiplied BGRA 8u over premultiplied at full opacity", "libyuv ARGBBlend", false, Blend},
     {"Dissolve of opaque BGRA 8u", "libyuv ARGBInterpolate", true, Interpolate},
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
+    {"NV12 to planes", "libyuv NV12ToI420", true, PartSurface},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"Placing of BGRP 8u at twice the size, bilinear", "libyuv ARGBScale", false, Enlarge},
     {"Placing of BGRP 8u at twice the size to 32f, bilinear", "libyuv ARGBScale, ByteToFloat", false,
