@@ -40,6 +40,8 @@ inline constexpr Shape kShapeOf<PlanesRow> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<QuarterScaleKernels::Interleave> = Shape::SeveralRows;
 template <>
+inline constexpr Shape kShapeOf<PlanarEncodeKernels::EncodeRow> = Shape::SeveralRows;
+template <>
 inline constexpr Shape kShapeOf<SumKernels::Sum> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<NV12Kernels::PartPairs> = Shape::SeveralRows;
@@ -142,8 +144,13 @@ constexpr KernelRow kPlanar[] = {
     Entry<&PlanarWidenKernels::toVUYX>("FloatPlanesToVUYXRow", {Floats(1), Floats(1, 2), kVUYA8}),
     Entry<&PlanarWidenKernels::toBGRX601>("FloatPlanesToBGRXRow_601", {Floats(1), Floats(1, 2), kBGRA8}),
     Entry<&PlanarWidenKernels::toBGRX709>("FloatPlanesToBGRXRow_709", {Floats(1), Floats(1, 2), kBGRA8}),
-    Entry<&PlanarEncodeKernels::luma>("PixelsToLumaRow", {kVUYA8, Bytes(1)}),
-    Entry<&PlanarEncodeKernels::chroma>("PixelsToChromaRow", {kVUYA8, kVUYA8, Bytes(2, 2)}, {}, {.group = 2}),
+    Entry<&PlanarEncodeKernels::fromVUYP>("PixelsToPlanesRow_VUYP", {kVUYA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRX601>("PixelsToPlanesRow_BGRX601", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRX709>("PixelsToPlanesRow_BGRX709", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRA601>("PixelsToPlanesRow_BGRA601", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRA709>("PixelsToPlanesRow_BGRA709", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::u>("ChromaOfSumsRow_U", {Bytes(4), Bytes(4), Bytes(1)}),
+    Entry<&PlanarEncodeKernels::v>("ChromaOfSumsRow_V", {Bytes(4), Bytes(4), Bytes(1)}),
 };
 
 constexpr KernelRow kNV12[] = {
