@@ -7,6 +7,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <type_traits>
 
 namespace PK {
 
@@ -47,11 +48,19 @@ Planes<Byte> PlanesOf(Pointer* const pointers[3], const int32_t rowBytes[3], int
 }
 
 /// The planes of a 4:2:0 image that lies in one block, as PK_GetPlanarBuffers tells them.
-inline DestinationPlanes PlanesInBlock(void* block, PK_PixelFormat format, int32_t width, int32_t height) {
+template <class Block>
+auto PlanesInBlock(Block* block, PK_PixelFormat format, int32_t width, int32_t height) {
+    using Byte = std::conditional_t<std::is_const_v<Block>, const uint8_t, uint8_t>;
     void* pointers[3] = {};
     int32_t rowBytes[3] = {};
-    PK_GetPlanarBuffers(block, format, width, height, pointers, rowBytes);
-    return PlanesOf<uint8_t>(pointers, rowBytes, width, height, Chroma::k420);
+    PK_GetPlanarBuffers(const_cast<std::remove_const_t<Block>*>(block), format, width, height, pointers,
+                        rowBytes);
+    return PlanesOf<Byte>(pointers, rowBytes, width, height, Chroma::k420);
+}
+
+/// Whether the planes of such an image have offsets in 32 bits.
+constexpr bool HavePlanesOffsets(int64_t width, int64_t height) {
+    return ((width + 127) & ~int64_t{127}) * ((height + 31) & ~int64_t{31}) <= INT32_MAX;
 }
 
 } // namespace PK
