@@ -1,6 +1,6 @@
 #include "scale/MotionPlan.h"
 
-#include "geometry/MotionFields.h"
+#include "frame/Fields.h"
 
 #include <initializer_list>
 

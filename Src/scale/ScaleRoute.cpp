@@ -1,6 +1,6 @@
 #include "scale/ScaleRoute.h"
 
-#include "geometry/MotionFields.h"
+#include "frame/Fields.h"
 
 #include <algorithm>
 #include <iterator>

@@ -3,7 +3,6 @@
 
 #include "convert/RasterFormats.h"
 #include "frame/DebugSwitches.h"
-#include "geometry/MotionFields.h"
 #include "reference/ReferenceScaleRoute.h"
 #include "scale/HalfSize.h"
 #include "scale/MotionPlan.h"
