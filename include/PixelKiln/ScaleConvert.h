@@ -3,7 +3,7 @@
 /// \file
 /// One image made another, of any size, format and field order.
 
-#include <PixelKiln/Types.h>
+#include <PixelKiln/PixelFormat.h>
 
 extern "C" {
 
