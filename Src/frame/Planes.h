@@ -48,12 +48,11 @@ Planes<Byte> PlanesOf(Pointer* const pointers[3], const int32_t rowBytes[3], int
 }
 
 /// The planes of a 4:2:0 image that lies in one block, as PK_GetPlanarBuffers tells them.
-template <class Block>
-auto PlanesInBlock(Block* block, PK_PixelFormat format, int32_t width, int32_t height) {
-    using Byte = std::conditional_t<std::is_const_v<Block>, const uint8_t, uint8_t>;
+template <class Byte>
+Planes<Byte> PlanesInBlock(Byte* block, PK_PixelFormat format, int32_t width, int32_t height) {
     void* pointers[3] = {};
     int32_t rowBytes[3] = {};
-    PK_GetPlanarBuffers(const_cast<std::remove_const_t<Block>*>(block), format, width, height, pointers,
+    PK_GetPlanarBuffers(const_cast<std::remove_const_t<Byte>*>(block), format, width, height, pointers,
                         rowBytes);
     return PlanesOf<Byte>(pointers, rowBytes, width, height, Chroma::k420);
 }
