@@ -17,6 +17,11 @@ enum class Chroma {
     k422, ///< Half the width, rounded up: a last odd column has its own. The height is that of Y.
 };
 
+/// Whether the planes of a 4:2:0 image in one block have offsets in 32 bits.
+constexpr bool HavePlanesOffsets(int64_t width, int64_t height) {
+    return ((width + 127) & ~int64_t{127}) * ((height + 31) & ~int64_t{31}) <= INT32_MAX;
+}
+
 /// Rows of samples; row bytes of either sign.
 template <class Byte>
 struct Plane {
@@ -55,11 +60,6 @@ Planes<Byte> PlanesInBlock(Byte* block, PK_PixelFormat format, int32_t width, in
     PK_GetPlanarBuffers(const_cast<std::remove_const_t<Byte>*>(block), format, width, height, pointers,
                         rowBytes);
     return PlanesOf<Byte>(pointers, rowBytes, width, height, Chroma::k420);
-}
-
-/// Whether the planes of such an image have offsets in 32 bits.
-constexpr bool HavePlanesOffsets(int64_t width, int64_t height) {
-    return ((width + 127) & ~int64_t{127}) * ((height + 31) & ~int64_t{31}) <= INT32_MAX;
 }
 
 } // namespace PK
