@@ -1,7 +1,9 @@
 #include "support/ScaleByHand.h"
 
+#include "convert/Planar420.h"
 #include "frame/DebugSwitches.h"
 
+#include <PixelKiln/Buffers.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/Motion.h>
@@ -108,6 +110,42 @@ PK_Result Move(const ScaleNumbers& call, const ScaleTelling& told, const ScaleMe
                       call.quality);
 }
 
+/// What the library decodes to is held to rules of its own elsewhere.
+PKReference::DecodedPicture DecodedOf(const ScaleNumbers& call) {
+    const PK::DecodeTarget wanted = {call.dstFormat, call.dstWidth, call.dstHeight};
+    PK::DecodeTarget target = wanted;
+    PK::ChooseDecodeTarget({call.srcFormat, call.srcWidth, call.srcHeight}, wanted, call.quality, target);
+    return {target.format, target.width, target.height};
+}
+
+/// Rows from the top of the picture, wherever the format has it.
+PK_Result Decode(const ScaleNumbers& call, const uint8_t* block, const PK::DestinationImage& picture) {
+    return PK::DecodePlanar420(PK::PlanesInBlock(block, call.srcFormat, call.srcWidth, call.srcHeight),
+                               call.srcFormat, PK::FromTop(picture), call.srcField, call.quality);
+}
+
+PK_Result DecodeAndGoOn(const ScaleNumbers& call, const ScaleTelling& told, const ScaleMemory& memory) {
+    const ScaleNumbers& next = *told.next;
+    Buffer buffer(next.srcFormat, next.srcWidth, next.srcHeight);
+    if (const PK_Result result =
+            Decode(call, memory.source,
+                   {buffer.bytes.data(), buffer.rowBytes, next.srcFormat, next.srcWidth, next.srcHeight}))
+        return result;
+    return ScaleByHand(
+        next, {buffer.bytes.data(), buffer.rowBytes, memory.destination, memory.destinationRowBytes});
+}
+
+PK_Result CopyField(const ScaleNumbers& call, const ScaleMemory& memory) {
+    const auto from = PK::PlanesInBlock(memory.source, call.srcFormat, call.srcWidth, call.srcHeight);
+    const auto to = PK::PlanesInBlock(memory.destination, call.dstFormat, call.dstWidth, call.dstHeight);
+    for (size_t plane = 0; plane < 3; ++plane)
+        for (int32_t line = 0; line < to[plane].height; ++line)
+            std::memcpy(to[plane].Row(line),
+                        from[plane].Row(2 * line + (plane == 0 && call.srcField == 2 ? 1 : 0)),
+                        static_cast<size_t>(to[plane].width));
+    return PK_Success;
+}
+
 } // namespace
 
 PK_Result CallScale(const ScaleNumbers& call, const ScaleMemory& memory) {
@@ -118,7 +156,7 @@ PK_Result CallScale(const ScaleNumbers& call, const ScaleMemory& memory) {
 }
 
 PK_Result ScaleByHand(const ScaleNumbers& call, const ScaleMemory& memory) {
-    const ScaleTelling told = PKReference::TellScale(call, {}, PK::sAllOriginsTopLeft != 0);
+    const ScaleTelling told = PKReference::TellScale(call, DecodedOf(call), PK::sAllOriginsTopLeft != 0);
     if (told.route == "conversion")
         return PK_Convert(memory.source, memory.sourceRowBytes, call.srcFormat, memory.destination,
                           memory.destinationRowBytes, call.dstFormat, call.dstWidth, call.dstHeight,
@@ -128,6 +166,12 @@ PK_Result ScaleByHand(const ScaleNumbers& call, const ScaleMemory& memory) {
         return ScaleByHand(*told.next,
                            {memory.source + int64_t{told.rowsSkipped} * memory.sourceRowBytes,
                             2 * memory.sourceRowBytes, memory.destination, memory.destinationRowBytes});
+    if (told.route == "field of planes") return CopyField(call, memory);
+    if (told.route == "straight decoding")
+        return Decode(
+            call, memory.source,
+            {memory.destination, memory.destinationRowBytes, call.dstFormat, call.dstWidth, call.dstHeight});
+    if (told.route == "decoding") return DecodeAndGoOn(call, told, memory);
     return Move(call, told, memory);
 }
 

@@ -18,7 +18,7 @@ struct ScaleMemory {
 /// The exported call.
 PK_Result CallScale(const PKReference::ScaleNumbers& call, const ScaleMemory& memory);
 
-/// For raster sources of any size from 1 on.
+/// For sources of any size from 1 on; a stream is one of planar 4:2:0.
 PK_Result ScaleByHand(const PKReference::ScaleNumbers& call, const ScaleMemory& memory);
 
 } // namespace PKTest
