@@ -150,6 +150,10 @@ bool IsSilent(const PipeOptions& options) {
     return options.quiet || options.output == "-";
 }
 
+PK_PixelFormat OutputFormat(const PipeOptions& options) {
+    return PlanOutput(options).to;
+}
+
 Size ParseSize(const std::string& text) {
     Size size;
     const char* end = text.data() + text.size();

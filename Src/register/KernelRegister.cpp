@@ -30,6 +30,7 @@
 #include "primitives/MultiplyConstant.h"
 #include "primitives/TransposeKernels.h"
 #include "primitives/VectorMath.h"
+#include "scale/HalveKernels.h"
 #include "scale/QuarterScaleKernels.h"
 
 namespace PK {
@@ -162,6 +163,10 @@ constexpr KernelRow kOperations[] = {
     Entry<&QuarterScaleKernels::evenBytes>("EvenBytesRow", {Bytes(2), Bytes(1)}),
     Entry<&QuarterScaleKernels::lumaFirst>("InterleavePlanesRow_YUYV", {Bytes(2), Bytes(1), Bytes(4)}),
     Entry<&QuarterScaleKernels::chromaFirst>("InterleavePlanesRow_UYVY", {Bytes(2), Bytes(1), Bytes(4)}),
+    Entry<&HalveKernels::HalveRowV210>("HalveRowV210", {{Samples::Bits, 16, 3}, Bytes(4)}),
+    Entry<&HalveKernels::HalveRowUYVY32f>("HalveRowUYVY32f", {Floats(4), Floats(4)}),
+    Entry<&HalveKernels::HalveRowUYVY8u>("HalveRowUYVY8u", {Bytes(4), Bytes(4)}),
+    Entry<&HalveKernels::HalveRowYUYV8u>("HalveRowYUYV8u", {Bytes(4), Bytes(4)}),
     Entry<&MaskKernels::pixels4>("SelectByMaskRow_4", {Bytes(4), Bytes(4), Bytes(4)}),
     Entry<&MaskKernels::pixels8>("SelectByMaskRow_8", {Bytes(8), Bytes(8), Bytes(8)}),
     Entry<&MaskKernels::pixels16>("SelectByMaskRow_16", {Bytes(16), Bytes(16), Bytes(16)}),

@@ -125,7 +125,26 @@ Run Enlarge(const uint8_t* source, uint8_t* destination) {
     };
 }
 
-/// The same, and then all samples.
+/// To half of each side: between four pixels it has their mean.
+template <libyuv::FilterMode kFilter>
+Run Reduce(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        libyuv::ARGBScale(source, kBGRARowBytes, kWidth, kHeight, destination, kBGRARowBytes / 2, kWidth / 2,
+                          kHeight / 2, kFilter);
+    };
+}
+
+/// Every second row, and then every second pixel.
+Run DropFromUYVY(const uint8_t* source, uint8_t* destination) {
+    const auto rows = std::make_shared<std::vector<uint8_t>>(2 * static_cast<size_t>(kPixels));
+    return [=] {
+        libyuv::UYVYToARGB(source + 2 * kWidth, 4 * kWidth, rows->data(), kBGRARowBytes, kWidth, kHeight / 2);
+        libyuv::ARGBScale(rows->data(), kBGRARowBytes, kWidth, kHeight / 2, destination, kBGRARowBytes / 2,
+                          kWidth / 2, kHeight / 2, libyuv::kFilterNone);
+    };
+}
+
+/// From half of each side, and then all samples.
 Run EnlargeToFloats(const uint8_t* source, uint8_t* destination) {
     const auto scaled = std::make_shared<std::vector<uint8_t>>(4 * static_cast<size_t>(kPixels));
     return [=, enlarge = Enlarge(source, scaled->data())] {
@@ -154,6 +173,13 @@ const AddPeers add = {
     {"Placing of BGRP 8u at twice the size, bilinear", "libyuv ARGBScale", false, Enlarge},
     {"Placing of BGRP 8u at twice the size to 32f, bilinear", "libyuv ARGBScale, ByteToFloat", false,
      EnlargeToFloats},
+    {"Scaling of BGRP 8u to half the size, quality 2", "libyuv ARGBScale", true,
+     Reduce<libyuv::kFilterBilinear>},
+    {"Scaling of BGRA 8u to half the size, quality 2", "libyuv ARGBScale", false,
+     Reduce<libyuv::kFilterBilinear>},
+    {"Scaling of BGRA 8u to half the size, quality 3", "libyuv ARGBScale (mean of four)", false,
+     Reduce<libyuv::kFilterBox>},
+    {"Half size of UYVY 8u to BGRA 8u", "libyuv UYVYToARGB, ARGBScale", false, DropFromUYVY},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
     {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
     {"Transpose pixels of 1 byte", "libyuv TransposePlane", true, TransposeBytes},
