@@ -59,13 +59,7 @@ struct Words15uKernels {
     static const Words15uKernels& For();
 };
 
-/// Rows of the Y, U and V planes, and for an average the three of the row below.
-using PlaneRows = const uint8_t* const*;
-
-/// Converts planes to a row of `width` pixels of the destination; V210 in whole groups, the last of them
-/// filled up with repetitions of the last sample of each plane.
-using PlanesRow = void (*)(PlaneRows planes, uint8_t* destination, int32_t width);
-
+/// V210 in whole groups, the last of them filled up with repetitions of the last sample of each plane.
 struct W210Kernels {
     PlanesRow toV210;
     PlanesRow averageToV210; // takes six rows

@@ -7,22 +7,6 @@
 namespace PK::PK_TARGET {
 namespace {
 
-struct PackedVUYA {
-    static I32 Chroma(I32 vuya) {
-        if constexpr (kHasByteShuffle)
-            return HalvesAt<1, 0, 5, 4, 9, 8, 13, 12>(vuya) & Ints(0x00ff00ff);
-        else
-            return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
-    }
-
-    static YUVPixels Pixels(I32 vuya) { return {Chroma(vuya), ShiftRight<16>(vuya) & Ints(0xff)}; }
-
-    static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
-        first = Pixels(LoadInts(source));
-        second = Pixels(LoadInts(source + 4 * kLanes));
-    }
-};
-
 /// (c[i-1] + 2 c[i] + c[i+1]) x 0.25. At the row's first pixel c[i-1] is c[i], whose sum with 2 c[i] is 3
 /// c[i] rounded once.
 struct Downsample32f : Groups<kLanes / 2, Each<16, 2>, Neighbours<Each<16>, 1, 0>> {

@@ -51,9 +51,18 @@ PK_Result ConvertToRaster(const SourceImage& source, const DestinationImage& des
 
 PK_Result Convert(const SourceImage& source, const DestinationImage& destination, int32_t quality);
 
-PK_Result ConvertToStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+/// The result for a stream that cannot be read or written, or for planes without a sample. Streams of DV have a size of
+/// their own.
+std::optional<PK_Result> ResultOfStream(PK_PixelFormat stream, const SourceImage& source,
+                                        const DestinationImage& destination) {
     if (source.width < 0 || source.height < 0) return PK_ErrFailed;
+    if (Is420Planar(stream) && (source.width == 0 || source.height == 0)) return PK_Success;
     if (HasNull({source.pixels, destination.pixels})) return PK_ErrFailed;
+    return std::nullopt;
+}
+
+PK_Result ConvertToStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    if (const auto result = ResultOfStream(destination.format, source, destination)) return *result;
 
     PK_PixelFormat format = PK_PixelFormat_Invalid;
     const PK_Result chosen = ChooseEncodeSource(source.format, destination.format, quality, format);
@@ -73,8 +82,7 @@ PK_Result ConvertRaster(const SourceImage& source, const DestinationImage& desti
 }
 
 PK_Result ConvertFromStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
-    if (source.width < 0) return PK_ErrFailed;
-    if (HasNull({source.pixels, destination.pixels})) return PK_ErrFailed;
+    if (const auto result = ResultOfStream(source.format, source, destination)) return *result;
 
     // A stream without a target of its own keeps what is wanted here, and is refused by DecodeStream.
     const DecodeTarget wanted = {destination.format, source.width, source.height};
@@ -84,6 +92,9 @@ PK_Result ConvertFromStream(const SourceImage& source, const DestinationImage& d
 
     constexpr int32_t kWholeFrame = 0;
     if (target.format == destination.format) return DecodeStream(source, kWholeFrame, destination, quality);
+    ConversionChain onward;
+    if (Is420Planar(source.format) && onward.Build(target.format, destination.format, quality))
+        return DecodeStreamThrough(onward, source, kWholeFrame, destination, quality);
 
     const TransientPixelBuffer buffer(target.format, target.width, target.height);
     if (buffer.Result() != PK_Success) return buffer.Result();

@@ -17,6 +17,23 @@ struct YUVPixels {
     I32 chroma, luma;
 };
 
+/// A stage for what is YUV already.
+struct PackedVUYA {
+    static I32 Chroma(I32 vuya) {
+        if constexpr (kHasByteShuffle)
+            return HalvesAt<1, 0, 5, 4, 9, 8, 13, 12>(vuya) & Ints(0x00ff00ff);
+        else
+            return (ShiftRight<8>(vuya) & Ints(0xff)) | (ShiftLeft<16>(vuya) & Ints(0xff0000));
+    }
+
+    static YUVPixels Pixels(I32 vuya) { return {Chroma(vuya), ShiftRight<16>(vuya) & Ints(0xff)}; }
+
+    static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
+        first = Pixels(LoadInts(source));
+        second = Pixels(LoadInts(source + 4 * kLanes));
+    }
+};
+
 /// UYVY pairs, with chroma (l + 2 c + r + 2) >> 2 over the odd pixel before, the even and the odd pixel.
 inline I32 FilterPairs(I32 chromaBefore, YUVPixels even, YUVPixels odd) {
     const I32 sum = chromaBefore + even.chroma + even.chroma + odd.chroma + Ints(0x00020002);

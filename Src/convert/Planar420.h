@@ -6,12 +6,23 @@
 #include "convert/Streams.h"
 #include "frame/Planes.h"
 
+#include <optional>
+
 namespace PK {
+
+struct ConversionChain;
 
 /// The rule of ChooseDecodeTarget for a planar stream. Widenings by 4/3 and 3/2, half heights and, below quality 3,
 /// sizes of which the picture's are an even and a whole multiple, are decoded as they are wanted; else half the picture
 /// if it covers what is wanted, or all of it.
 DecodeTarget ChoosePlanarTarget(const DecodeTarget& stream, const DecodeTarget& wanted, int32_t quality);
+
+/// The planes of a picture that lies in one block; none where their places cannot be told in 32 bits.
+template <class Byte>
+std::optional<Planes<Byte>> PlanesOfStream(const Image<Byte>& stream) {
+    if (PK_PixelFormatSize(stream.format, stream.width, stream.height) > INT32_MAX) return std::nullopt;
+    return PlanesInBlock(stream.pixels, stream.format, stream.width, stream.height);
+}
 
 /// Decodes to a raster image of any size that the planes can be taken to without filtering luma.
 /// \param source       the planes of the whole picture.
@@ -21,5 +32,18 @@ DecodeTarget ChoosePlanarTarget(const DecodeTarget& stream, const DecodeTarget& 
 /// \return PK_Success, or as PK::DecompressYUV_420_8u.
 PK_Result DecodePlanar420(const SourcePlanes& source, PK_PixelFormat format,
                           const DestinationImage& destination, int32_t field, int32_t quality);
+
+/// The same to one format, and by a chain from there to the destination's.
+PK_Result DecodePlanar420Through(const ConversionChain& onward, const SourcePlanes& source,
+                                 PK_PixelFormat format, const DestinationImage& destination, int32_t field,
+                                 int32_t quality);
+
+/// Encodes a raster image. Frame pictures are encoded to an even height. What has no chroma of its own, the last row of an
+/// odd height and the last column of an odd width, gives its luma alone.
+/// \param source  walked from the top of the picture; at least a pixel.
+/// \param format  that of the destination.
+/// \return PK_Success, or PK_ErrOutOfMemory where rows find no memory: nothing is written then.
+PK_Result EncodePlanar420(const SourceImage& source, PK_PixelFormat format,
+                          const DestinationPlanes& destination, int32_t quality);
 
 } // namespace PK

@@ -1,5 +1,8 @@
 #include "convert/Streams.h"
 
+#include "convert/ConversionChain.h"
+#include "convert/Planar420.h"
+
 #include <algorithm>
 #include <iterator>
 
@@ -42,9 +45,6 @@ constexpr DVPicture kDVPictures[] = {
     {PK_PixelFormat_PALDV50, 720, 576, PK_PixelFormat_YUYV_422_8u, PK_PixelFormat_VUYA_4444_8u},
 };
 
-/// Below this render quality a decoder may stop at a size smaller than the wanted one.
-constexpr int32_t kExactSizeQuality = 3;
-
 DecodeTarget ChooseDVTarget(const DVPicture& picture, const DecodeTarget& wanted, int32_t quality) {
     const int32_t halfWidth = picture.width / 2;
     const int32_t halfHeight = picture.height / 2;
@@ -79,8 +79,11 @@ PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wan
         target = ChooseDVTarget(*picture, wanted, quality);
         return PK_Success;
     }
-    if (CodecOf(stream.format) == Codec::DV25 || Is420Planar(stream.format)) return PK_ErrNotSupported;
-    return PK_ErrBadSrcFormat;
+    if (Is420Planar(stream.format)) {
+        target = ChoosePlanarTarget(stream, wanted, quality);
+        return PK_Success;
+    }
+    return CodecOf(stream.format) == Codec::DV25 ? PK_ErrNotSupported : PK_ErrBadSrcFormat;
 }
 
 PK_Result ChooseEncodeSource(PK_PixelFormat source, PK_PixelFormat stream, int32_t,
@@ -101,13 +104,30 @@ PK_Result ChooseEncodeSource(PK_PixelFormat source, PK_PixelFormat stream, int32
     return PK_ErrNotSupported;
 }
 
-// No codec of a stream is built yet. A decoder or encoder is taken in here, chosen by CodecOf.
-PK_Result DecodeStream(const SourceImage&, int32_t, const DestinationImage&, int32_t) noexcept {
-    return PK_ErrNotSupported;
+PK_Result DecodeStream(const SourceImage& source, int32_t field, const DestinationImage& destination,
+                       int32_t quality) noexcept {
+    ConversionChain stays;
+    if (!stays.Build(destination.format, destination.format, quality)) return PK_ErrBadDstFormat;
+    return DecodeStreamThrough(stays, source, field, destination, quality);
 }
 
-PK_Result EncodeStream(const SourceImage&, const DestinationImage&, int32_t) noexcept {
-    return PK_ErrNotSupported;
+// No codec of DV is built yet. A decoder or encoder is taken in here, chosen by CodecOf.
+PK_Result DecodeStreamThrough(const ConversionChain& onward, const SourceImage& source, int32_t field,
+                              const DestinationImage& destination, int32_t quality) noexcept {
+    if (!Is420Planar(source.format)) return PK_ErrNotSupported;
+    if (destination.width == 0 || destination.height == 0) return PK_Success;
+    const auto planes = PlanesOfStream(source);
+    if (!planes) return PK_ErrFailed;
+    return DecodePlanar420Through(onward, *planes, source.format, FromTop(destination), field, quality);
+}
+
+PK_Result EncodeStream(const SourceImage& source, const DestinationImage& destination,
+                       int32_t quality) noexcept {
+    if (!Is420Planar(destination.format)) return PK_ErrNotSupported;
+    if (source.width == 0 || source.height == 0) return PK_Success;
+    const auto planes = PlanesOfStream(destination);
+    if (!planes) return PK_ErrFailed;
+    return EncodePlanar420(FromTop(source), destination.format, *planes, quality);
 }
 
 } // namespace PK

@@ -7,6 +7,11 @@
 
 namespace PK {
 
+struct ConversionChain;
+
+/// Below this render quality a decoder may stop at a size smaller than the wanted one.
+inline constexpr int32_t kExactSizeQuality = 3;
+
 /// The picture that a decoder gives.
 struct DecodeTarget {
     PK_PixelFormat format;
@@ -31,6 +36,10 @@ PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wan
 /// \return PK_Success or the decoder's failure; PK_ErrNotSupported for a stream without decoder.
 PK_Result DecodeStream(const SourceImage& source, int32_t field, const DestinationImage& destination,
                        int32_t quality) noexcept;
+
+/// The same to the format that a chain begins with, and by the chain to the destination's.
+PK_Result DecodeStreamThrough(const ConversionChain& onward, const SourceImage& source, int32_t field,
+                              const DestinationImage& destination, int32_t quality) noexcept;
 
 /// Decides from which format to encode.
 /// \param source  format at hand.

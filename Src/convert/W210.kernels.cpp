@@ -102,11 +102,6 @@ struct QuarterToVUYX : Groups<kLanes, Each<4>, Each<4>, Each<2>, Each<2>> {
     }
 };
 
-template <class Formula>
-void FromPlanes(PlaneRows planes, uint8_t* destination, int32_t width) {
-    RunRow(Formula(), width, destination, planes[0], planes[1], planes[2]);
-}
-
 void AverageFromPlanes(PlaneRows planes, uint8_t* destination, int32_t width) {
     RunRow(AverageToV210(), width, destination, planes[0], planes[1], planes[2], planes[3], planes[4],
            planes[5]);
@@ -118,7 +113,7 @@ void AverageFromPlanes(PlaneRows planes, uint8_t* destination, int32_t width) {
 template <>
 const PK::W210Kernels& PK::W210Kernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr W210Kernels kernels = {FromPlanes<ToV210>, AverageFromPlanes, FromPlanes<QuarterToV210>,
-                                            FromPlanes<QuarterToVUYX>};
+    static constexpr W210Kernels kernels = {ThreePlanes<ToV210>, AverageFromPlanes,
+                                            ThreePlanes<QuarterToV210>, ThreePlanes<QuarterToVUYX>};
     return kernels;
 }

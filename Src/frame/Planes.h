@@ -7,6 +7,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <type_traits>
 
 namespace PK {
 
@@ -47,11 +48,13 @@ Planes<Byte> PlanesOf(Pointer* const pointers[3], const int32_t rowBytes[3], int
 }
 
 /// The planes of a 4:2:0 image that lies in one block, as PK_GetPlanarBuffers tells them.
-inline DestinationPlanes PlanesInBlock(void* block, PK_PixelFormat format, int32_t width, int32_t height) {
+template <class Byte>
+Planes<Byte> PlanesInBlock(Byte* block, PK_PixelFormat format, int32_t width, int32_t height) {
     void* pointers[3] = {};
     int32_t rowBytes[3] = {};
-    PK_GetPlanarBuffers(block, format, width, height, pointers, rowBytes);
-    return PlanesOf<uint8_t>(pointers, rowBytes, width, height, Chroma::k420);
+    PK_GetPlanarBuffers(const_cast<std::remove_const_t<Byte>*>(block), format, width, height, pointers,
+                        rowBytes);
+    return PlanesOf<Byte>(pointers, rowBytes, width, height, Chroma::k420);
 }
 
 } // namespace PK

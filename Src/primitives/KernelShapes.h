@@ -28,4 +28,10 @@ template <class Constants>
 using TwoRowKernelWith = void (*)(const void* first, const void* second, void* destination, int32_t width,
                                   const Constants& constants);
 
+/// The rows of the planes of an image in the order Y, U, V; for an average, the three of the row below behind them.
+using PlaneRows = const uint8_t* const*;
+
+/// Planes in, a row of `width` pixels out.
+using PlanesRow = void (*)(PlaneRows planes, uint8_t* destination, int32_t width);
+
 } // namespace PK

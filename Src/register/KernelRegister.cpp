@@ -14,6 +14,7 @@
 #include "convert/BridgeKernels.h"
 #include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/KernelTable.h"
+#include "convert/PlanarKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
 #include "filters/GaussianBlurKernels.h"
@@ -120,6 +121,31 @@ constexpr KernelRow kBridges[] = {
     Entry<&W210Kernels::quarterToVUYX>("QuarterW210ToVUYXRow", {Words(2), Words(1), Bytes(4)}),
 };
 
+constexpr Operand kUYVY8 = {Samples::Bytes, 4, 2, PK_PixelFormat_UYVY_422_8u};
+constexpr Operand kVUYA8 = {Samples::Bytes, 4, 1, PK_PixelFormat_VUYA_4444_8u};
+
+constexpr KernelRow kPlanar[] = {
+    Entry<&PlanarDecodeKernels::blendChroma>("BlendChromaRow", {Bytes(1), Bytes(1), Bytes(1)}),
+    Entry<&PlanarDecodeKernels::toUYVY>("PlanesToUYVYRow", {Bytes(1), Bytes(1, 2), kUYVY8}),
+    Entry<&PlanarDecodeKernels::toVUYXFromEven>("PlanesToVUYXRow_FromEven", {Bytes(1), Bytes(1, 2), kVUYA8}),
+    Entry<&PlanarDecodeKernels::toVUYXFromBetween>("PlanesToVUYXRow_FromBetween",
+                                                   {Bytes(1), Bytes(1, 2), kVUYA8}),
+    Entry<&PlanarDecodeKernels::every1>("PlanesToVUYARow_Every1", {Bytes(1), Bytes(1, 2), kVUYA8}),
+    Entry<&PlanarDecodeKernels::every2>("PlanesToVUYARow_Every2", {Bytes(2), Bytes(1), kVUYA8}),
+    Entry<&PlanarDecodeKernels::every4>("PlanesToVUYARow_Every4", {Bytes(4), Bytes(2), kVUYA8}),
+    Entry<&PlanarDecodeKernels::every8>("PlanesToVUYARow_Every8", {Bytes(8), Bytes(4), kVUYA8}),
+    Entry<&PlanarWidenKernels::by3To2>("WidenRow_3To2", {Bytes(2, 3), Floats(3, 3)}),
+    Entry<&PlanarWidenKernels::by4To3>("WidenRow_4To3", {Bytes(3, 4), Floats(4, 4)}),
+    Entry<&PlanarWidenKernels::toUYVY>("FloatPlanesToUYVYRow", {Floats(1), Floats(1, 2), kUYVY8}),
+    Entry<&PlanarWidenKernels::toUYVY601To709>("FloatPlanesToUYVYRow_601To709",
+                                               {Floats(1), Floats(1, 2), kUYVY8}),
+    Entry<&PlanarWidenKernels::toVUYX>("FloatPlanesToVUYXRow", {Floats(1), Floats(1, 2), kVUYA8}),
+    Entry<&PlanarWidenKernels::toBGRX601>("FloatPlanesToBGRXRow_601", {Floats(1), Floats(1, 2), kBGRA8}),
+    Entry<&PlanarWidenKernels::toBGRX709>("FloatPlanesToBGRXRow_709", {Floats(1), Floats(1, 2), kBGRA8}),
+    Entry<&PlanarEncodeKernels::luma>("PixelsToLumaRow", {kVUYA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::chroma>("PixelsToChromaRow", {kVUYA8, kVUYA8, Bytes(2, 2)}, {}, {.group = 2}),
+};
+
 constexpr KernelRow kNV12[] = {
     Entry<&NV12Kernels::copySurface>("CopySurfaceRow", {Bytes(1), Bytes(1)}),
     Entry<&NV12Kernels::partPairs>("PartPairsRow", {Bytes(2), Bytes(2)}),
@@ -146,8 +172,6 @@ constexpr KernelRow kOperations[] = {
     Entry<&WarpBilinearKernels::blendVUYA>("WarpSpan_BlendVUYA", {Bytes(4), Bytes(4)}),
     Entry<&WarpBilinearKernels::blendOther>("WarpSpan_BlendOther", {Bytes(4), Bytes(4)}),
 };
-
-constexpr Operand kVUYA8 = {Samples::Bytes, 4, 1, PK_PixelFormat_VUYA_4444_8u};
 
 // The order of top, back and destination.
 constexpr Operands ThreeOf(Operand pixel) {
@@ -352,6 +376,7 @@ std::vector<KernelRow> KernelRegister() {
         all.insert(all.end(), rows.begin(), rows.end());
     };
     add(kBridges);
+    add(kPlanar);
     add(kNV12);
     add(kPrimitives);
     add(kOperations);

@@ -39,6 +39,73 @@ PK_API PK_Result PK_CopyPlanar_8u(const void* const sourcePlanes[3], const int32
 
 } // extern "C"
 
+namespace PK {
+
+/// Decodes the three planes of an 8-bit 4:2:0 image to a raster image.
+///
+/// Sizes. With w x h the size of the source and / rounding down, the first that applies:
+///  - width 4 w / 3 of a w that is a multiple of 96, or 3 w / 2 of a multiple of 16, and height h or h / 2, with SSE2:
+///    rows get wider. Of three samples a, b, c come a, (a + 2 b) / 3, (2 b + c) / 3, c; of two come a, (a + b) >> 1, b, in
+///    each plane alone. Samples are rounded by the current mode. Chroma serves two pixels and two rows;
+///  - width w and height h: all of it, chroma interpolated between its rows and columns;
+///  - width w and height h / 2: one field, with chroma interpolated between the rows of that field; of frame pictures
+///    every second row, chroma as it stands in rows;
+///  - w / 2 x h / 2: every second sample of every second row, chroma as it stands;
+///  - below quality 3, h over an even number and w over 1, 2, 4 or 8: samples likewise.
+///
+/// Rows of chroma. Those of frame pictures lie half-way between two rows of luma: (3 a + b + 2) >> 2 and
+/// (a + 3 b + 2) >> 2 between rows a and b. Those of field pictures, which alternate between the fields as luma does,
+/// give (5 a + 3 b + 4) >> 3 and (a + 7 b + 4) >> 3 in the field of row 0, (7 a + b + 4) >> 3 and (3 a + 5 b + 4) >> 3 in
+/// the other. Beyond the first and the last row of chroma these stand; a field without a row has those of the other.
+///
+/// Columns of chroma. Under MPEG2 siting they lie on the even pixels: c[k] and (c[k] + c[k + 1] + 1) >> 1. Under MPEG4
+/// siting between the two: (c[k - 1] + 3 c[k] + 2) >> 2 and (3 c[k] + c[k + 1] + 2) >> 2. So a VUYX_4444_8u destination
+/// of the source's matrix is made; any other takes the conversion from UYVY_422_8u of that matrix, whose pairs hold the
+/// samples c[k] of either siting.
+///
+/// A picture without chroma, of a width or height of 1, is grey; the last column of an odd width has the chroma beside it.
+/// Full-range formats are converted like those of video range: their codes are not stretched.
+///
+/// Memory: row bytes may be of either sign; no alignment is asked for. The destination must not overlap the planes. A plane
+/// without samples is not touched, and its pointer may be null.
+///
+/// Threads: runs on the calling thread, in its floating-point mode; may be called from any number of threads at the same
+/// time on different destinations. PK_Initialize must have been called.
+///
+/// \param planes               first bytes of the planes, in the order Y, U, V. U and V have half the width and half the
+///                             height, rounded down.
+/// \param planeRowBytes        bytes from one row of each to the next.
+/// \param sourceWidth          luma samples in a row.
+/// \param sourceHeight         luma rows.
+/// \param sourceFormat         a planar 4:2:0 format: its matrix, siting, and field or frame pictures.
+/// \param destination          the top row of the picture, whatever the format's origin.
+/// \param destinationRowBytes  bytes from one row of it to the next.
+/// \param destinationWidth     its pixels in a row.
+/// \param destinationHeight    its rows.
+/// \param destinationFormat    a raster format.
+/// \param field                at half height 2 for the rows 1, 3, 5 and so on; else those of rows 0, 2, 4 and so on.
+/// \param quality              render quality, 0 to 5.
+/// \return
+///  - PK_ErrBadSrcFormat: the source is not of a planar 4:2:0 format.
+///  - PK_ErrBadDstFormat: the destination is not of a raster format.
+///  - PK_ErrFailed: a negative or too great size, a null pointer, or, where there are two rows, row bytes that are fewer
+///    than the bytes of a row.
+///  - PK_Success: decoded, or a destination of width or height 0.
+///  - PK_ErrSizeMismatch: another size, at quality 3 or above.
+///  - PK_ErrBadHeight: another size, whose height is not h over an even number.
+///  - PK_ErrBadWidth: another size, whose width is not w over 1, 2, 4 or 8.
+///  - PK_ErrOutOfMemory: no memory for rows.
+///
+/// Arguments are checked in this order, before memory is touched. A refusal writes nothing.
+PK_API PK_Result DecompressYUV_420_8u(const void* const planes[3], const int32_t planeRowBytes[3],
+                                      int32_t sourceWidth, int32_t sourceHeight, PK_PixelFormat sourceFormat,
+                                      void* destination, int32_t destinationRowBytes,
+                                      int32_t destinationWidth, int32_t destinationHeight,
+                                      PK_PixelFormat destinationFormat, int32_t field,
+                                      int32_t quality) noexcept;
+
+} // namespace PK
+
 /// Takes an NV12 surface, luma and a plane of interleaved pairs of chroma samples, to three planes.
 ///
 /// Bytes change their place and keep their values. With k the number of a pixel or pair in its row, and r that of a

@@ -2,6 +2,9 @@
 
 #include "convert/Streams.h"
 
+#include "primitives/CapabilityFlags.h"
+#include "support/FlagScope.h"
+
 #include <PixelKiln/PixelFormat.h>
 
 #include <gtest/gtest.h>
@@ -88,6 +91,67 @@ TEST(Streams, DVDecodesReducedForAnySmallerSizeAtLowQuality) {
         EXPECT_EQ(Choose(picture, width - 1, height - 1, 2), reduced);
         EXPECT_EQ(Choose(picture, width - 1, height - 1, 3), picture.native);
     }
+}
+
+DecodeTarget ChoosePlanar(const DecodeTarget& stream, const DecodeTarget& wanted, int32_t quality) {
+    DecodeTarget target{};
+    EXPECT_EQ(ChooseDecodeTarget(stream, wanted, quality, target), PK_Success);
+    return target;
+}
+
+/// The size chosen for a picture of 1440 x 1080, or another.
+std::pair<int32_t, int32_t> PlanarSize(int32_t width, int32_t height, int32_t quality, int32_t ofWidth = 1440,
+                                       int32_t ofHeight = 1080) {
+    const DecodeTarget target = ChoosePlanar({PK_PixelFormat_YUV_420_MPEG2_FIELD, ofWidth, ofHeight},
+                                             {PK_PixelFormat_BGRA_4444_8u, width, height}, quality);
+    return {target.width, target.height};
+}
+
+using Size = std::pair<int32_t, int32_t>;
+
+TEST(Streams, PlanarDecodesWiderWhereItsRowsCanGrow) {
+    const PKTest::FlagScope flags;
+    sCPUHasSSE2 = true;
+    EXPECT_EQ(PlanarSize(1920, 1080, 5), Size(1920, 1080)) << "4/3 of a multiple of 96";
+    EXPECT_EQ(PlanarSize(1920, 540, 5), Size(1920, 540));
+    EXPECT_EQ(PlanarSize(2160, 1080, 5), Size(2160, 1080)) << "3/2 of a multiple of 16";
+    EXPECT_EQ(PlanarSize(1920, 720, 5, 1280, 720), Size(1920, 720));
+    EXPECT_EQ(PlanarSize(1920, 1079, 5), Size(1440, 1080));
+    EXPECT_EQ(PlanarSize(960, 480, 5, 720, 480), Size(720, 480)) << "no multiple of 96";
+    sCPUHasSSE2 = false;
+    EXPECT_EQ(PlanarSize(1920, 1080, 5), Size(1440, 1080));
+}
+
+TEST(Streams, PlanarDecodesOneFieldForFullWidthAndHalfHeight) {
+    for (const int32_t quality : {0, 5}) EXPECT_EQ(PlanarSize(1440, 540, quality), Size(1440, 540));
+}
+
+TEST(Streams, PlanarDecodesReducedAtLowQualityAlone) {
+    EXPECT_EQ(PlanarSize(720, 540, 2), Size(720, 540));
+    EXPECT_EQ(PlanarSize(180, 270, 2), Size(180, 270)) << "an eighth and a quarter";
+    EXPECT_EQ(PlanarSize(1440, 270, 2), Size(1440, 270)) << "all columns";
+    EXPECT_EQ(PlanarSize(720, 360, 2), Size(720, 540)) << "a third is no even number";
+    EXPECT_EQ(PlanarSize(90, 270, 2), Size(720, 540)) << "a sixteenth is not offered";
+    EXPECT_EQ(PlanarSize(721, 540, 2), Size(1440, 540));
+    EXPECT_EQ(PlanarSize(720, 541, 2), Size(1440, 1080));
+    EXPECT_EQ(PlanarSize(720, 540, 3), Size(1440, 1080));
+    EXPECT_EQ(PlanarSize(10, 4, 2, 41, 16), Size(41, 16)) << "an odd width";
+    EXPECT_EQ(PlanarSize(20, 0, 2, 40, 16), Size(20, 8));
+}
+
+TEST(Streams, PlanarDecodesToOpaquePixelsOfTheMatrixThatIsWanted) {
+    const auto format = [](PK_PixelFormat stream, PK_PixelFormat wanted) {
+        return ChoosePlanar({stream, 16, 16}, {wanted, 16, 16}, 2).format;
+    };
+    const PK_PixelFormat of601 = PK_PixelFormat_YUV_420_MPEG2_FRAME,
+                         of709 = PK_PixelFormat_YUV_420_MPEG4_FIELD_709;
+    EXPECT_EQ(format(of601, PK_PixelFormat_UYVY_422_8u_709), PK_PixelFormat_VUYX_4444_8u_709);
+    EXPECT_EQ(format(of709, PK_PixelFormat_VUYA_4444_8u), PK_PixelFormat_VUYX_4444_8u);
+    EXPECT_EQ(format(of601, PK_PixelFormat_BGRA_4444_8u), PK_PixelFormat_VUYX_4444_8u);
+    EXPECT_EQ(format(of709, PK_PixelFormat_BGRA_4444_8u), PK_PixelFormat_VUYX_4444_8u_709);
+    EXPECT_EQ(format(of709, PK_PixelFormat_V210_422_10u), PK_PixelFormat_VUYX_4444_8u_709) << "ten bits";
+    EXPECT_EQ(format(PK_PixelFormat_YUV_420_MPEG2_FRAME_FullRange_709, PK_PixelFormat_VUYA_4444_8u),
+              PK_PixelFormat_BGRX_4444_8u);
 }
 
 TEST(Streams, NoDecodeTargetForWhatIsNoStream) {

@@ -8,6 +8,7 @@
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "convert/ConvertNV12toYV12Kernels.h"
+#include "convert/PlanarKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/GaussianCoefficients.h"
 #include "filters/ResampleKernel.h"
@@ -147,6 +148,11 @@ HLGEncoding DrawHLGEncoding(Random&) {
 }
 FloatRange DrawRange(Random&) {
     return {0.1f, 0.9f};
+}
+
+ChromaWeights DrawWeights(Random& random) {
+    const auto first = static_cast<int32_t>(random.Below(9));
+    return {first, 8 - first};
 }
 
 KernelTrial MaskTrial(const KernelRow& kernel, int32_t size, Random& random) {
@@ -421,6 +427,9 @@ constexpr SpecialTrial kSpecial[] = {
     {"BlockTransform", TransformTrial},
     {"W210", PlanesTrial<2>, "Average"},
     {"W210", PlanesTrial<1>},
+    {"PlanarDecode", TwoRowTrialWith<ChromaWeights, DrawWeights>, "Blend"},
+    {"PlanarDecode", PlanesTrial<1>},
+    {"PlanarWiden", PlanesTrial<1>, "Float"},
     {"NV12", PartPairsTrial, "PartPairs"},
     {"QuarterScale", InterleaveTrial, "Interleave"},
     {"Mask", MaskTrial},

@@ -15,6 +15,7 @@
 // Where a row ends within a group, or within what a group looks at beside itself, the group goes through the same Group
 // on scratch copies: all elements of a row have the same arithmetic, and no byte outside the row is read or written.
 
+#include "primitives/KernelShapes.h"
 #include "primitives/simd/Target.h"
 
 #include <cstddef>
@@ -207,6 +208,12 @@ void Row(const void* source, void* destination, int32_t width) {
 template <class Formula>
 void TwoRows(const void* first, const void* second, void* destination, int32_t width) {
     RunRow(Formula(), width, destination, first, second);
+}
+
+/// A formula of three planes as a kernel.
+template <class Formula>
+void ThreePlanes(PlaneRows planes, uint8_t* destination, int32_t width) {
+    RunRow(Formula(), width, destination, planes[0], planes[1], planes[2]);
 }
 
 /// A formula that is made of constants, as a kernel of one row in and one out.
