@@ -14,7 +14,7 @@ PK_PixelFormat WorkingFormat(PK_PixelFormat format) {
     const std::optional<Video420> video = Video420Of(format);
     if (!video) return format;
     if (video->isFullRange) return PK_PixelFormat_BGRA_4444_8u;
-    return video->is709 ? PK_PixelFormat_VUYA_4444_8u_709 : PK_PixelFormat_VUYA_4444_8u;
+    return video->is709 ? PK_PixelFormat_VUYX_4444_8u_709 : PK_PixelFormat_VUYX_4444_8u;
 }
 
 Frame Stepped(const Frame& frame, const Step& step, int32_t quality) {

@@ -109,6 +109,50 @@ is "from a pipe" "$(decimal < piped.nv12)" "1 2 3 4 5 6 7 8 9 10 11 12"
 is "to a pipe" "$(grep -ac FRAME piped.y4m) $(head_of piped.y4m)" \
     "2 YUV4MPEG2 W2 H2 F25:1 Ip A1:1 C420mpeg2 XCOLORRANGE=LIMITED"
 
+# Chroma of all pixels, as the library decodes it: U of a stream, in rows from the top.
+# decoded HEAD FRAME
+decoded() {
+    stream "$1" "$2" > in/chroma.y4m
+    "$program" convert in/chroma.y4m chroma.raw --to VUYX_4444_8u --packed --quiet
+    od -An -v -w$((4 * $(sed -n '1s/.* W\([0-9]*\).*/\1/p' in/chroma.y4m))) -tu1 chroma.raw | tac |
+        awk '{ row = $2; for (i = 6; i <= NF; i += 4) row = row " " $i; print row }' | paste -sd /
+}
+luma="100 100 100 100 100 100 100 100 100 100 100 100 100 100 100 100" v="128 128 128 128"
+is "frames, chroma on the left" "$(decoded "W4 H4 C420mpeg2" "$luma 80 120 160 200 $v")" \
+    "80 100 120 120/100 120 140 140/140 160 180 180/160 180 200 200"
+is "frames, centred chroma" "$(decoded "W4 H4 C420jpeg" "$luma 80 120 160 200 $v")" \
+    "80 90 110 120/100 110 130 140/140 150 170 180/160 170 190 200"
+is "fields of one row of chroma" "$(decoded "W4 H4 C420mpeg2 It" "$luma 80 120 160 200 $v")" \
+    "80 100 120 120/160 180 200 200/80 100 120 120/160 180 200 200"
+# Between 80 and 160 for rows 0, 2, 4, 6, between 40 and 240 for rows 1, 3, 5, 7.
+is "fields" "$(decoded "W2 H8 C420mpeg2 Ib" "$luma 80 40 160 240 $v")" \
+    "80 80/40 40/110 110/65 65/150 150/165 165/160 160/240 240"
+stream "W2 H2 C420mpeg2" "235 16 16 235 128 128" > in/chequers.y4m
+is "to RGB" "$("$program" convert in/chequers.y4m - --to BGRX_4444_8u --packed | hex)" \
+    "00 00 00 ff ff ff ff ff ff ff ff ff 00 00 00 ff"
+
+# And as it encodes it, from two rows of four pixels, the lower one first.
+bytes 128 50 1 255 128 60 2 255 128 70 3 255 128 80 4 255 128 10 5 255 128 20 6 255 128 30 7 255 128 40 8 255 > in/rows.raw
+expect 0 "VUYX_4444_8u to YUV_420_MPEG2_FRAME" convert in/rows.raw x.yuv --from VUYX_4444_8u --to yuv420p --size 4x2 \
+    --packed
+is "a mean by 1-2-1 over two rows" "$(decimal < x.yuv)" "5 6 7 8 1 2 3 4 32 50 128 128"
+bytes 128 40 4 255 128 40 4 255 128 30 3 255 128 30 3 255 128 20 2 255 128 20 2 255 128 10 1 255 128 10 1 255 > in/rows.raw
+expect 0 "" convert in/rows.raw x.yuv --from VUYX_4444_8u --to yuv420p --size 2x4 --packed
+is "of frames" "$(decimal < x.yuv)" "1 1 2 2 3 3 4 4 15 35 128 128"
+expect 0 "" convert in/rows.raw x.yuv --from VUYX_4444_8u --to yuv420p:fields --size 2x4 --packed
+is "of fields" "$(decimal < x.yuv)" "1 1 2 2 3 3 4 4 20 30 128 128"
+
+# What works on pixels gets pixels, and the output is planes again.
+expect 0 "4x4, YUV_420_MPEG4_FRAME to YUV_420_MPEG4_FRAME" rotate in/four.y4m turned.y4m --degrees 180
+is "a stream turned" "$(planes turned.y4m | cut -d ' ' -f 1-16)" "44 43 42 41 34 33 32 31 24 23 22 21 14 13 12 11"
+expect 0 "" rotate four.yuv turned.yuv --from yuv420p:center --size 4x4 --degrees 180
+is "raw planes turned" "$(head -c 16 turned.yuv | decimal)" "44 43 42 41 34 33 32 31 24 23 22 21 14 13 12 11"
+expect 0 "" fill white.yuv --size 2x2 --to yuv420p --colour white
+is "white planes" "$(decimal < white.yuv)" "235 235 235 235 128 128"
+expect 0 "" fill white.y4m --size 2x2 --colour white
+is "a stream of 4:4:4" "$(head_of white.y4m) $(planes white.y4m)" \
+    "YUV4MPEG2 W2 H2 F25:1 Ip A1:1 C444 XCOLORRANGE=LIMITED 235 235 235 235 128 128 128 128 128 128 128 128"
+
 # refused TEXT HEAD
 refused() {
     stream "$2" "1 2 3 4 5 6" > in/bad.y4m
