@@ -29,8 +29,10 @@ void Fly(const Flight& flight, const Frame& picture, const Frame& back, const st
         flight.pngDepth == 16 ? PK_PixelFormat_BGRA_4444_32f : PK_PixelFormat_BGRA_4444_8u;
     std::optional<Y4MWriter> stream;
     if (!IsPngName(output))
-        stream.emplace(output, Y4MShape{back.Width(), back.Height(), flight.framesASecond,
-                                        flight.start.destinationField});
+        stream.emplace(output, Y4MHead{.width = back.Width(),
+                                       .height = back.Height(),
+                                       .rate = std::to_string(flight.framesASecond) + ":1",
+                                       .field = flight.start.destinationField});
     Progress progress("frames", flight.frames);
     for (int32_t i = 0; i < flight.frames; ++i) {
         Frame frame = Converted(back, stream ? back.Format() : pngFormat, kDefaultQuality);

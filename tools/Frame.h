@@ -14,6 +14,11 @@ namespace tool {
 /// The quality that is taken when nothing else is asked for: the best.
 inline constexpr int32_t kDefaultQuality = 5;
 
+struct Size {
+    int32_t width = 0;
+    int32_t height = 0;
+};
+
 /// Rows of one size that follow each other in memory.
 struct Plane {
     uint8_t* first;
@@ -30,6 +35,7 @@ public:
     PK_PixelFormat Format() const { return fFormat; }
     int32_t Width() const { return fWidth; }
     int32_t Height() const { return fHeight; }
+    Size PixelSize() const { return {fWidth, fHeight}; }
     int32_t RowBytes() const { return fRowBytes; }
     uint64_t Bytes() const { return fBytes; }
     uint8_t* Pixels() { return fPixels; }

@@ -1,6 +1,6 @@
 #pragma once
 
-// Frames from a file to a file, PNG or raw, with something done to each on the way.
+// Frames from a file to a file, PNG, raw or a Y4M stream, with something done to each on the way.
 
 #include "Frame.h"
 
@@ -16,15 +16,11 @@ struct PipeOptions {
     std::string from;
     std::string to;
     std::string size;
+    std::string matrix;
     int32_t quality = kDefaultQuality;
     int32_t pngDepth = 8;
     bool packed = false;
     bool quiet = false;
-};
-
-struct Size {
-    int32_t width = 0;
-    int32_t height = 0;
 };
 
 /// Reads a size such as 1920x1080. Throws a usage Failure.
@@ -42,7 +38,8 @@ using Step = std::function<Frame(const Frame&)>;
 /// The step that changes a copy of the frame.
 Step OnCopy(std::function<void(Frame&)> change);
 
-/// Takes every frame of the input through the step, if there is one, to the output and prints a line about it.
+/// Takes every frame of the input through the step, if there is one, to the output and prints a line about it. A step is
+/// given frames of planar 4:2:0 in a raster format.
 void PipeFrames(const PipeOptions& options, const Step& step);
 
 /// The same where the output keeps the format of the input unless --to tells another.

@@ -3,19 +3,14 @@
 // Files of raw frames: one frame after another, with nothing between them.
 
 #include "Frame.h"
+#include "InputFile.h"
 #include "OutputFile.h"
+#include "VideoFormats.h"
 
-#include <cstdio>
-#include <memory>
 #include <string>
+#include <vector>
 
 namespace tool {
-
-/// How the rows of a frame lie in a file.
-enum class RowPacking {
-    Padded, ///< as in memory: each row takes PK_PixelFormatRowBytes
-    Packed, ///< the bytes of the pixels alone
-};
 
 /// The bytes of one frame in a file.
 int64_t RawFrameBytes(const Frame& frame, RowPacking packing);
@@ -33,15 +28,14 @@ public:
     bool Read(Frame& frame);
 
 private:
-    struct CloseFile {
-        void operator()(FILE* file) const;
-    };
-
     [[noreturn]] void RefuseLength(const Frame& like, int64_t bytes) const;
 
-    std::string fName;
+    size_t ReadParts(Frame& frame);
+
+    InputFile fFile;
     RowPacking fPacking;
-    std::unique_ptr<FILE, CloseFile> fFile;
+    std::vector<uint8_t> fDense; // a frame as it lies in the file, where it has to be taken apart
+    int64_t fFrameBytes;
     int64_t fFrameCount = 0;
     int64_t fFramesRead = 0;
 };

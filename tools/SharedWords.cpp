@@ -12,6 +12,8 @@ one sees it, from its top left corner.
 void AddRawFrames(Words& words, PipeOptions& options) {
     words.Take("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
     words.Flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+    words.Take("--matrix", options.matrix,
+               "601 or 709, of Y4M, yuv420p and nv12; without it, 709 from 1280 columns or 577 rows on");
 }
 
 void AddFormats(Words& words, PipeOptions& options) {
@@ -38,7 +40,7 @@ void AddListing(Words& words, ListOptions& options) {
 }
 
 void AddOutput(Words& words, PipeOptions& options) {
-    words.Take("OUT", options.output, "PNG file, raw frames, or -").Required();
+    words.Take("OUT", options.output, "PNG file, Y4M stream, raw frames, or -").Required();
     AddOutputForm(words, options);
 }
 
@@ -50,7 +52,7 @@ void AddOutputForm(Words& words, PipeOptions& options) {
 }
 
 void AddFrames(Words& words, PipeOptions& options) {
-    words.Take("IN", options.input, "PNG file, raw frames, or -").Required();
+    words.Take("IN", options.input, "PNG file, Y4M stream, raw frames, or -").Required();
     AddOutput(words, options);
     AddRawFrames(words, options);
 }
@@ -66,7 +68,7 @@ void AddOperation(Words& words, PipeOptions& options) {
 }
 
 void AddMix(Words& words, PipeOptions& options, std::string& second) {
-    words.Take("A", options.input, "PNG file, raw frames, or -").Required();
+    words.Take("A", options.input, "PNG file, Y4M stream, raw frames, or -").Required();
     words.Take("B", second, "PNG file of the same size").Required();
     AddOutput(words, options);
     AddRawFrames(words, options);
