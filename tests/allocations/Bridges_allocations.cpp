@@ -169,7 +169,7 @@ void AddSurfaces(Calls& calls) {
     calls.push_back(SurfaceToPlanes<1>(block, kWidth / 40, 40 * kHeight)); // in bands
 }
 
-const Family sRowBridges(AddRowBridges), sInPlaceBridges(AddInPlaceBridges), sPlanarBridges(AddPlanarBridges),
-    sPlanes(AddPlanes), sSurfaces(AddSurfaces);
+const Family sDecodings(AddDecodings), sRowBridges(AddRowBridges), sInPlaceBridges(AddInPlaceBridges),
+    sPlanarBridges(AddPlanarBridges), sPlanes(AddPlanes), sSurfaces(AddSurfaces);
 
 } // namespace

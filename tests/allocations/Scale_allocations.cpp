@@ -71,8 +71,7 @@ void AddPlanes(Calls& calls) {
                          const int32_t rowBytes[3] = {kSide, kSide / 2, kSide / 2};
                          return PK_ScaleConvertPlanar(planes, rowBytes, kSide, kSide, kPlanes, 0, block,
                                                       4 * kSide, kSide, kSide, kBGRA, 0, 2);
-                     },
-                     PK_ErrNotSupported});
+                     }});
 }
 
 const Family sScalings(AddScalings);
