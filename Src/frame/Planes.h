@@ -7,6 +7,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <cstdlib>
 #include <type_traits>
 
 namespace PK {
@@ -33,6 +34,13 @@ struct Plane {
     Byte* Row(int32_t row) const { return pixels + row * rowBytes; }
     bool IsEmpty() const { return width == 0 || height == 0; }
 };
+
+/// Whether there are samples that cannot be told apart: without memory, or in rows that begin within each other.
+template <class Byte>
+bool HasUnreadableSamples(const Plane<Byte>& plane) {
+    if (plane.IsEmpty()) return false;
+    return plane.pixels == nullptr || (plane.height > 1 && std::abs(plane.rowBytes) < plane.width);
+}
 
 /// In the order Y, U, V.
 template <class Byte>

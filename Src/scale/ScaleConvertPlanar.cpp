@@ -11,11 +11,6 @@
 namespace PK {
 namespace {
 
-bool LacksPlane(const SourcePlanes& planes) {
-    return std::ranges::any_of(planes,
-                               [](const auto& plane) { return !plane.IsEmpty() && plane.pixels == nullptr; });
-}
-
 PK_Result ScalePlanes(const SourcePlanes& planes, const ScaleCall& call,
                       const DestinationImage& destination) {
     const auto& [from, to, renderField, quality] = call;
@@ -54,7 +49,7 @@ PK_Result PK_ScaleConvertPlanar(const void* const planes[3], const int32_t plane
     if (HasNull({planes, planeRowBytes})) return PK_ErrFailed;
     const SourcePlanes source =
         PlanesOf<const uint8_t>(planes, planeRowBytes, srcWidth, srcHeight, Chroma::k420);
-    if (LacksPlane(source)) return PK_ErrFailed;
+    if (std::ranges::any_of(source, HasUnreadableSamples<const uint8_t>)) return PK_ErrFailed;
     if (dst == nullptr) return PK_ErrNullDestination;
 
     constexpr int32_t kAllRows = 0;

@@ -116,7 +116,8 @@ PK_API PK_Result PK_ScaleConvertOneField(const void* src, int32_t srcRowBytes, i
 ///  - PK_ErrBadDstFormat: the destination is planar 4:2:0, or no raster format and no stream.
 ///  - PK_ErrFailed: a negative size or a width above 134217727.
 ///  - PK_Success: done. A width or height of 0 does nothing.
-///  - PK_ErrFailed: a null array, or a null plane that has samples.
+///  - PK_ErrFailed: a null array, a null plane that has samples, or, of two rows and more, row bytes that are fewer than
+///    their samples.
 ///  - PK_ErrNullDestination: \p dst is null.
 ///  - PK_ErrOutOfMemory: no memory for the decoded image.
 ///  - What PK::DecompressYUV_420_8u and PK_ScaleConvert return.

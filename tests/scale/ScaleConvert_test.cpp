@@ -219,6 +219,10 @@ TEST(ScaleConvert, OfPlanesChecksItsArgumentsInOrder) {
     EXPECT_EQ(scale(planes, nullptr, kPlanes, 2, bytes, kBGRA), PK_ErrFailed);
     EXPECT_EQ(scale(without, rowBytes, kPlanes, 2, bytes, kBGRA), PK_ErrFailed);
     EXPECT_EQ(scale(planes, rowBytes, kPlanes, 2, nullptr, kBGRA), PK_ErrNullDestination);
+    for (const int32_t step : {9, -9}) {
+        const int32_t tooFew[3] = {step, 8, 8};
+        EXPECT_EQ(scale(planes, tooFew, kPlanes, 10, bytes, kBGRA), PK_ErrFailed) << "rows within each other";
+    }
 }
 
 TEST(ScaleConvert, LeavesTheFloatingPointModeAndFlushesDenormals) {
