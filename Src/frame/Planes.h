@@ -37,7 +37,7 @@ struct Plane {
 
 /// Whether there are samples that cannot be told apart: without memory, or in rows that begin within each other.
 template <class Byte>
-bool IsUnreadable(const Plane<Byte>& plane) {
+bool HasUnreadableSamples(const Plane<Byte>& plane) {
     if (plane.IsEmpty()) return false;
     return plane.pixels == nullptr || (plane.height > 1 && std::abs(plane.rowBytes) < plane.width);
 }

@@ -32,7 +32,7 @@ PK_Result RenderAndEncode(const ScaleJob& job, const MotionPlan& plan) {
     const TransientPixelBuffer buffer(plan.format, width, height);
     if (buffer.Result() != PK_Success) return buffer.Result();
     if (const PK_Result result =
-            PK_FillWithTransparentBlack(buffer.Pixels(), buffer.RowBytes(), width, height, plan.format))
+            PK_FillWithOpaqueBlack(buffer.Pixels(), buffer.RowBytes(), width, height, plan.format))
         return result;
     ScaleJob rendering = job;
     rendering.call.destination.format = plan.format;

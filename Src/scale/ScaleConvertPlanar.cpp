@@ -49,7 +49,7 @@ PK_Result PK_ScaleConvertPlanar(const void* const planes[3], const int32_t plane
     if (HasNull({planes, planeRowBytes})) return PK_ErrFailed;
     const SourcePlanes source =
         PlanesOf<const uint8_t>(planes, planeRowBytes, srcWidth, srcHeight, Chroma::k420);
-    if (std::ranges::any_of(source, IsUnreadable<const uint8_t>)) return PK_ErrFailed;
+    if (std::ranges::any_of(source, HasUnreadableSamples<const uint8_t>)) return PK_ErrFailed;
     if (dst == nullptr) return PK_ErrNullDestination;
 
     constexpr int32_t kAllRows = 0;

@@ -4,6 +4,7 @@
 #include "results/Image.h"
 #include "results/Lines.h"
 #include "results/OddCalls.h"
+#include "results/PlaneImages.h"
 
 #include <PixelKiln/ScaleConvert.h>
 
@@ -23,6 +24,12 @@ struct Side {
     PK_PixelFormat format;
     int32_t width, height, field;
 };
+
+struct Size {
+    int32_t width, height;
+};
+
+constexpr Size kSizesOfPlanes[] = {{32, 12}, {32, 6}, {16, 6}, {48, 12}, {13, 9}};
 
 struct Scaling {
     Side from, to;
@@ -94,7 +101,38 @@ void AddOdd(Lines& lines) {
         });
 }
 
+void ScalePlanes(Line& line, PK_PixelFormat from, int32_t field, const Side& to, int32_t quality) {
+    constexpr int32_t kWidth = 32, kHeight = 12;
+    PlaneImages source(kWidth, kHeight, kWidth / 2, kHeight / 2, kSpread, line.random);
+    Image image(to.format, to.width, to.height, kUpwards, line.random);
+    line.results.Add(PK_ScaleConvertPlanar(source.Sources().data(), source.Steps().data(), kWidth, kHeight,
+                                           from, field, image.First(), image.Step(), to.width, to.height,
+                                           to.format, to.field, quality));
+    image.AddTo(line.results);
+}
+
+void AddPlanes(Lines& lines) {
+    for (const PK_PixelFormat from : kStreams)
+        lines.Add("planes/" + NameOf(from), [&](Line& line) {
+            for (const PK_PixelFormat to : kFew)
+                for (const int32_t field : {0, 1, 2})
+                    for (const int32_t quality : {2, 4})
+                        for (const Size& size : kSizesOfPlanes)
+                            ScalePlanes(line, from, field, {to, size.width, size.height, 0}, quality);
+        });
+    AddOddCalls(lines, "planes", 2, [](Line& line, Nulls nulls, int32_t width, int32_t height) {
+        PlaneImages source(kOddWidth, kOddHeight, kOddWidth / 2, kOddHeight / 2, kTight, line.random);
+        Image image(kBGRA, kOddWidth, kOddHeight, kTight, line.random);
+        line.results.Add(PK_ScaleConvertPlanar(nulls(0, source.Sources().data()), source.Steps().data(),
+                                               width, height, PK_PixelFormat_YUV_420_MPEG2_FRAME, 0,
+                                               nulls(1, image.First()), image.Step(), kOddWidth, kOddHeight,
+                                               kBGRA, 0, 2));
+        image.AddTo(line.results);
+    });
+}
+
 void AddScaleConvert(Lines& lines) {
+    AddPlanes(lines);
     for (const PK_PixelFormat format : kRasters) AddFormat(lines, format);
     for (const int32_t quality : {2, 4, 5}) AddQuality(lines, quality);
     AddOdd(lines);
