@@ -46,6 +46,10 @@ bool IsSilent(const PipeOptions& options) {
     return options.quiet || options.output == "-";
 }
 
+PK_PixelFormat OutputFormat(const PipeOptions& options) {
+    return PlanOutput(options).to;
+}
+
 Step OnCopy(std::function<void(Frame&)> change) {
     return [change = std::move(change)](const Frame& frame) {
         Frame changed = Copied(frame);

@@ -29,6 +29,9 @@ Size ParseSize(const std::string& text);
 /// Whether no line about the work is wanted: asked for, or the frames themselves go to standard output.
 bool IsSilent(const PipeOptions& options);
 
+/// The format that frames are written in: that of --to, or what a PNG is made of. Throws a usage Failure.
+PK_PixelFormat OutputFormat(const PipeOptions& options);
+
 /// What becomes of a frame of the format of --from, before it is taken to that of --to.
 using Step = std::function<Frame(const Frame&)>;
 

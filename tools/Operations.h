@@ -19,6 +19,18 @@ void Fill(Frame& frame, const std::string& colour);
 /// \param degrees  clockwise; a multiple of 90 from -270 to 270, but not 0.
 Frame Rotated(const Frame& frame, int32_t degrees);
 
+struct Scaling {
+    PK_PixelFormat format = PK_PixelFormat_Invalid;
+    int32_t width = 0;
+    int32_t height = 0;
+    int32_t sourceField = 0; ///< the earlier one, 0 for none
+    int32_t destinationField = 0;
+    int32_t renderField = 0; ///< 0 for all rows
+    int32_t quality = kDefaultQuality;
+};
+/// The frame at another size, format and field order. Rows of the field that is not rendered are 0.
+Frame Scaled(const Frame& frame, const Scaling& scaling);
+
 struct BoxBlur {
     double radius = 0;
     int32_t passes = 1;

@@ -36,12 +36,6 @@ void DownsampleRow32f(const void* source, void* destination, int32_t width) {
                                  static_cast<uint8_t*>(destination) + ptrdiff_t{8} * paired);
 }
 
-/// U, Y0, V, Y1 with a pair a block, to the even or the odd pixel's V, U, Y and an opaque alpha.
-template <int kLuma>
-inline F32 PixelsOfPairs(F32 uyvy) {
-    return BlendBlocks<0b0111>(ShufflePixel<2, 0, kLuma, 3>(uyvy), Floats(1));
-}
-
 inline void StorePixels(uint8_t* destination, F32 evenPairs, F32 oddPairs) {
     StoreBlocksInTurns(destination, PixelsOfPairs<1>(evenPairs), PixelsOfPairs<3>(oddPairs));
 }

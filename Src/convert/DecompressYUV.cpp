@@ -13,14 +13,6 @@ using namespace PK;
 
 namespace {
 
-bool HasRowsThatOverlap(const Plane<const uint8_t>& plane) {
-    return plane.height > 1 && std::abs(plane.rowBytes) < plane.width;
-}
-
-bool IsUnreadable(const Plane<const uint8_t>& plane) {
-    return !plane.IsEmpty() && (plane.pixels == nullptr || HasRowsThatOverlap(plane));
-}
-
 bool HasRowsThatOverlap(const DestinationImage& image) {
     const auto bytes = static_cast<ptrdiff_t>(BytesOfRow(image.format, image.width));
     return image.height > 1 && std::abs(image.rowBytes) < bytes;
@@ -45,6 +37,6 @@ PK_Result PK::DecompressYUV_420_8u(const void* const planes[3], const int32_t pl
                                     destinationFormat, destinationWidth, destinationHeight};
     const SourcePlanes source =
         PlanesOf<const uint8_t>(planes, planeRowBytes, sourceWidth, sourceHeight, Chroma::k420);
-    if (HasRowsThatOverlap(image) || std::ranges::any_of(source, IsUnreadable)) return PK_ErrFailed;
+    if (HasRowsThatOverlap(image) || std::ranges::any_of(source, IsUnreadable<const uint8_t>)) return PK_ErrFailed;
     return DecodePlanar420(source, sourceFormat, image, field, quality);
 }

@@ -1,8 +1,8 @@
 // Raster images to planar 4:2:0.
 
 #include "convert/ChromaRows.h"
-#include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/Planar420.h"
+#include "convert/PlanarKernels.h"
 #include "convert/WorkingRows.h"
 #include "primitives/Dispatch.h"
 
@@ -28,52 +28,77 @@ int32_t FirstRowWithoutChroma(int32_t height) {
     return height / 4 * 4 + height % 4 / 2;
 }
 
+/// A format that rows are encoded from.
+struct EncodedFrom {
+    PK_PixelFormat format;
+    PlanarEncodeKernels::EncodeRow kernel;
+};
+
+/// The image's own where there is a kernel for it.
+EncodedFrom ChooseWorking(PK_PixelFormat source, PK_PixelFormat stream) {
+    const auto& kernels = Best<PlanarEncodeKernels>();
+    const bool is601 = IsMatrix601(stream);
+    switch (source) {
+    case PK_PixelFormat_BGRA_4444_8u:
+        return {source, is601 ? kernels.fromBGRA601 : kernels.fromBGRA709};
+    case PK_PixelFormat_BGRP_4444_8u:
+    case PK_PixelFormat_BGRX_4444_8u:
+        return {source, is601 ? kernels.fromBGRX601 : kernels.fromBGRX709};
+    default:
+        return {is601 ? PK_PixelFormat_VUYP_4444_8u : PK_PixelFormat_VUYP_4444_8u_709, kernels.fromVUYP};
+    }
+}
+
 class RowEncoder {
 public:
-    RowEncoder(const RowSource (&sources)[2], const DestinationPlanes& planes, uint8_t* chroma)
-        : fSources(sources), fPlanes(planes), fChroma(chroma) {}
+    RowEncoder(const RowSource& source, PlanarEncodeKernels::EncodeRow kernel,
+               const DestinationPlanes& planes, uint8_t* firstSums, uint8_t* secondSums)
+        : fSource(source), fKernel(kernel), fPlanes(planes), fSums{firstSums, secondSums} {}
 
-    /// Gives the row of pixels, which stays until the next of the same source is encoded.
-    const uint8_t* Luma(int32_t row, int32_t source) const {
-        const uint8_t* const pixels = fSources[source].Row(row);
-        fKernels.luma(pixels, fPlanes[0].Row(row), fPlanes[0].width);
-        return pixels;
+    static uint64_t BytesOfSums(int32_t width) {
+        constexpr int64_t kGroup = PlanarEncodeKernels::kGroup, kBytesOfPixel = 2;
+        return static_cast<uint64_t>((width + kGroup - 1) / kGroup * kGroup * kBytesOfPixel);
+    }
+
+    /// Gives the sums of the row's chroma.
+    const uint8_t* Luma(int32_t row, int32_t sums) const {
+        fKernel(fSource.Row(row), fPlanes[0].Row(row), fSums[sums], fPlanes[0].width);
+        return fSums[sums];
     }
 
     void Chroma(int32_t row, const PixelRows& rows) const {
         const uint8_t* const first = Luma(rows.first, 0);
         const uint8_t* const second = rows.second != rows.first ? Luma(rows.second, 1) : first;
-        const int32_t pairs = fPlanes[1].width;
-        fKernels.chroma(first, second, fChroma, 2 * pairs);
-        fParting.partPairs(fChroma, fPlanes[1].Row(row), fPlanes[2].Row(row), pairs);
+        fKernels.u(first, second, fPlanes[1].Row(row), fPlanes[1].width);
+        fKernels.v(first, second, fPlanes[2].Row(row), fPlanes[2].width);
     }
 
 private:
-    const RowSource (&fSources)[2];
+    const RowSource& fSource;
+    PlanarEncodeKernels::EncodeRow fKernel;
     const DestinationPlanes& fPlanes;
-    uint8_t* fChroma;
+    uint8_t* fSums[2];
     const PlanarEncodeKernels& fKernels = Best<PlanarEncodeKernels>();
-    const NV12Kernels& fParting = Best<NV12Kernels>();
 };
 
 } // namespace
 
 PK_Result EncodePlanar420(const SourceImage& source, PK_PixelFormat format,
                           const DestinationPlanes& destination, int32_t quality) {
-    const PK_PixelFormat working =
-        IsMatrix601(format) ? PK_PixelFormat_VUYP_4444_8u : PK_PixelFormat_VUYP_4444_8u_709;
+    const EncodedFrom working = ChooseWorking(source.format, format);
     ConversionChain chain;
-    if (!chain.Build(source.format, working, quality)) return PK_ErrBadSrcFormat;
+    if (!chain.Build(source.format, working.format, quality)) return PK_ErrBadSrcFormat;
 
     const bool isFieldPicture = HasFieldPictures(format);
-    const auto bytesOfChroma = static_cast<uint64_t>(2 * destination[1].width);
+    const uint64_t bytesOfSums = RowEncoder::BytesOfSums(source.width);
     RowMemory memory(source.width);
     memory.AddSource(chain);
-    memory.AddSource(chain);
-    memory.AddBytes(bytesOfChroma);
+    memory.AddBytes(bytesOfSums);
+    memory.AddBytes(bytesOfSums);
     return memory.With([&](TemporaryRows& rows) {
-        const RowSource sources[2] = {{source, chain, rows}, {source, chain, rows}};
-        const RowEncoder encoder(sources, destination, rows.Take(bytesOfChroma));
+        const RowSource pixels(source, chain, rows);
+        const RowEncoder encoder(pixels, working.kernel, destination, rows.Take(bytesOfSums),
+                                 rows.Take(bytesOfSums));
         for (int32_t row = 0; row < destination[1].height; ++row)
             encoder.Chroma(row, RowsOfChroma(isFieldPicture, row, source.height));
         if (isFieldPicture)

@@ -16,11 +16,6 @@ void FillPlane(const Plane<uint8_t>& plane, uint8_t code) {
         std::memset(plane.Row(row), code, static_cast<size_t>(plane.width));
 }
 
-/// The planes of larger images have no offsets in 32 bits.
-bool HavePlanesOffsets(int64_t width, int64_t height) {
-    return ((width + 127) & ~int64_t{127}) * ((height + 31) & ~int64_t{31}) <= INT32_MAX;
-}
-
 template <class Sample, class Fill>
 int32_t FillWith(Fill fill, const DestinationImage& image, const FillUnit& unit, int32_t units) {
     Sample samples[4];

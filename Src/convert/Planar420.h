@@ -20,7 +20,7 @@ DecodeTarget ChoosePlanarTarget(const DecodeTarget& stream, const DecodeTarget& 
 /// The planes of a picture that lies in one block; none where their places cannot be told in 32 bits.
 template <class Byte>
 std::optional<Planes<Byte>> PlanesOfStream(const Image<Byte>& stream) {
-    if (PK_PixelFormatSize(stream.format, stream.width, stream.height) > INT32_MAX) return std::nullopt;
+    if (!HavePlanesOffsets(stream.width, stream.height)) return std::nullopt;
     return PlanesInBlock(stream.pixels, stream.format, stream.width, stream.height);
 }
 

@@ -1,5 +1,6 @@
 // Planes of bytes to pixels of 4:2:2 and 4:4:4.
 
+#include "convert/LastRepeated.h"
 #include "convert/PlanarKernels.h"
 #include "primitives/lanes/ChromaPairs.h"
 
@@ -32,7 +33,7 @@ inline I32 LoadChroma(const uint8_t* u, const uint8_t* v) {
     return LoadBytes(u) | ShiftLeft<16>(LoadBytes(v));
 }
 
-struct ToUYVY : Groups<2 * kLanes, Each<4, 2>, Neighbours<Each<1>, 0, 1>, Each<1, 2>, Each<1, 2>> {
+struct ToUYVY : Groups<2 * kLanes, Each<4, 2>, LastRepeated<Each<1>>, Each<1, 2>, Each<1, 2>> {
     static void Group(const uint8_t* luma, const uint8_t* u, const uint8_t* v, uint8_t* destination) {
         Store(destination, LoadChroma(u, v) | ShiftLeft<8>(LoadBytesAsHalves(luma)));
     }

@@ -1,56 +1,60 @@
-// Four-byte VUYA pixels to planes of bytes.
+// Four-byte pixels to planes of bytes.
 
-#include "convert/DownsampleRow.h"
 #include "convert/PlanarKernels.h"
+#include "convert/RGBStages.h"
 
 namespace PK::PK_TARGET {
 namespace {
 
-struct LumaOfPixels : Groups<4 * kLanes, Each<1>, Each<4>> {
-    static I32 Luma(const uint8_t* pixels) { return ShiftRight<16>(LoadInts(pixels)) & Ints(0xff); }
+/// Carries the chroma of a group's last pixel, and the place of the sums, to the next group.
+template <class Stage>
+struct Encode : Groups<4 * kLanes, Each<1>, Each<4>> {
+    static_assert(Encode::kElements <= PlanarEncodeKernels::kGroup);
 
-    static void Group(const uint8_t* source, uint8_t* destination) {
-        constexpr int32_t kStep = 4 * kLanes;
-        Store(destination, PackLanes(Luma(source), Luma(source + kStep), Luma(source + 2 * kStep),
-                                     Luma(source + 3 * kStep)));
-    }
-};
+    Encode(I32 before, uint8_t* sums) : fBefore(before), fSums(sums) {}
 
-/// U and V of kLanes pixels, each the sum of two rows.
-inline I32 ChromaSum(const uint8_t* first, const uint8_t* second) {
-    return PackedVUYA::Chroma(LoadInts(first)) + PackedVUYA::Chroma(LoadInts(second));
-}
-
-/// Carries the chroma of a group's last pixels to the next group.
-struct ChromaOfRows : Groups<4 * kLanes, Each<2, 2>, Each<4>, Each<4>> {
-    explicit ChromaOfRows(I32 before) : fBefore(before) {}
-
-    I32 Pairs(const uint8_t* first, const uint8_t* second) {
-        constexpr int32_t kStep = 4 * kLanes;
+    void StoreSums(YUVPixels first, YUVPixels second) {
         I32 even, odd;
-        SeparateLanes(ChromaSum(first, second), ChromaSum(first + kStep, second + kStep), even, odd);
-        const I32 sum = ShiftInLane(fBefore, odd) + even + even + odd;
+        SeparateLanes(first.chroma, second.chroma, even, odd);
+        Store(fSums, ShiftInLane(fBefore, odd) + even + even + odd);
         fBefore = odd;
-        return ShiftRight<3>(sum) & Ints(0x00ff00ff);
+        fSums += sizeof(I32);
     }
 
-    void Group(const uint8_t* first, const uint8_t* second, uint8_t* destination) {
-        constexpr int32_t kHalf = 8 * kLanes;
-        const I32 pairs = Pairs(first, second);
-        Store(destination, PackHalves(pairs, Pairs(first + kHalf, second + kHalf)));
+    void Group(const uint8_t* source, uint8_t* luma) {
+        YUVPixels pixels[4];
+        Stage::Load(source, pixels[0], pixels[1]);
+        Stage::Load(source + 8 * kLanes, pixels[2], pixels[3]);
+        Store(luma, PackLanes(pixels[0].luma, pixels[1].luma, pixels[2].luma, pixels[3].luma));
+        StoreSums(pixels[0], pixels[1]);
+        StoreSums(pixels[2], pixels[3]);
     }
 
     I32 fBefore; // in the last lane
+    uint8_t* fSums;
 };
 
-void ChromaRow(const void* first, const void* second, void* destination, int32_t width) {
+template <class Stage>
+void PlanesFromRow(const void* pixels, void* luma, void* sums, int32_t width) {
     if (width <= 0) return;
-    uint32_t pixels[2];
-    std::memcpy(&pixels[0], first, sizeof pixels[0]);
-    std::memcpy(&pixels[1], second, sizeof pixels[1]);
-    const auto chroma = [](uint32_t pixel) { return PackedVUYA::Chroma(Ints(static_cast<int32_t>(pixel))); };
-    RunRow(ChromaOfRows(chroma(pixels[0]) + chroma(pixels[1])), width, destination, first, second);
+    const I32 before = OnePixel<Stage>(static_cast<const uint8_t*>(pixels)).chroma;
+    RunRow(Encode<Stage>(before, static_cast<uint8_t*>(sums)), width, luma, pixels);
 }
+
+/// The byte of a half.
+template <int kBit>
+struct ChromaOfSums : Groups<4 * kLanes, Each<1>, Each<4>, Each<4>> {
+    static I32 Chroma(const uint8_t* first, const uint8_t* second) {
+        return ShiftRight<kBit + 3>(LoadInts(first) + LoadInts(second)) & Ints(0xff);
+    }
+
+    static void Group(const uint8_t* first, const uint8_t* second, uint8_t* destination) {
+        constexpr int32_t kStep = sizeof(I32);
+        Store(destination, PackLanes(Chroma(first, second), Chroma(first + kStep, second + kStep),
+                                     Chroma(first + 2 * kStep, second + 2 * kStep),
+                                     Chroma(first + 3 * kStep, second + 3 * kStep)));
+    }
+};
 
 } // namespace
 } // namespace PK::PK_TARGET
@@ -58,6 +62,14 @@ void ChromaRow(const void* first, const void* second, void* destination, int32_t
 template <>
 const PK::PlanarEncodeKernels& PK::PlanarEncodeKernels::For<PK::Target::PK_TARGET>() {
     using namespace PK_TARGET;
-    static constexpr PlanarEncodeKernels kernels = {.luma = Row<LumaOfPixels>, .chroma = ChromaRow};
+    static constexpr PlanarEncodeKernels kernels = {
+        .fromVUYP = PlanesFromRow<PackedVUYA>,
+        .fromBGRX601 = PlanesFromRow<OpaqueRGB<kRGB8ToYUV601>>,
+        .fromBGRX709 = PlanesFromRow<OpaqueRGB<kRGB8ToYUV709>>,
+        .fromBGRA601 = PlanesFromRow<StraightRGB<kRGB8ToYUV601>>,
+        .fromBGRA709 = PlanesFromRow<StraightRGB<kRGB8ToYUV709>>,
+        .u = TwoRows<ChromaOfSums<0>>,
+        .v = TwoRows<ChromaOfSums<16>>,
+    };
     return kernels;
 }

@@ -53,13 +53,19 @@ struct PlanarWidenKernels {
     static const PlanarWidenKernels& For(); // PlanarWiden.kernels.cpp
 };
 
-/// VUYA pixels of bytes to planes.
+/// Pixels of four bytes to planes.
 struct PlanarEncodeKernels {
-    RowKernel luma;
+    /// A row of pixels to luma and, for each pair, the sums of its U in the lower and its V in the upper half of four bytes:
+    /// weighed 1-2-1 around the even pixel, where the first pixel stands for the one before it. There is room for the sums
+    /// of whole groups of kGroup pixels.
+    using EncodeRow = void (*)(const void* pixels, void* luma, void* sums, int32_t width);
+    static constexpr int32_t kGroup = 64;
+    EncodeRow fromVUYP;
+    EncodeRow fromBGRX601, fromBGRX709; ///< opaque, or with alpha multiplied in already
+    EncodeRow fromBGRA601, fromBGRA709;
 
-    /// Of two rows of whole pairs of pixels, U and V in turns: the sum of both rows, weighed 1-2-1 around each even pixel,
-    /// >> 3. The first pixel stands for the one before it.
-    TwoRowKernel chroma;
+    /// The sums of two rows to a byte for each pair, >> 3.
+    TwoRowKernel u, v;
 
     static constexpr const char* kFamily = "PlanarEncode";
     static constexpr Offer kOffer = Offer::flags;

@@ -1,6 +1,7 @@
 // Planes that get wider by 3/2 or 4/3 on their way to pixels.
 
 #include "convert/ColourMatrices.h"
+#include "convert/LastRepeated.h"
 #include "convert/PlanarKernels.h"
 #include "primitives/lanes/RowDriver.h"
 
@@ -76,7 +77,7 @@ inline void StoreUYVY(uint8_t* destination, FloatPairs pairs) {
 
 /// A luma each pixel and a chroma each pair. A lone last pixel stands for both of its pair.
 template <class Destination>
-using FromFloatPlanes = Groups<2 * kLanes, Destination, Neighbours<Each<4>, 0, 1>, Each<4, 2>, Each<4, 2>>;
+using FromFloatPlanes = Groups<2 * kLanes, Destination, LastRepeated<Each<4>>, Each<4, 2>, Each<4, 2>>;
 
 struct ToUYVY : FromFloatPlanes<Each<4, 2>> {
     static void Group(const uint8_t* luma, const uint8_t* u, const uint8_t* v, uint8_t* destination) {

@@ -107,7 +107,7 @@ PK_Result ChooseEncodeSource(PK_PixelFormat source, PK_PixelFormat stream, int32
 PK_Result DecodeStream(const SourceImage& source, int32_t field, const DestinationImage& destination,
                        int32_t quality) noexcept {
     ConversionChain stays;
-    if (!stays.Build(destination.format, destination.format, quality)) return PK_ErrBadDstFormat;
+    stays.Build(destination.format, destination.format, quality);
     return DecodeStreamThrough(stays, source, field, destination, quality);
 }
 
@@ -115,6 +115,7 @@ PK_Result DecodeStream(const SourceImage& source, int32_t field, const Destinati
 PK_Result DecodeStreamThrough(const ConversionChain& onward, const SourceImage& source, int32_t field,
                               const DestinationImage& destination, int32_t quality) noexcept {
     if (!Is420Planar(source.format)) return PK_ErrNotSupported;
+    if (onward.count == 0) return PK_ErrBadDstFormat;
     if (destination.width == 0 || destination.height == 0) return PK_Success;
     const auto planes = PlanesOfStream(source);
     if (!planes) return PK_ErrFailed;

@@ -7,6 +7,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <cstdlib>
 #include <type_traits>
 
 namespace PK {
@@ -16,6 +17,11 @@ enum class Chroma {
     k420, ///< Half the width and half the height, both rounded down: a last odd column or row has none of its own.
     k422, ///< Half the width, rounded up: a last odd column has its own. The height is that of Y.
 };
+
+/// Whether the planes of a 4:2:0 image in one block have offsets in 32 bits.
+constexpr bool HavePlanesOffsets(int64_t width, int64_t height) {
+    return ((width + 127) & ~int64_t{127}) * ((height + 31) & ~int64_t{31}) <= INT32_MAX;
+}
 
 /// Rows of samples; row bytes of either sign.
 template <class Byte>
@@ -28,6 +34,13 @@ struct Plane {
     Byte* Row(int32_t row) const { return pixels + row * rowBytes; }
     bool IsEmpty() const { return width == 0 || height == 0; }
 };
+
+/// Whether there are samples that cannot be told apart: without memory, or in rows that begin within each other.
+template <class Byte>
+bool IsUnreadable(const Plane<Byte>& plane) {
+    if (plane.IsEmpty()) return false;
+    return plane.pixels == nullptr || (plane.height > 1 && std::abs(plane.rowBytes) < plane.width);
+}
 
 /// In the order Y, U, V.
 template <class Byte>

@@ -1,16 +1,12 @@
 #pragma once
 
-// Start of the primitives, and the one trace line of the library: the warning of an initialiser.
+// Start of the primitives, and the warnings of their initialisers.
+
+#include "frame/TraceSite.h"
 
 #include <cstdint>
 
 namespace PK {
-
-/// What a place that traces remembers, so that it asks the host again only after a change.
-struct TraceSite {
-    uint32_t changeCount = ~uint32_t{0};
-    bool enabled = false;
-};
 
 /// Writes a warning if the status is one (positive) and the channel is on. Never fails: a line that cannot
 /// be composed is not written.

@@ -2,13 +2,9 @@
 
 // Which rows of an interlaced source a pass over the rows of a destination reads.
 
-#include <cstdint>
+#include "frame/Fields.h"
 
 namespace PK {
-
-constexpr bool IsInterlaced(int32_t field) {
-    return field == 1 || field == 2;
-}
 
 struct FieldOfSource {
     int32_t firstRow; ///< of an even place; at an odd place the other one of 0 and 1

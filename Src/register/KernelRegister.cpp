@@ -30,6 +30,7 @@
 #include "primitives/MultiplyConstant.h"
 #include "primitives/TransposeKernels.h"
 #include "primitives/VectorMath.h"
+#include "scale/HalveKernels.h"
 #include "scale/QuarterScaleKernels.h"
 
 namespace PK {
@@ -39,6 +40,8 @@ template <>
 inline constexpr Shape kShapeOf<PlanesRow> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<QuarterScaleKernels::Interleave> = Shape::SeveralRows;
+template <>
+inline constexpr Shape kShapeOf<PlanarEncodeKernels::EncodeRow> = Shape::SeveralRows;
 template <>
 inline constexpr Shape kShapeOf<SumKernels::Sum> = Shape::SeveralRows;
 template <>
@@ -142,8 +145,13 @@ constexpr KernelRow kPlanar[] = {
     Entry<&PlanarWidenKernels::toVUYX>("FloatPlanesToVUYXRow", {Floats(1), Floats(1, 2), kVUYA8}),
     Entry<&PlanarWidenKernels::toBGRX601>("FloatPlanesToBGRXRow_601", {Floats(1), Floats(1, 2), kBGRA8}),
     Entry<&PlanarWidenKernels::toBGRX709>("FloatPlanesToBGRXRow_709", {Floats(1), Floats(1, 2), kBGRA8}),
-    Entry<&PlanarEncodeKernels::luma>("PixelsToLumaRow", {kVUYA8, Bytes(1)}),
-    Entry<&PlanarEncodeKernels::chroma>("PixelsToChromaRow", {kVUYA8, kVUYA8, Bytes(2, 2)}, {}, {.group = 2}),
+    Entry<&PlanarEncodeKernels::fromVUYP>("PixelsToPlanesRow_VUYP", {kVUYA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRX601>("PixelsToPlanesRow_BGRX601", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRX709>("PixelsToPlanesRow_BGRX709", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRA601>("PixelsToPlanesRow_BGRA601", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::fromBGRA709>("PixelsToPlanesRow_BGRA709", {kBGRA8, Bytes(1)}),
+    Entry<&PlanarEncodeKernels::u>("ChromaOfSumsRow_U", {Bytes(4), Bytes(4), Bytes(1)}),
+    Entry<&PlanarEncodeKernels::v>("ChromaOfSumsRow_V", {Bytes(4), Bytes(4), Bytes(1)}),
 };
 
 constexpr KernelRow kNV12[] = {
@@ -155,6 +163,10 @@ constexpr KernelRow kOperations[] = {
     Entry<&QuarterScaleKernels::evenBytes>("EvenBytesRow", {Bytes(2), Bytes(1)}),
     Entry<&QuarterScaleKernels::lumaFirst>("InterleavePlanesRow_YUYV", {Bytes(2), Bytes(1), Bytes(4)}),
     Entry<&QuarterScaleKernels::chromaFirst>("InterleavePlanesRow_UYVY", {Bytes(2), Bytes(1), Bytes(4)}),
+    Entry<&HalveKernels::HalveRowV210>("HalveRowV210", {{Samples::Bits, 16, 3}, Bytes(4)}),
+    Entry<&HalveKernels::HalveRowUYVY32f>("HalveRowUYVY32f", {Floats(4), Floats(4)}),
+    Entry<&HalveKernels::HalveRowUYVY8u>("HalveRowUYVY8u", {Bytes(4), Bytes(4)}),
+    Entry<&HalveKernels::HalveRowYUYV8u>("HalveRowYUYV8u", {Bytes(4), Bytes(4)}),
     Entry<&MaskKernels::pixels4>("SelectByMaskRow_4", {Bytes(4), Bytes(4), Bytes(4)}),
     Entry<&MaskKernels::pixels8>("SelectByMaskRow_8", {Bytes(8), Bytes(8), Bytes(8)}),
     Entry<&MaskKernels::pixels16>("SelectByMaskRow_16", {Bytes(16), Bytes(16), Bytes(16)}),

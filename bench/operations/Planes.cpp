@@ -2,10 +2,15 @@
 
 #include "operations/Operation.h"
 
+#include <PixelKiln/Convert.h>
 #include <PixelKiln/Overlay.h>
 #include <PixelKiln/Planar.h>
 #include <PixelKiln/QuarterScale.h>
 #include <PixelKiln/Utilities.h>
+
+#include <algorithm>
+#include <memory>
+#include <vector>
 
 namespace OperationBench {
 namespace {
@@ -71,6 +76,39 @@ Run PartSurface(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+template <PK_PixelFormat kFormat, int32_t kPixelBytes>
+Run Decode(const uint8_t* source, uint8_t* destination) {
+    const Planar420 from(source, kWidth, kHeight);
+    return [=] {
+        PK::DecompressYUV_420_8u(Readable(from), from.rowBytes, kWidth, kHeight,
+                                 PK_PixelFormat_YUV_420_MPEG2_FRAME, destination, kPixelBytes * kWidth,
+                                 kWidth, kHeight, kFormat, 0, 2);
+    };
+}
+
+/// The planes of a block, whose rows and heights are rounded up.
+std::shared_ptr<std::vector<uint8_t>> Block() {
+    const int64_t bytes = PK_PixelFormatSize(PK_PixelFormat_YUV_420_MPEG2_FRAME, kWidth, kHeight);
+    return std::make_shared<std::vector<uint8_t>>(static_cast<size_t>(bytes));
+}
+
+template <PK_PixelFormat kFormat>
+Run Encode(const uint8_t* source, uint8_t*) {
+    return [=, block = Block()] {
+        PK_Convert(source, kBGRARowBytes, kFormat, block->data(), 0, PK_PixelFormat_YUV_420_MPEG2_FRAME,
+                   kWidth, kHeight, 2);
+    };
+}
+
+Run DecodeBlock(const uint8_t* source, uint8_t* destination) {
+    const auto block = Block();
+    std::copy_n(source, kPlanar, block->data());
+    return [=] {
+        PK_Convert(block->data(), 0, PK_PixelFormat_YUV_420_MPEG2_FRAME, destination, kBGRARowBytes,
+                   PK_PixelFormat_BGRA_4444_8u, kWidth, kHeight, 2);
+    };
+}
+
 /// The source's second image lies behind the first, and the mask behind both.
 Run Mask(const uint8_t* source, uint8_t* destination) {
     constexpr PK_PixelFormat kFormat = PK_PixelFormat_BGRA_4444_8u;
@@ -115,6 +153,18 @@ const AddOperations add = {
     {"Field of 4:2:0 to UYVY", kPlanar, kCount, Samples::Bytes, Against::Nothing, 0, QuarterScaleTo422},
     {"Copy of 4:2:0 planes", kPlanar, kPlanar, Samples::Bytes, Against::Peer, 0.95, CopyPlanar},
     {"NV12 to planes", kPlanar, kPlanar, Samples::Bytes, Against::Peer, 0.95, PartSurface},
+    {"I420 to BGRA", kPlanar, 4 * kCount, Samples::Bytes, Against::Peer, 0.6,
+     Decode<PK_PixelFormat_BGRA_4444_8u, 4>},
+    {"I420 to BGRA, a block by PK_Convert", kPlanar, 4 * kCount, Samples::Bytes, Against::Peer, 0.6,
+     DecodeBlock},
+    {"I420 to VUYX", kPlanar, 4 * kCount, Samples::Bytes, Against::Nothing, 0,
+     Decode<PK_PixelFormat_VUYX_4444_8u, 4>},
+    {"I420 to UYVY", kPlanar, 2 * kCount, Samples::Bytes, Against::Peer, 0.95,
+     Decode<PK_PixelFormat_UYVY_422_8u, 2>},
+    {"BGRA to I420", 4 * kCount, kPlanar, Samples::Bytes, Against::Peer, 0.95,
+     Encode<PK_PixelFormat_BGRA_4444_8u>},
+    {"BGRX to I420", 4 * kCount, kPlanar, Samples::Bytes, Against::Peer, 0.95,
+     Encode<PK_PixelFormat_BGRX_4444_8u>},
     {"Composite of two BGRA 8u by a one-bit mask", 8 * kCount + kCount / 8, 4 * kCount, Samples::Bytes,
      Against::Peer, 0.95, Mask},
     {"Opaque alpha, in place", 4 * kCount, 4 * kCount, Samples::Bytes, Against::Nothing, 0, SetAlpha},

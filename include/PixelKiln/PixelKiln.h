@@ -24,5 +24,6 @@
 #include <PixelKiln/QuadWarp.h>
 #include <PixelKiln/QuarterScale.h>
 #include <PixelKiln/Rotate.h>
+#include <PixelKiln/ScaleConvert.h>
 #include <PixelKiln/Types.h>
 #include <PixelKiln/Utilities.h>

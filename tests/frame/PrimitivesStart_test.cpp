@@ -28,6 +28,8 @@ protected:
         debug::ClearTraceLevel("PK.InitIpp");
     }
 
+    static TraceSite Site() { return {"PK.InitIpp", 5, true}; }
+
     static std::string Line(const std::string& thread, const std::string& text) {
         return "<" + thread + "> <PK.InitIpp> <5> ippInit warning: " + text + "\n";
     }
@@ -39,7 +41,7 @@ protected:
 } // namespace
 
 TEST_F(PrimitivesStart, WarnsInOneLine) {
-    TraceSite site;
+    TraceSite site = Site();
     TraceInitialiserWarning(site, 1, "slow path");
     EXPECT_EQ(sTraced, Line("slow path"));
     TraceInitialiserWarning(site, 20, "");
@@ -49,7 +51,7 @@ TEST_F(PrimitivesStart, WarnsInOneLine) {
 TEST_F(PrimitivesStart, TellsTheThread) {
     std::string thread;
     std::thread([&thread] {
-        TraceSite site;
+        TraceSite site = Site();
         thread = std::to_string(threads::GetCurrentThreadID());
         TraceInitialiserWarning(site, 1, "text");
     }).join();
@@ -58,13 +60,13 @@ TEST_F(PrimitivesStart, TellsTheThread) {
 }
 
 TEST_F(PrimitivesStart, IsSilentOnSuccessAndErrors) {
-    TraceSite site;
+    TraceSite site = Site();
     for (const int32_t status : {0, -1, -8, INT32_MIN}) TraceInitialiserWarning(site, status, "text");
     EXPECT_EQ(sTraced, "");
 }
 
 TEST_F(PrimitivesStart, GoesByTheLevelOfTheChannel) {
-    TraceSite site;
+    TraceSite site = Site();
     debug::SetTraceLevel("PK.InitIpp", 4);
     TraceInitialiserWarning(site, 1, "a");
     EXPECT_EQ(sTraced, "");
@@ -80,14 +82,14 @@ TEST_F(PrimitivesStart, GoesByTheLevelOfTheChannel) {
 }
 
 TEST_F(PrimitivesStart, KeepsTheAnswerUntilAChange) {
-    TraceSite site{debug::TraceChangeCount(), false};
+    TraceSite site = Site();
+    site.answer = TraceSite::Answer(debug::TraceChangeCount(), false);
     TraceInitialiserWarning(site, 1, "kept");
     EXPECT_EQ(sTraced, ""); // the host would have said yes
     debug::SetTraceLevel("Another", 1);
     TraceInitialiserWarning(site, 1, "asked");
     EXPECT_EQ(sTraced, Line("asked"));
-    EXPECT_TRUE(site.enabled);
-    EXPECT_EQ(site.changeCount, debug::TraceChangeCount());
+    EXPECT_EQ(site.answer, TraceSite::Answer(debug::TraceChangeCount(), true));
     debug::ClearTraceLevel("Another");
 }
 

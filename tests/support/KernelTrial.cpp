@@ -150,6 +150,19 @@ FloatRange DrawRange(Random&) {
     return {0.1f, 0.9f};
 }
 
+/// Luma, and behind it the sums of whole pairs.
+KernelTrial EncodeTrial(const KernelRow& kernel, int32_t size, Random&) {
+    const size_t luma = Count(size), sums = luma / 2 * 4;
+    return {{RowOf(kernel.operands.source, size)},
+            {Samples::Bytes, luma + sums},
+            Typed<PlanarEncodeKernels::EncodeRow>(
+                [=](PlanarEncodeKernels::EncodeRow run, const Sources& sources, uint8_t* destination) {
+                    std::vector<uint8_t> room(4 * luma + 2 * PlanarEncodeKernels::kGroup);
+                    run(sources[0], destination, room.data(), size);
+                    std::copy_n(room.data(), sums, destination + luma);
+                })};
+}
+
 ChromaWeights DrawWeights(Random& random) {
     const auto first = static_cast<int32_t>(random.Below(9));
     return {first, 8 - first};
@@ -430,6 +443,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"PlanarDecode", TwoRowTrialWith<ChromaWeights, DrawWeights>, "Blend"},
     {"PlanarDecode", PlanesTrial<1>},
     {"PlanarWiden", PlanesTrial<1>, "Float"},
+    {"PlanarEncode", EncodeTrial, "PixelsToPlanes"},
     {"NV12", PartPairsTrial, "PartPairs"},
     {"QuarterScale", InterleaveTrial, "Interleave"},
     {"Mask", MaskTrial},

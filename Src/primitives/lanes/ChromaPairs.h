@@ -49,6 +49,12 @@ struct PixelVUYX {
     }
 };
 
+/// U, Y0, V, Y1 with a pair a block, to the even or the odd pixel's V, U, Y and an opaque alpha.
+template <int kLuma>
+inline F32 PixelsOfPairs(F32 uyvy) {
+    return BlendBlocks<0b0111>(ShufflePixel<2, 0, kLuma, 3>(uyvy), Floats(1));
+}
+
 /// 8-bit 4:2:2 to pixels of four bytes. The vector form from SSSE3 up rounds the average up, the plain form
 /// and SSE2 truncate: this is deliberate, hosts compare against both.
 template <bool kLumaFirst, class Pixel>

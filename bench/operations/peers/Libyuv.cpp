@@ -53,6 +53,48 @@ Run PartSurface(const uint8_t* source, uint8_t* destination) {
     };
 }
 
+/// Y, U and V, one after the other.
+struct I420 {
+    const uint8_t *y, *u, *v;
+
+    explicit I420(const uint8_t* planes)
+        : y(planes), u(planes + kPixels), v(planes + kPixels + kPixels / 4) {}
+};
+
+/// Chroma interpolated in rows and columns, as if it stood between both.
+Run DecodeFiltered(const uint8_t* source, uint8_t* destination) {
+    return [=, from = I420(source)] {
+        libyuv::I420ToARGBMatrixFilter(from.y, kWidth, from.u, kWidth / 2, from.v, kWidth / 2, destination,
+                                       kBGRARowBytes, &libyuv::kYuvI601Constants, kWidth, kHeight,
+                                       libyuv::kFilterBilinear);
+    };
+}
+
+/// A sample of chroma serves four pixels.
+Run DecodeRepeated(const uint8_t* source, uint8_t* destination) {
+    return [=, from = I420(source)] {
+        libyuv::I420ToARGB(from.y, kWidth, from.u, kWidth / 2, from.v, kWidth / 2, destination, kBGRARowBytes,
+                           kWidth, kHeight);
+    };
+}
+
+/// Two rows share their chroma.
+Run DecodeToUYVY(const uint8_t* source, uint8_t* destination) {
+    return [=, from = I420(source)] {
+        libyuv::I420ToUYVY(from.y, kWidth, from.u, kWidth / 2, from.v, kWidth / 2, destination, 2 * kWidth,
+                           kWidth, kHeight);
+    };
+}
+
+/// Ignores alpha; the mean of four pixels' chroma.
+Run Encode(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        uint8_t* const u = destination + kPixels;
+        libyuv::ARGBToI420(source, kBGRARowBytes, destination, kWidth, u, kWidth / 2, u + kPixels / 4,
+                           kWidth / 2, kWidth, kHeight);
+    };
+}
+
 Run Shade(const uint8_t* source, uint8_t* destination) {
     return [=] {
         constexpr uint32_t kConstants = 0xff3264c8; // alpha, red, green and blue
@@ -83,7 +125,26 @@ Run Enlarge(const uint8_t* source, uint8_t* destination) {
     };
 }
 
-/// The same, and then all samples.
+/// To half of each side: between four pixels it has their mean.
+template <libyuv::FilterMode kFilter>
+Run Reduce(const uint8_t* source, uint8_t* destination) {
+    return [=] {
+        libyuv::ARGBScale(source, kBGRARowBytes, kWidth, kHeight, destination, kBGRARowBytes / 2, kWidth / 2,
+                          kHeight / 2, kFilter);
+    };
+}
+
+/// Every second row, and then every second pixel.
+Run DropFromUYVY(const uint8_t* source, uint8_t* destination) {
+    const auto rows = std::make_shared<std::vector<uint8_t>>(2 * static_cast<size_t>(kPixels));
+    return [=] {
+        libyuv::UYVYToARGB(source + 2 * kWidth, 4 * kWidth, rows->data(), kBGRARowBytes, kWidth, kHeight / 2);
+        libyuv::ARGBScale(rows->data(), kBGRARowBytes, kWidth, kHeight / 2, destination, kBGRARowBytes / 2,
+                          kWidth / 2, kHeight / 2, libyuv::kFilterNone);
+    };
+}
+
+/// From half of each side, and then all samples.
 Run EnlargeToFloats(const uint8_t* source, uint8_t* destination) {
     const auto scaled = std::make_shared<std::vector<uint8_t>>(4 * static_cast<size_t>(kPixels));
     return [=, enlarge = Enlarge(source, scaled->data())] {
@@ -102,10 +163,23 @@ const AddPeers add = {
     {"Dissolve of opaque BGRA 8u", "libyuv ARGBInterpolate", true, Interpolate},
     {"Copy of 4:2:0 planes", "libyuv CopyPlane", true, CopyPlanes},
     {"NV12 to planes", "libyuv NV12ToI420", true, PartSurface},
+    {"I420 to BGRA", "libyuv I420ToARGBMatrixFilter, bilinear", false, DecodeFiltered},
+    {"I420 to BGRA", "libyuv I420ToARGB, chroma repeated", false, DecodeRepeated, false},
+    {"I420 to BGRA, a block by PK_Convert", "libyuv I420ToARGBMatrixFilter, bilinear", false, DecodeFiltered},
+    {"I420 to UYVY", "libyuv I420ToUYVY, chroma repeated", false, DecodeToUYVY},
+    {"BGRA to I420", "libyuv ARGBToI420", false, Encode},
+    {"BGRX to I420", "libyuv ARGBToI420", false, Encode},
     {"Product of BGRA 8u by constants", "libyuv ARGBShade", true, Shade},
     {"Placing of BGRP 8u at twice the size, bilinear", "libyuv ARGBScale", false, Enlarge},
     {"Placing of BGRP 8u at twice the size to 32f, bilinear", "libyuv ARGBScale, ByteToFloat", false,
      EnlargeToFloats},
+    {"Scaling of BGRP 8u to half the size, quality 2", "libyuv ARGBScale", true,
+     Reduce<libyuv::kFilterBilinear>},
+    {"Scaling of BGRA 8u to half the size, quality 2", "libyuv ARGBScale", false,
+     Reduce<libyuv::kFilterBilinear>},
+    {"Scaling of BGRA 8u to half the size, quality 3", "libyuv ARGBScale (mean of four)", false,
+     Reduce<libyuv::kFilterBox>},
+    {"Half size of UYVY 8u to BGRA 8u", "libyuv UYVYToARGB, ARGBScale", false, DropFromUYVY},
     {"RGB 8u to BGRA 8u", "libyuv RAWToARGB", true, FromRGB},
     {"Transpose BGRA 8u", "libyuv ARGBRotate", true, Turn<libyuv::kRotate90, -kHeight>},
     {"Transpose pixels of 1 byte", "libyuv TransposePlane", true, TransposeBytes},

@@ -123,6 +123,9 @@ constexpr int32_t kHalfWidth = kWidth / 2, kHalfHeight = kHeight / 2;
 template <int kType, int kInterpolation>
 constexpr Prepare Enlarge = Scale<kType, kInterpolation, kHalfWidth, kHalfHeight, kWidth, kHeight>;
 
+template <int kInterpolation>
+constexpr Prepare Reduce = Scale<CV_8UC4, kInterpolation, kWidth, kHeight, kHalfWidth, kHalfHeight>;
+
 /// About the middle, to 0.8 of the size.
 template <int kType, int kInterpolation>
 Run Turn(const uint8_t* source, uint8_t* destination) {
@@ -161,6 +164,11 @@ const AddPeers add = {
      Enlarge<CV_32FC4, cv::INTER_LINEAR>},
     {"Placing of BGRP 32f at twice the size, cubic", "OpenCV resize", false,
      Enlarge<CV_32FC4, cv::INTER_CUBIC>},
+    {"Scaling of BGRP 8u to half the size, quality 2", "OpenCV resize", true, Reduce<cv::INTER_LINEAR>},
+    {"Scaling of BGRA 8u to half the size, quality 2", "OpenCV resize", false, Reduce<cv::INTER_LINEAR>},
+    {"Scaling of BGRA 8u to half the size, quality 3", "OpenCV resize (area)", false, Reduce<cv::INTER_AREA>},
+    {"Scaling of BGRA 8u to half the size, quality 5", "OpenCV resize (cubic of codes, not widened)", false,
+     Reduce<cv::INTER_CUBIC>},
     {"Quad warp, bilinear", "OpenCV warpAffine", false, Warp<cv::INTER_LINEAR>},
     {"Quad warp, nearest", "OpenCV warpAffine", false, Warp<cv::INTER_NEAREST>},
 };

@@ -40,20 +40,33 @@ Run Convert(const uint8_t*, uint8_t*) {
     };
 }
 
-/// Four planes one after the other, by the cubic that motion has.
-template <int32_t kFromWidth, int32_t kFromHeight, int32_t kToWidth, int32_t kToHeight>
+struct FloatPlanes {
+    using Sample = float;
+    static constexpr auto kType = ZIMG_PIXEL_FLOAT;
+    static void Fill(FrameBench::Planes& planes, int32_t width) { planes.Fill<float>(width, 0, 1); }
+};
+struct BytePlanes {
+    using Sample = uint8_t;
+    static constexpr auto kType = ZIMG_PIXEL_BYTE;
+    static void Fill(FrameBench::Planes& planes, int32_t width) { planes.Fill<uint8_t>(width, 0, 256); }
+};
+
+/// Four planes one after the other; the cubic is that of motion.
+template <class Kind, zimg_resample_filter_e kFilter, int32_t kFromWidth, int32_t kFromHeight,
+          int32_t kToWidth, int32_t kToHeight>
 Run Scale(const uint8_t*, uint8_t*) {
-    constexpr int32_t kFromRowBytes = 4 * kFromWidth, kToRowBytes = 4 * kToWidth;
+    constexpr int32_t kSample = sizeof(typename Kind::Sample);
+    constexpr int32_t kFromRowBytes = kSample * kFromWidth, kToRowBytes = kSample * kToWidth;
     const auto from = std::make_shared<FrameBench::Planes>(4, kFromRowBytes, kFromHeight);
     const auto to = std::make_shared<FrameBench::Planes>(4, kToRowBytes, kToHeight);
-    from->Fill<float>(kFromWidth, 0, 1);
+    Kind::Fill(*from, kFromWidth);
     zimg_graph_builder_params params = FrameBench::ParamsOfZimg();
-    params.resample_filter = ZIMG_RESIZE_BICUBIC;
+    params.resample_filter = kFilter;
     params.filter_param_a = 0;
     params.filter_param_b = 0.75;
-    const auto graph = std::make_shared<FrameBench::Graph>(
-        FrameBench::OfSize(kFromWidth, kFromHeight, ZIMG_PIXEL_FLOAT),
-        FrameBench::OfSize(kToWidth, kToHeight, ZIMG_PIXEL_FLOAT), params);
+    const auto graph =
+        std::make_shared<FrameBench::Graph>(FrameBench::OfSize(kFromWidth, kFromHeight, Kind::kType),
+                                            FrameBench::OfSize(kToWidth, kToHeight, Kind::kType), params);
     return [=] {
         for (int plane = 0; plane < 4; ++plane) {
             auto source = FrameBench::EmptyBuffer<zimg_image_buffer_const>();
@@ -69,11 +82,18 @@ Run Scale(const uint8_t*, uint8_t*) {
 
 constexpr int32_t kHalfWidth = kWidth / 2, kHalfHeight = kHeight / 2;
 
+template <class Kind, zimg_resample_filter_e kFilter>
+constexpr Prepare Reduce = Scale<Kind, kFilter, kWidth, kHeight, kHalfWidth, kHalfHeight>;
+
 const AddPeers addScaling = {
     {"Placing of BGRP 32f at twice the size, cubic", "zimg bicubic (planes)", false,
-     Scale<kHalfWidth, kHalfHeight, kWidth, kHeight>},
+     Scale<FloatPlanes, ZIMG_RESIZE_BICUBIC, kHalfWidth, kHalfHeight, kWidth, kHeight>},
     {"Placing of BGRP 32f at half the size, cubic", "zimg bicubic (planes)", false,
-     Scale<kWidth, kHeight, kHalfWidth, kHalfHeight>},
+     Reduce<FloatPlanes, ZIMG_RESIZE_BICUBIC>},
+    {"Scaling of BGRA 8u to half the size, quality 3", "zimg bilinear (planes)", false,
+     Reduce<BytePlanes, ZIMG_RESIZE_BILINEAR>},
+    {"Scaling of BGRA 8u to half the size, quality 5", "zimg bicubic (planes of codes)", false,
+     Reduce<BytePlanes, ZIMG_RESIZE_BICUBIC>},
 };
 
 template <const Colour& kFrom, const Colour& kTo>
