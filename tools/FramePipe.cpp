@@ -28,26 +28,28 @@ std::string CountAndSize(int64_t count, const Frame& frame) {
            FormatName(frame.Format());
 }
 
-void TakeFrames(FrameInput& input, const Step& step, int32_t quality, FrameOutput& output) {
+/// \param use  takes each frame and the output.
+template <class Use>
+void Pipe(const PipeOptions& options, const Use& use) {
+    const FramePlan plan = PlanPipe(options);
+    FrameInput input(plan, options.input);
+    FrameOutput output(plan, options.output, input.Head());
     if (input.FrameCount() > 1) output.RequireRoomForSeveral();
     Progress progress("frames", input.FrameCount());
     while (const Frame* const frame = input.Next()) {
-        if (step)
-            output.Write(Stepped(*frame, step, quality));
-        else
-            output.Write(*frame);
+        use(*frame, output);
         progress.Advance();
     }
+    const int64_t count = output.Finish();
+    if (IsSilent(options)) return;
+    Print(options.input + " -> " + options.output + ": " + CountAndSize(count, input.Last()) + " to " +
+          output.Summary(input.Last()) + "\n");
 }
 
 } // namespace
 
 bool IsSilent(const PipeOptions& options) {
     return options.quiet || options.output == "-";
-}
-
-PK_PixelFormat OutputFormat(const PipeOptions& options) {
-    return PlanOutput(options).to;
 }
 
 Step OnCopy(std::function<void(Frame&)> change) {
@@ -59,14 +61,18 @@ Step OnCopy(std::function<void(Frame&)> change) {
 }
 
 void PipeFrames(const PipeOptions& options, const Step& step) {
-    const FramePlan plan = PlanPipe(options);
-    FrameInput input(plan, options.input);
-    FrameOutput output(plan, options.output, input.Head());
-    TakeFrames(input, step, plan.quality, output);
-    const int64_t count = output.Finish();
-    if (IsSilent(options)) return;
-    Print(options.input + " -> " + options.output + ": " + CountAndSize(count, input.Last()) + " to " +
-          output.Summary(input.Last()) + "\n");
+    Pipe(options, [&](const Frame& frame, FrameOutput& output) {
+        if (step)
+            output.Write(Stepped(frame, step, options.quality));
+        else
+            output.Write(frame);
+    });
+}
+
+void PipeFramesTo(const PipeOptions& options, Size size, const StepTo& step) {
+    Pipe(options, [&](const Frame& frame, FrameOutput& output) {
+        output.Write(step(frame, output.FormatFor(size, frame.Format())));
+    });
 }
 
 void PipeFramesInTheirFormat(PipeOptions options, const Step& step) {

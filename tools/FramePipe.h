@@ -29,9 +29,6 @@ Size ParseSize(const std::string& text);
 /// Whether no line about the work is wanted: asked for, or the frames themselves go to standard output.
 bool IsSilent(const PipeOptions& options);
 
-/// The format that frames are written in: that of --to, or what a PNG is made of. Throws a usage Failure.
-PK_PixelFormat OutputFormat(const PipeOptions& options);
-
 /// What becomes of a frame of the format of --from, before it is taken to that of --to.
 using Step = std::function<Frame(const Frame&)>;
 
@@ -41,6 +38,12 @@ Step OnCopy(std::function<void(Frame&)> change);
 /// Takes every frame of the input through the step, if there is one, to the output and prints a line about it. A step is
 /// given frames of planar 4:2:0 in a raster format.
 void PipeFrames(const PipeOptions& options, const Step& step);
+
+/// What becomes of a frame of any format, 4:2:0 too, on its way to the format that it is written in.
+using StepTo = std::function<Frame(const Frame& frame, PK_PixelFormat to)>;
+
+/// The same by a step that makes frames of this size and of the format that they are written in.
+void PipeFramesTo(const PipeOptions& options, Size size, const StepTo& step);
 
 /// The same where the output keeps the format of the input unless --to tells another.
 void PipeFramesInTheirFormat(PipeOptions options, const Step& step);

@@ -52,8 +52,10 @@ void Run(const Options& told) {
     scaling.quality = options.quality;
     if (scaling.renderField != 0 && scaling.destinationField == 0)
         throw Failure(kExitUsage, "--render-field is for an interlaced output: tell --dst-field");
-    scaling.format = OutputFormat(options);
-    PipeFrames(options, [&](const Frame& frame) { return Scaled(frame, scaling); });
+    PipeFramesTo(options, size, [&](const Frame& frame, PK_PixelFormat to) {
+        scaling.format = to;
+        return Scaled(frame, scaling);
+    });
 }
 
 const Command sScale(Group::Operations, "scale", "Change size, format and field order of frames", Declare,
