@@ -170,7 +170,9 @@ void FuzzConvert(ByteStream& stream) {
     const Outcome again = Convert(request, state, source, isPlaceFree ? second : first, 0xaa);
 
     Check(once.result == again.result, "the same call has the same result");
-    if (once.result == PK_Success)
+    // A block of planes has bytes beside its samples, which stay.
+    const bool hasPlanes = PK::Is420Planar(request.destinationFormat);
+    if (once.result == PK_Success && (!hasPlanes || request.sourceFormat == request.destinationFormat))
         CheckSame(once.rows, again.rows, "every byte of the rows is written, and the same wherever they lie");
     source.CheckStays();
 }

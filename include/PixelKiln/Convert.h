@@ -17,6 +17,13 @@ extern "C" {
 /// Alpha: a straight source (A) loses its alpha by premultiplication, that is over black; a premultiplied one
 /// (P) keeps its colour. A source without alpha becomes opaque.
 ///
+/// Planar 4:2:0 is one block as PK_GetPlanarBuffers lays it out. It is decoded as PK::DecompressYUV_420_8u does, to
+/// VUYX_4444_8u of the destination's matrix if that is 8-bit YUV, else of its own, and goes on from there as any image of
+/// that format. To encode it, rows are taken to VUYP_4444_8u of its matrix; each sample of chroma is the sum of two
+/// rows, of one field where it has field pictures, weighed 1-2-1 about the even pixel, over 8, rounded down. Of two rows
+/// of frame pictures: an odd height loses its last row. Formats of the full range go through BGRX_4444_8u, by the matrix
+/// of video range. Bytes of the block beside the samples stay.
+///
 /// Origin: the picture keeps its sense. Between a format that is stored bottom-up and one that is stored
 /// top-down (PK_IsOriginTopLeft), rows are exchanged on the way.
 ///
@@ -48,7 +55,8 @@ extern "C" {
 /// \param quality              render quality, 0 to 5. Above 1, chroma of 4:2:2 float is interpolated on its
 ///                             way to 4:4:4 instead of repeated.
 /// \return
-///  - PK_Success: converted. A raster conversion of height below 1 or of width 0 does nothing.
+///  - PK_Success: converted. A raster conversion of height below 1 or of width 0 does nothing, nor does one of planes
+///    without a pixel.
 ///  - PK_ErrBadSrcFormat: the source format is neither a stream nor a raster format that has a constant.
 ///  - PK_ErrBadDstFormat: likewise the destination format.
 ///  - PK_ErrSizeMismatch: the decoder of a source stream gives another size than this; or streams of one
@@ -56,9 +64,9 @@ extern "C" {
 ///  - PK_ErrNotSupported: a stream that has no decoder or encoder.
 ///  - PK_ErrOutOfMemory: no memory for a picture between decoding, conversion and encoding, or for rows above
 ///    16384 pixels.
-///  - PK_ErrFailed: a null pointer, a negative width, a width too great, a negative height where a stream is
-///    to be written, negative row bytes of a stream of unknown kind, or no way between the formats. A copy of
-///    a stream of unknown kind looks at no width.
+///  - PK_ErrFailed: a null pointer, a negative width, a width too great, a negative height where there is a stream,
+///    planes that have no places in 32 bits, negative row bytes of a stream of unknown kind, or no way between the
+///    formats. A copy of a stream of unknown kind looks at no width.
 ///  - whatever a decoder or encoder reports.
 ///
 /// Arguments are checked before memory is touched. After a failure of a codec or a lack of memory the

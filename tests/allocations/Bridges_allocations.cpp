@@ -129,6 +129,24 @@ void AddPlanes(Calls& calls) {
                      }});
 }
 
+Call Decode(PK_PixelFormat to, Memory memory) {
+    const auto bytes = static_cast<size_t>(PK_PixelFormatSize(to, kWidth, kHeight));
+    return {{"PK::DecompressYUV_420_8u"},
+            memory,
+            std::vector<uint8_t>(bytes),
+            [to, planes = SourcePlanes()](uint8_t* block) {
+                return PK::DecompressYUV_420_8u(planes.Pointers().data(), SourcePlanes::kRowBytes, kWidth,
+                                                kHeight, PK_PixelFormat_YUV_420_MPEG4_FRAME, block,
+                                                PK_PixelFormatRowBytes(to, kWidth), kWidth, kHeight, to, 0,
+                                                4);
+            }};
+}
+
+void AddDecodings(Calls& calls) {
+    calls.push_back(Decode(PK_PixelFormat_UYVY_422_8u, TakesNone("decodes rows where they belong")));
+    calls.push_back(Decode(PK_PixelFormat_VUYP_4444_32f_709, TakesOrRefuses("rows between passes")));
+}
+
 template <int kMember>
 Call SurfaceToPlanes(const std::vector<uint8_t>& block, int32_t width, int32_t height) {
     const size_t luma = static_cast<size_t>(width) * static_cast<size_t>(height);

@@ -19,6 +19,15 @@ constexpr Conversion kConversions[] = {
     {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_ARGB_4444_8u, TakesNone("one pass needs no row")},
     {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_BGRA_4444_8u, TakesNone("a copy")},
     {PK_PixelFormat_YUV_420_MPEG2_FRAME, PK_PixelFormat_YUV_420_MPEG2_FRAME, TakesNone("a copy")},
+    {PK_PixelFormat_YUV_420_MPEG2_FRAME, PK_PixelFormat_BGRA_4444_8u,
+     TakesOrRefuses("a decoded row above 256 KiB")},
+    {PK_PixelFormat_YUV_420_MPEG4_FIELD_709, PK_PixelFormat_BGRP_4444_32f_Linear,
+     TakesOrRefuses("rows between passes")},
+    {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_YUV_420_MPEG2_FIELD,
+     TakesOrRefuses("sums of chroma above 256 KiB")},
+    {PK_PixelFormat_RGB_444_10u, PK_PixelFormat_YUV_420_MPEG2_FRAME, TakesOrRefuses("rows between passes")},
+    {PK_PixelFormat_UYVY_422_8u, PK_PixelFormat_YUV_420_MPEG2_FRAME_FullRange,
+     TakesOrRefuses("the picture in RGB")},
 };
 
 PK_Result Convert(const Image& source, uint8_t* block, PK_PixelFormat to) {

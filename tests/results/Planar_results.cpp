@@ -1,5 +1,6 @@
 // Copies and reductions of planar images.
 
+#include "results/Formats.h"
 #include "results/Lines.h"
 #include "results/OddCalls.h"
 #include "results/PlaneImages.h"
@@ -78,6 +79,47 @@ void Part(Line& line, const Shape& shape) {
                                        destination.Destinations().data(), destination.Steps().data(),
                                        shape.width, shape.height);
     destination.AddTo(line.results);
+}
+
+struct Decoding {
+    int32_t width, height, toWidth, toHeight;
+};
+
+/// The whole, a field, a quarter, ratios, wider rows, and what is refused.
+constexpr Decoding kDecodings[] = {
+    {1, 1, 1, 1},    {2, 2, 2, 2},    {3, 5, 3, 5},     {33, 7, 33, 7},  {130, 9, 130, 9},
+    {31, 8, 31, 4},  {64, 6, 64, 3},  {41, 9, 20, 4},   {66, 8, 33, 4},  {24, 12, 6, 3},
+    {64, 16, 8, 2},  {40, 24, 40, 4}, {16, 5, 24, 5},   {96, 6, 128, 3}, {192, 5, 256, 5},
+    {48, 12, 16, 2}, {48, 12, 24, 4}, {48, 12, 48, 13}, {0, 4, 0, 4},    {8, 4, 0, 2},
+};
+
+constexpr PK_PixelFormat kDecodedTo[] = {
+    PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_VUYX_4444_8u_709, PK_PixelFormat_VUYA_4444_32f,
+    PK_PixelFormat_UYVY_422_8u,  PK_PixelFormat_YUYV_422_8u_709,  PK_PixelFormat_V210_422_10u,
+    PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_ARGB_4444_32f,    PK_PixelFormat_RGB_444_10u,
+};
+
+void Decode(Line& line, const Decoding& job, PK_PixelFormat from, PK_PixelFormat to) {
+    for (const int32_t field : {0, 1, 2})
+        for (const int32_t quality : {1, 4}) {
+            PlaneImages source = Planes(job.width, job.height, field == 1 ? kUpwards : kSpread, line.random);
+            Image destination(static_cast<size_t>(PK_PixelFormatPackedRowBytes(to, job.toWidth)),
+                              job.toHeight, field == 2 ? kUpwards : kSpread, line.random);
+            line.results.Add(PK::DecompressYUV_420_8u(
+                source.Sources().data(), source.Steps().data(), job.width, job.height, from,
+                destination.First(), destination.Step(), job.toWidth, job.toHeight, to, field, quality));
+            destination.AddTo(line.results);
+        }
+}
+
+void AddDecodings(Lines& lines) {
+    for (const PK_PixelFormat from : kStreams) {
+        if (from >> 24 < 9) continue;
+        for (const PK_PixelFormat to : kDecodedTo)
+            lines.Add("decode/" + PKResults::NameOf(from) + "/" + PKResults::NameOf(to), [=](Line& line) {
+                for (const Decoding& job : kDecodings) Decode(line, job, from, to);
+            });
+    }
 }
 
 void AddShapes(Lines& lines) {
@@ -168,6 +210,7 @@ void AddPlanar(Lines& lines) {
     AddOddParts<0>(lines, "part");
     AddOddParts<1>(lines, "part-field");
     AddShapes(lines);
+    AddDecodings(lines);
     AddAllOdd(lines);
 }
 

@@ -7,6 +7,7 @@
 
 #include <PixelKiln/Convert.h>
 
+#include <algorithm>
 #include <span>
 #include <vector>
 
@@ -38,6 +39,7 @@ std::vector<uint8_t>& Picture() {
 void AddCodes(Line& line, PK_PixelFormat from, PK_PixelFormat to, std::span<const Size> sizes) {
     constexpr size_t kLookedAt = 4096;
     static std::vector<uint8_t> destination(Picture().size());
+    std::fill_n(destination.begin(), kLookedAt, uint8_t{0}); // whatever lines went before
     for (const Size& size : sizes)
         for (const int32_t quality : {0, 4})
             line.results.Add(PK_Convert(Picture().data(), PK_PixelFormatRowBytes(from, size.width), from,

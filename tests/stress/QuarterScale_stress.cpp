@@ -4,6 +4,7 @@
 #include "stress/Operation.h"
 
 #include <PixelKiln/Buffers.h>
+#include <PixelKiln/Convert.h>
 #include <PixelKiln/Planar.h>
 #include <PixelKiln/QuarterScale.h>
 
@@ -77,6 +78,35 @@ Call PartSurface(PKTest::Random& random) {
             }};
 }
 
+/// To pixels of four bytes, at half the height or all of it.
+Call Decode(PK_PixelFormat format, int32_t field, PKTest::Random& random) {
+    return {RandomImage(PK_PixelFormat_BGRA_4444_8u, kSize.width, kSize.height, random),
+            [format, field, source = RandomPlanes(kSize, random)](uint8_t* image) {
+                const Planes from(source, kSize);
+                return PK::DecompressYUV_420_8u(from.first, from.rowBytes, kSize.width, kSize.height, kFormat,
+                                                image, PK_PixelFormatRowBytes(format, kSize.width),
+                                                kSize.width, field == 0 ? kSize.height : kSize.height / 2,
+                                                format, field, 4);
+            }};
+}
+
+/// A block to pixels, and pixels to a block.
+Call ConvertBlock(PK_PixelFormat from, PK_PixelFormat to, PKTest::Random& random) {
+    return {RandomImage(to, kSize.width, kSize.height, random),
+            [from, to, source = RandomImage(from, kSize.width, kSize.height, random)](uint8_t* image) {
+                return PK_Convert(source.data(), PK_PixelFormatRowBytes(from, kSize.width), from, image,
+                                  PK_PixelFormatRowBytes(to, kSize.width), to, kSize.width, kSize.height, 4);
+            }};
+}
+
+std::function<bool()> PrepareDecoding() {
+    PKTest::Random random(44);
+    return Repeat({Decode(PK_PixelFormat_VUYX_4444_8u, 0, random),
+                   Decode(PK_PixelFormat_UYVY_422_8u, 2, random),
+                   ConvertBlock(kFormat, PK_PixelFormat_BGRA_4444_8u, random),
+                   ConvertBlock(PK_PixelFormat_V210_422_10u, kFormat, random)});
+}
+
 std::function<bool()> PrepareQuarterScale() {
     PKTest::Random random(41);
     return Repeat({Reduce(1, random), Reduce(2, random), ReduceToPacked(false, 1, random),
@@ -95,6 +125,7 @@ std::function<bool()> PrepareSurfaces() {
 
 const Operation sQuarterScale("quarter-scale", PrepareQuarterScale);
 const Operation sCopyPlanar("copy-planar", PrepareCopyPlanar);
+const Operation sDecoding("planar-4:2:0", PrepareDecoding);
 const Operation sSurfaces("nv12-to-planes", PrepareSurfaces);
 
 } // namespace
