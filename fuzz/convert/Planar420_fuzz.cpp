@@ -45,7 +45,7 @@ PK_PixelFormat DrawSourceFormat(ByteStream& stream) {
 
 void FuzzPlanar420(ByteStream& stream) {
     SetSwitches(DrawSwitches(stream));
-    const uint32_t state = DrawFloatState(stream);
+    const uint32_t state = DrawFloatState(stream) | kExceptionFlags;
     const Size from = DrawSource(stream), to = DrawDestination(stream, from);
     const PK_PixelFormat source = DrawSourceFormat(stream), destination = DrawFormat(stream);
     const int32_t field = stream.BetweenOrAny(0, 2, 16), quality = stream.BetweenOrAny(0, 5, 16);
