@@ -29,6 +29,9 @@ constexpr Scaling kScalings[] = {
     {kUYVY, kUYVY, 30, 20, 25, 20, 2, TakesOrRefuses("the source in a format of motion")},
     {kUYVY, kBGRA, 30, 20, 30, 20, 4, TakesOrRefuses("the source in a format of motion"), 1, 2, 2},
     {kBGRA, kBGRA, 30, 20, 40, 30, 5, TakesOrRefuses("the source in light, and tables of weights")},
+    {kPlanes, kBGRA, 64, 48, 30, 20, 4, TakesOrRefuses("the decoded image, and the blurred one")},
+    {kPlanes, PK_PixelFormat_VUYX_4444_8u, 64, 48, 32, 24, 2, TakesNone("decodes to the destination")},
+    {kBGRA, kPlanes, 30, 20, 64, 48, 2, TakesOrRefuses("the image to be encoded")},
     {PK_PixelFormat_NTSCDV50, kBGRA, 720, 480, 360, 240, 2, TakesOrRefuses("the decoded image"), 0, 0, 0,
      PK_ErrNotSupported},
     {kBGRA, PK_PixelFormat_NTSCDV50, 30, 20, 720, 480, 2, TakesOrRefuses("the image to be encoded"), 0, 0, 0,
@@ -71,8 +74,7 @@ void AddPlanes(Calls& calls) {
                          const int32_t rowBytes[3] = {kSide, kSide / 2, kSide / 2};
                          return PK_ScaleConvertPlanar(planes, rowBytes, kSide, kSide, kPlanes, 0, block,
                                                       4 * kSide, kSide, kSide, kBGRA, 0, 2);
-                     },
-                     PK_ErrNotSupported});
+                     }});
 }
 
 const Family sScalings(AddScalings);

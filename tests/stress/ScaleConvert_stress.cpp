@@ -27,6 +27,8 @@ constexpr Scaling kScalings[] = {
     {kBGRA, kUYVY, 61, 60, 50, 25, 2, 2},                        // one field, moved
     {kUYVY, kBGRA, 61, 30, 50, 70, 4},                           // converted before
     {kUYVY, kV210, 61, 70, 61, 70, 3, 1, 2},                     // to another field order
+    {kPlanes, kBGRA, 62, 70, 50, 40, 4},                         // decoded before
+    {kBGRA, kPlanes, 61, 70, 50, 40, 2},                         // encoded behind
     {kBGRA, kBGRA, 61, 70, 50, 40, 5},                           // in light
 };
 
@@ -47,6 +49,20 @@ std::function<bool()> PrepareScaleConvert() {
     return Repeat(calls);
 }
 
+std::function<bool()> PrepareScaleConvertPlanar() {
+    constexpr int32_t kWidth = 62, kHeight = 40;
+    PKTest::Random random(73);
+    return Repeat({{RandomImage(kBGRA, kWidth, kHeight, random),
+                    [y = random.Bytes(kWidth * kHeight), u = random.Bytes(kWidth * kHeight / 4),
+                     v = random.Bytes(kWidth * kHeight / 4)](uint8_t* image) {
+                        const void* const planes[3] = {y.data(), u.data(), v.data()};
+                        const int32_t rowBytes[3] = {kWidth, kWidth / 2, kWidth / 2};
+                        return PK_ScaleConvertPlanar(planes, rowBytes, kWidth, kHeight, kPlanes, 0, image,
+                                                     PK_PixelFormatRowBytes(kBGRA, kWidth), kWidth, kHeight,
+                                                     kBGRA, 0, 2);
+                    }}});
+}
+
 std::function<bool()> PrepareScaleConvertOneField() {
     constexpr int32_t kWidth = 61, kHeight = 70;
     PKTest::Random random(72);
@@ -63,6 +79,7 @@ std::function<bool()> PrepareScaleConvertOneField() {
 }
 
 const Operation sScaleConvert("scale-convert", PrepareScaleConvert);
+const Operation sScaleConvertPlanar("scale-convert-planar", PrepareScaleConvertPlanar);
 const Operation sScaleConvertOneField("scale-convert-one-field", PrepareScaleConvertOneField);
 
 } // namespace

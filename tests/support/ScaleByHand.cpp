@@ -102,8 +102,8 @@ PK_Result Move(const ScaleNumbers& call, const ScaleTelling& told, const ScaleMe
     if (told.destinationBuffer == 0)
         return motion(memory.destination, memory.destinationRowBytes, call.dstFormat);
     Buffer rendered(told.destinationBuffer, call.dstWidth, call.dstHeight);
-    PK_FillWithTransparentBlack(rendered.bytes.data(), rendered.rowBytes, call.dstWidth, call.dstHeight,
-                                told.destinationBuffer);
+    PK_FillWithOpaqueBlack(rendered.bytes.data(), rendered.rowBytes, call.dstWidth, call.dstHeight,
+                           told.destinationBuffer);
     motion(rendered.bytes.data(), rendered.rowBytes, told.destinationBuffer);
     return PK_Convert(rendered.bytes.data(), rendered.rowBytes, told.destinationBuffer, memory.destination,
                       memory.destinationRowBytes, call.dstFormat, call.dstWidth, call.dstHeight,
