@@ -24,8 +24,8 @@ constexpr size_t kBytes = 4 * static_cast<size_t>(kPixels), kHalfBytes = kBytes 
 
 // clang-format off: one row an operation
 const AddOperations add = {
-    {"Scaling of BGRP 8u to half the size, quality 2", kBytes, kHalfBytes, Samples::Bytes, Against::Nothing, 0,
-     Halve<kBGRP, kBGRP, 2>},
+    {"Scaling of BGRP 8u to half the size, quality 2", kBytes, kHalfBytes, Samples::Bytes, Against::Nothing,
+     0, Halve<kBGRP, kBGRP, 2>},
     {"Scaling of BGRA 8u to half the size, quality 2", kBytes, kHalfBytes, Samples::Bytes, Against::Nothing,
      0, Halve<kBGRA, kBGRA, 2>},
     {"Scaling of BGRA 8u to half the size, quality 3", kBytes, kHalfBytes, Samples::Bytes, Against::Nothing,
