@@ -37,6 +37,7 @@ PK_Result PK::DecompressYUV_420_8u(const void* const planes[3], const int32_t pl
                                     destinationFormat, destinationWidth, destinationHeight};
     const SourcePlanes source =
         PlanesOf<const uint8_t>(planes, planeRowBytes, sourceWidth, sourceHeight, Chroma::k420);
-    if (HasRowsThatOverlap(image) || std::ranges::any_of(source, HasUnreadableSamples<const uint8_t>)) return PK_ErrFailed;
+    if (HasRowsThatOverlap(image) || std::ranges::any_of(source, HasUnreadableSamples<const uint8_t>))
+        return PK_ErrFailed;
     return DecodePlanar420(source, sourceFormat, image, field, quality);
 }
