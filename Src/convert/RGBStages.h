@@ -23,13 +23,14 @@ struct OpaqueRGB {
     }
 };
 
-/// Straight alpha is multiplied in on the way.
+/// Straight alpha is multiplied in on the way, but for groups that have none to multiply in.
 template <const RGBToYUVMatrix& kMatrix>
 struct StraightRGB {
     static void Load(const uint8_t* source, YUVPixels& first, YUVPixels& second) {
         OpaqueRGB<kMatrix>::Load(source, first, second);
         const I32 firstAlpha = ShiftRight<24>(LoadInts(source));
         const I32 secondAlpha = ShiftRight<24>(LoadInts(source + 4 * kLanes));
+        if (!AnyNegative(Not(Equal(firstAlpha & secondAlpha, Ints(255))))) return;
         first.chroma = ScaleHalves<kChromaZeros>(first.chroma, InBothHalves(firstAlpha));
         second.chroma = ScaleHalves<kChromaZeros>(second.chroma, InBothHalves(secondAlpha));
 

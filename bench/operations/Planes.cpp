@@ -100,6 +100,13 @@ Run Encode(const uint8_t* source, uint8_t*) {
     };
 }
 
+/// As if alpha were ignored: other libraries do so.
+Run EncodeOpaque(const uint8_t* source, uint8_t* destination) {
+    const auto image = std::make_shared<std::vector<uint8_t>>(source, source + 4 * kCount);
+    for (size_t alpha = 3; alpha < image->size(); alpha += 4) (*image)[alpha] = 255;
+    return [image, encode = Encode<PK_PixelFormat_BGRA_4444_8u>(image->data(), destination)] { encode(); };
+}
+
 Run DecodeBlock(const uint8_t* source, uint8_t* destination) {
     const auto block = Block();
     std::copy_n(source, kPlanar, block->data());
@@ -161,7 +168,8 @@ const AddOperations add = {
      Decode<PK_PixelFormat_VUYX_4444_8u, 4>},
     {"I420 to UYVY", kPlanar, 2 * kCount, Samples::Bytes, Against::Peer, 0.95,
      Decode<PK_PixelFormat_UYVY_422_8u, 2>},
-    {"BGRA to I420", 4 * kCount, kPlanar, Samples::Bytes, Against::Peer, 0.95,
+    {"Opaque BGRA to I420", 4 * kCount, kPlanar, Samples::Bytes, Against::Peer, 0.95, EncodeOpaque},
+    {"BGRA to I420", 4 * kCount, kPlanar, Samples::Bytes, Against::Nothing, 0,
      Encode<PK_PixelFormat_BGRA_4444_8u>},
     {"BGRX to I420", 4 * kCount, kPlanar, Samples::Bytes, Against::Peer, 0.95,
      Encode<PK_PixelFormat_BGRX_4444_8u>},
