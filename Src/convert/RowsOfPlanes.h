@@ -62,7 +62,7 @@ public:
 private:
     /// A sample for each pair of columns, of which a last lone one counts as a pair.
     static size_t SamplesOfChroma(const SourcePlanes& planes) {
-        return static_cast<size_t>(planes[0].width / 2 + planes[0].width % 2);
+        return (static_cast<size_t>(planes[0].width) + 1) / 2;
     }
     static size_t BytesOfFloats(int32_t count) { return sizeof(float) * static_cast<size_t>(count); }
 
