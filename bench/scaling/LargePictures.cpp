@@ -45,20 +45,23 @@ std::array<double, 2 * kReach> SincWeights() {
 /// Halves the rows and turns columns to rows.
 std::vector<double> HalvedAndTurned(const std::vector<double>& samples, int32_t width, int32_t height) {
     static const std::array weights = SincWeights();
-    const int32_t half = width / 2;
-    std::vector<double> turned(samples.size() / 2);
+    const auto half = static_cast<size_t>(width) / 2;
+    std::vector<double> turned(samples.size() / 2), sums(half);
     std::vector<double> row(static_cast<size_t>(width + 2 * kReach));
+    std::vector<double> phases[2] = {std::vector<double>(row.size() / 2),
+                                     std::vector<double>(row.size() / 2)};
     for (int32_t y = 0; y < height; ++y) {
         const auto first = samples.begin() + static_cast<ptrdiff_t>(IndexOf(0, y, width));
         std::fill_n(row.begin(), kReach, *first);
         std::copy_n(first, width, row.begin() + kReach);
         std::fill_n(row.end() - kReach, kReach, first[width - 1]);
-        for (int32_t x = 0; x < half; ++x) {
-            double sum = 0;
-            for (int32_t i = 0; i < 2 * kReach; ++i)
-                sum += weights[static_cast<size_t>(i)] * row[static_cast<size_t>(2 * x + 1 + i)];
-            turned[IndexOf(y, x, height)] = sum;
+        for (size_t i = 0; i < row.size(); ++i) phases[i % 2][i / 2] = row[i];
+        std::ranges::fill(sums, 0.0);
+        for (size_t i = 0; i < weights.size(); ++i) { // place 2 x + 1 + i of the row
+            const double* const places = phases[(i + 1) % 2].data() + (i + 1) / 2;
+            for (size_t x = 0; x < half; ++x) sums[x] += weights[i] * places[x];
         }
+        for (size_t x = 0; x < half; ++x) turned[IndexOf(y, static_cast<int32_t>(x), height)] = sums[x];
     }
     return turned;
 }
@@ -95,13 +98,15 @@ tool::Frame LargePhotographs(const std::vector<std::string>& names) {
 
 Ideal IdealHalf(const tool::Frame& picture, bool isOfLight) {
     const double power = isOfLight ? kGamma : 1;
+    std::array<double, 256> values;
+    for (size_t code = 0; code < values.size(); ++code)
+        values[code] = std::pow(static_cast<double>(code) / kWhite, power);
     Ideal ideal;
     for (int32_t channel = 0; channel < 3; ++channel) {
         std::vector<double> samples(static_cast<size_t>(kLargeWidth) * kLargeHeight);
         for (int32_t y = 0; y < kLargeHeight; ++y)
             for (int32_t x = 0; x < kLargeWidth; ++x)
-                samples[IndexOf(x, y, kLargeWidth)] =
-                    std::pow(picture.Row(y)[4 * x + channel] / kWhite, power);
+                samples[IndexOf(x, y, kLargeWidth)] = values[picture.Row(y)[4 * x + channel]];
         samples =
             HalvedAndTurned(HalvedAndTurned(samples, kLargeWidth, kLargeHeight), kLargeHeight, kHalfWidth);
         for (double& sample : samples) sample = kWhite * std::pow(std::clamp(sample, 0.0, 1.0), 1 / power);

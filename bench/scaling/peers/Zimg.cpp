@@ -131,6 +131,8 @@ Reduction ReduceVideo(const tool::Frame& source) {
 }
 
 /// Colour alone: to light, which is then reduced and encoded again.
+/// \param kIsApproximate  whether curves may come from tables.
+template <bool kIsApproximate>
 Reduction ReduceLight(const tool::Frame& source) {
     constexpr int32_t kFloats = 4 * kLargeWidth;
     const auto coded = [](int32_t width, int32_t height) {
@@ -143,9 +145,10 @@ Reduction ReduceLight(const tool::Frame& source) {
     light.pixel_type = ZIMG_PIXEL_FLOAT;
     light.depth = 32;
     light.transfer_characteristics = ZIMG_TRANSFER_LINEAR;
-    constexpr auto kFilter = ZIMG_RESIZE_BICUBIC;
-    const auto decode = std::make_shared<Graph>(coded(kLargeWidth, kLargeHeight), light, Params<kFilter>());
-    const auto reduce = std::make_shared<Graph>(light, coded(kHalfWidth, kHalfHeight), Params<kFilter>());
+    zimg_graph_builder_params params = Params<ZIMG_RESIZE_BICUBIC>();
+    params.allow_approximate_gamma = kIsApproximate;
+    const auto decode = std::make_shared<Graph>(coded(kLargeWidth, kLargeHeight), light, params);
+    const auto reduce = std::make_shared<Graph>(light, coded(kHalfWidth, kHalfHeight), params);
     const auto floats = std::make_shared<Planes>(3, kFloats, kLargeHeight);
     return ReductionOf(source, [=](const Planes& from, const Planes& to) {
         decode->Process(InputOf(from), FrameBench::BufferOf<zimg_image_buffer>(*floats, kFloats));
@@ -157,7 +160,8 @@ Reduction ReduceLight(const tool::Frame& source) {
 const AddReducers add = {
     {kPixels, "zimg bilinear (planes)", ReducePixels<ZIMG_RESIZE_BILINEAR>},
     {kPixels, "zimg bicubic (planes)", ReducePixels<ZIMG_RESIZE_BICUBIC>},
-    {kPixels, "zimg bicubic, of light", ReduceLight},
+    {kPixels, "zimg bicubic, of light", ReduceLight<false>},
+    {kPixels, "zimg bicubic, of light, approximate", ReduceLight<true>, false},
     {kPairs, "zimg bilinear (planes)", ReduceVideo<ZIMG_RESIZE_BILINEAR>},
     {kPairs, "zimg bicubic (planes)", ReduceVideo<ZIMG_RESIZE_BICUBIC>},
     {kPlanes, "zimg bilinear (planes)", ReduceVideo<ZIMG_RESIZE_BILINEAR>},
