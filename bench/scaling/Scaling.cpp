@@ -1,11 +1,12 @@
 // Measures and draws what scaling does to charts and photographs, ours and that of the libraries that this build found:
-// tables in Markdown on standard output, and pictures in a folder.
+// tables in Markdown on standard output, and pictures in a folder. What is timed is meant to run on one processor.
 //
 //   pixelkiln_scaling FOLDER PHOTOGRAPH.png...
 
 #include "Charts.h"
 #include "Measures.h"
 #include "Pictures.h"
+#include "Reductions.h"
 #include "Scaler.h"
 
 #include "Numbers.h"
@@ -83,6 +84,7 @@ void Run(const std::string& folder, const std::vector<std::string>& names) {
     for (const std::string& name : names) photographs.push_back(Photograph(name));
     for (const double scale : kScales) PrintTable(scale, photographs);
     PrintRows();
+    MeasureAndDrawReductions(names, folder + "/scaling-4k.png");
     DrawPlates(kScales, folder + "/scaling-plates.png");
     DrawEdges(kScales, folder + "/scaling-edges.png");
 }
