@@ -22,6 +22,12 @@ constexpr bool HasChromaBetween(PK_PixelFormat format) {
 struct ChromaRows {
     int32_t first, second;
     ChromaWeights weights;
+
+    /// The nearer of both alone.
+    ChromaRows Nearest() const {
+        const int32_t row = weights.first < weights.second ? second : first;
+        return {row, row, weights};
+    }
 };
 
 /// The chroma of a frame, or of the field that a luma row belongs to. Beyond either end its outermost row is repeated. A

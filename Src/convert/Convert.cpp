@@ -8,6 +8,7 @@
 #include "convert/WorkingRows.h"
 #include "frame/Arguments.h"
 #include "frame/FloatMode.h"
+#include "frame/Planes.h"
 #include "frame/TransientMemory.h"
 
 namespace PK {
@@ -57,6 +58,8 @@ std::optional<PK_Result> ResultOfStream(PK_PixelFormat stream, const SourceImage
                                         const DestinationImage& destination) {
     if (source.width < 0 || source.height < 0) return PK_ErrFailed;
     if (Is420Planar(stream) && (source.width == 0 || source.height == 0)) return PK_Success;
+    for (const PK_PixelFormat format : {source.format, destination.format})
+        if (Is420Planar(format) && !HavePlanesOffsets(source.width, source.height)) return PK_ErrFailed;
     if (HasNull({source.pixels, destination.pixels})) return PK_ErrFailed;
     return std::nullopt;
 }

@@ -1,6 +1,7 @@
 // Planar 4:2:0 to raster images: which rows of the planes a row of the destination takes, which kernel makes pixels of
 // them, and the chain from these to the destination.
 
+#include "convert/BridgeKernels.h"
 #include "convert/Planar420.h"
 #include "convert/RowsOfPlanes.h"
 
@@ -37,14 +38,17 @@ DecodedRow DecimatedRow(PK_PixelFormat source, int32_t step) {
             OfMatrix(PK_PixelFormat_VUYA_4444_8u, source)};
 }
 
-DecodedRow WidenedRow(PK_PixelFormat source, PK_PixelFormat destination) {
+/// Of BT.709 all 4:2:2 goes by one format.
+DecodedRow WidenedRow(PK_PixelFormat source, PK_PixelFormat destination, UseOfPlanes& use) {
     const auto& kernels = Best<PlanarWidenKernels>();
-    const bool is601 = IsMatrix601(source);
+    const bool is601 = IsMatrix601(source), to601 = IsMatrix601(destination);
     if (!IsYUV(destination))
         return {is601 ? kernels.toBGRX601 : kernels.toBGRX709, PK_PixelFormat_BGRX_4444_8u};
     if (IsPacked4444(destination)) return {kernels.toVUYX, OfMatrix(PK_PixelFormat_VUYX_4444_8u, source)};
-    if (is601 && IsMatrix601(destination)) return {kernels.toUYVY, PK_PixelFormat_UYVY_422_8u};
-    return {is601 ? kernels.toUYVY601To709 : kernels.toUYVY, PK_PixelFormat_UYVY_422_8u_709};
+    use.changesMatrix = is601 && !to601;
+    use.packsWords = is601 && IsV210(destination);
+    if (use.packsWords) return {Best<W210Kernels>().toV210, destination};
+    return {kernels.toUYVY, is601 && to601 ? PK_PixelFormat_UYVY_422_8u : PK_PixelFormat_UYVY_422_8u_709};
 }
 
 constexpr bool DiffersInAlphaAlone(PK_PixelFormat a, PK_PixelFormat b) {
@@ -83,7 +87,7 @@ PK_Result DecodePlan::Build(const DecodeTarget& source, const DecodeTarget& targ
     if (isFull || isHalf) {
         fUse.widening = WideningOf(source.width, target.width);
         if (fUse.widening != Widening::None) {
-            fRow = WidenedRow(source.format, target.format);
+            fRow = WidenedRow(source.format, target.format, fUse);
             return Finish(DiffersInAlphaAlone(fRow.format, target.format) ? fRow.format : target.format,
                           quality);
         }
@@ -126,8 +130,11 @@ PK_Result DecodePlan::Run(const SourcePlanes& planes, const DestinationImage& de
         const RowSink sink(destination, onward, rows);
         uint8_t* const decoded = fChain.IsCopy() ? nullptr : rows.Take(BytesOfRow(fRow.format, width));
         RowsOfPlanes source(fUse, planes, width, rows);
+        const int32_t rowsInTurns =
+            fUse.isFieldPicture && fRowStep == 1 ? 2 : 1; // of one field and the other
         for (int32_t row = 0; row < destination.height; ++row) {
-            const PlaneRows rowsOfPlanes = source.Fetch(LumaRow(row));
+            const PlaneRows rowsOfPlanes =
+                source.Fetch(LumaRow(row), row + rowsInTurns >= destination.height);
             uint8_t* const target = sink.Row(row);
             fRow.kernel(rowsOfPlanes, decoded != nullptr ? decoded : target, width);
             if (decoded != nullptr) fChain.ConvertRow(decoded, target, width, rows.Scratch());

@@ -15,7 +15,7 @@ struct PixelRows {
     int32_t first, second;
 };
 
-/// Of fields, the rows of one of them within a group of four. In a last group that has less, a row stands alone.
+/// Of fields, the rows of one of them within a group of four. In a last group that has less, its first row stands alone.
 PixelRows RowsOfChroma(bool isFieldPicture, int32_t chromaRow, int32_t height) {
     if (!isFieldPicture) return {2 * chromaRow, 2 * chromaRow + 1};
     const int32_t group = chromaRow / 2 * 4;
@@ -23,9 +23,15 @@ PixelRows RowsOfChroma(bool isFieldPicture, int32_t chromaRow, int32_t height) {
     return {first, group + 4 <= height ? first + 2 : first};
 }
 
+/// A last group of fields that has less than four rows makes one row of chroma, of a lone row too: in a block there is room
+/// for it.
+int32_t ChromaRowsOf(bool isFieldPicture, int32_t height) {
+    return isFieldPicture ? height / 4 * 2 + (height % 4 != 0 ? 1 : 0) : height / 2;
+}
+
 /// Rows of fields from here on give luma alone.
 int32_t FirstRowWithoutChroma(int32_t height) {
-    return height / 4 * 4 + height % 4 / 2;
+    return height / 4 * 4 + (height % 4 != 0 ? 1 : 0);
 }
 
 /// A format that rows are encoded from.
@@ -99,7 +105,7 @@ PK_Result EncodePlanar420(const SourceImage& source, PK_PixelFormat format,
         const RowSource pixels(source, chain, rows);
         const RowEncoder encoder(pixels, working.kernel, destination, rows.Take(bytesOfSums),
                                  rows.Take(bytesOfSums));
-        for (int32_t row = 0; row < destination[1].height; ++row)
+        for (int32_t row = 0; row < ChromaRowsOf(isFieldPicture, source.height); ++row)
             encoder.Chroma(row, RowsOfChroma(isFieldPicture, row, source.height));
         if (isFieldPicture)
             for (int32_t row = FirstRowWithoutChroma(source.height); row < source.height; ++row)

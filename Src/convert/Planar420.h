@@ -38,10 +38,11 @@ PK_Result DecodePlanar420Through(const ConversionChain& onward, const SourcePlan
                                  PK_PixelFormat format, const DestinationImage& destination, int32_t field,
                                  int32_t quality);
 
-/// Encodes a raster image. Frame pictures are encoded to an even height. What has no chroma of its own, the last row of an
-/// odd height and the last column of an odd width, gives its luma alone.
-/// \param source  walked from the top of the picture; at least a pixel.
-/// \param format  that of the destination.
+/// Encodes a raster image. Frame pictures are encoded to an even height. The last column of an odd width gives its luma
+/// alone, and so do rows of fields but the first in a last group of less than four.
+/// \param source       walked from the top of the picture; at least a pixel.
+/// \param format       that of the destination.
+/// \param destination  planes of a block: of fields one row of chroma may lie behind half of the height.
 /// \return PK_Success, or PK_ErrOutOfMemory where rows find no memory: nothing is written then.
 PK_Result EncodePlanar420(const SourceImage& source, PK_PixelFormat format,
                           const DestinationPlanes& destination, int32_t quality);

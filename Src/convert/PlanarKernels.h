@@ -34,7 +34,8 @@ struct PlanarDecodeKernels {
     static const PlanarDecodeKernels& For(); // PlanarDecode.kernels.cpp
 };
 
-/// Rows that get wider on the way: each plane to floats in the range of bytes, then these to pixels.
+/// Rows that get wider on the way: each plane to floats in the range of bytes, these if need be to another matrix, and then
+/// to pixels.
 struct PlanarWidenKernels {
     /// Of two samples a, (a + b) >> 1, b; the width counts what comes out.
     RowKernel by3To2;
@@ -42,9 +43,15 @@ struct PlanarWidenKernels {
     /// Of three samples a, (a + 2 b) x 0.33333334, (2 b + c) x 0.33333334, c.
     RowKernel by4To3;
 
-    /// Rounded to nearest, by the current mode, chroma serving two pixels; as they stand or through a matrix first.
-    PlanesRow toUYVY, toUYVY601To709;
-    PlanesRow toVUYX;
+    /// From the matrix of BT.601 to that of BT.709: Y of Y, U and V, and U and V of both.
+    PlanesRow lumaTo709;
+    TwoRowKernel uTo709, vTo709;
+
+    /// Four times a sample, rounded to nearest, in words: codes of 10 bits.
+    RowKernel toWords;
+
+    /// Rounded to nearest, by the current mode, chroma serving two pixels; to RGB through a matrix.
+    PlanesRow toUYVY, toVUYX;
     PlanesRow toBGRX601, toBGRX709;
 
     static constexpr const char* kFamily = "PlanarWiden";

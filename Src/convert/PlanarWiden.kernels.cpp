@@ -61,33 +61,49 @@ inline FloatPairs LoadFloatPairs(const uint8_t* luma, const uint8_t* u, const ui
     return {FromBits(even), FromBits(odd), LoadFloats(u), LoadFloats(v)};
 }
 
-template <const YUVToYUVMatrix& kMatrix>
-inline FloatPairs Convert(FloatPairs pairs) {
-    const Channels even = RemoveOffsets({pairs.v, pairs.u, pairs.y0, pairs.y0});
-    const Channels odd = {even.c0, even.c1, pairs.y1 - Floats(16), even.c3};
-    const Channels first = AddOffsets(YUVToYUV<kMatrix>(even));
-    const Channels second = AddOffsets(YUVToYUV<kMatrix>(odd));
-    return {first.c2, second.c2, first.c1, first.c0};
-}
-
-inline void StoreUYVY(uint8_t* destination, FloatPairs pairs) {
-    Store(destination,
-          PackByteChannels(Nearest(pairs.u), Nearest(pairs.y0), Nearest(pairs.v), Nearest(pairs.y1)));
-}
-
 /// A luma each pixel and a chroma each pair. A lone last pixel stands for both of its pair.
 template <class Destination>
 using FromFloatPlanes = Groups<2 * kLanes, Destination, LastRepeated<Each<4>>, Each<4, 2>, Each<4, 2>>;
 
 struct ToUYVY : FromFloatPlanes<Each<4, 2>> {
     static void Group(const uint8_t* luma, const uint8_t* u, const uint8_t* v, uint8_t* destination) {
-        StoreUYVY(destination, LoadFloatPairs(luma, u, v));
+        const FloatPairs pairs = LoadFloatPairs(luma, u, v);
+        Store(destination,
+              PackByteChannels(Nearest(pairs.u), Nearest(pairs.y0), Nearest(pairs.v), Nearest(pairs.y1)));
     }
 };
 
-struct ToUYVY601To709 : FromFloatPlanes<Each<4, 2>> {
+/// V, U and Y of BT.601 to those of BT.709.
+inline Channels To709(F32 v, F32 u, F32 y) {
+    return AddOffsets(YUVToYUV<kYUV601To709>(RemoveOffsets({v, u, y, y})));
+}
+
+struct LumaTo709 : Groups<2 * kLanes, Each<4>, Each<4>, Each<4, 2>, Each<4, 2>> {
     static void Group(const uint8_t* luma, const uint8_t* u, const uint8_t* v, uint8_t* destination) {
-        StoreUYVY(destination, Convert<kYUV601To709>(LoadFloatPairs(luma, u, v)));
+        const FloatPairs pairs = LoadFloatPairs(luma, u, v);
+        StoreLanePairs(destination, Bits(To709(pairs.v, pairs.u, pairs.y0).c2),
+                       Bits(To709(pairs.v, pairs.u, pairs.y1).c2));
+    }
+};
+
+template <bool kIsV>
+struct ChromaTo709 : Groups<kLanes, Each<4>, Each<4>, Each<4>> {
+    static void Group(const uint8_t* u, const uint8_t* v, uint8_t* destination) {
+        const F32 cv = LoadFloats(v), cu = LoadFloats(u);
+        const Channels chroma = To709(cv, cu, cu);
+        Store(destination, kIsV ? chroma.c0 : chroma.c1);
+    }
+};
+
+/// Codes of 10 bits.
+struct ToWords : Groups<2 * kLanes, Each<2>, Each<4>> {
+    static I32 Codes(const uint8_t* source) {
+        const I32 codes = Nearest(Floats(4) * LoadFloats(source));
+        return Max(Min(codes, Ints(1023)), Ints(0));
+    }
+
+    static void Group(const uint8_t* source, uint8_t* destination) {
+        Store(destination, PackLanesToHalves(Codes(source), Codes(source + 4 * kLanes)));
     }
 };
 
@@ -121,8 +137,11 @@ const PK::PlanarWidenKernels& PK::PlanarWidenKernels::For<PK::Target::PK_TARGET>
     static constexpr PlanarWidenKernels kernels = {
         .by3To2 = Row<By3To2>,
         .by4To3 = Row<By4To3>,
+        .lumaTo709 = ThreePlanes<LumaTo709>,
+        .uTo709 = TwoRows<ChromaTo709<false>>,
+        .vTo709 = TwoRows<ChromaTo709<true>>,
+        .toWords = Row<ToWords>,
         .toUYVY = ThreePlanes<ToUYVY>,
-        .toUYVY601To709 = ThreePlanes<ToUYVY601To709>,
         .toVUYX = ThreePlanes<ToVUYX>,
         .toBGRX601 = ThreePlanes<ToBGRX<kYUV8ToRGB8_601>>,
         .toBGRX709 = ThreePlanes<ToBGRX<kYUV8ToRGB8_709>>,

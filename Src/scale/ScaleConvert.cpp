@@ -3,6 +3,7 @@
 #include <PixelKiln/ScaleConvert.h>
 
 #include "frame/FloatMode.h"
+#include "frame/Planes.h"
 #include "scale/ScaleArguments.h"
 #include "scale/ScaleRun.h"
 
@@ -15,7 +16,10 @@ std::optional<PK_Result> ResultWithoutScaling(const ScaleCall& call) {
     if (IsConversionAlone(call)) return std::nullopt;
     if (!IsScalable(from.format)) return PK_ErrBadSrcFormat;
     if (!IsScalable(to.format)) return PK_ErrBadDstFormat;
-    return ResultOfSizes(from.width, from.height, to.width, to.height);
+    if (const auto result = ResultOfSizes(from.width, from.height, to.width, to.height)) return result;
+    for (const ScaleImage& image : {from, to})
+        if (Is420Planar(image.format) && !HavePlanesOffsets(image.width, image.height)) return PK_ErrFailed;
+    return std::nullopt;
 }
 
 } // namespace

@@ -20,8 +20,9 @@ extern "C" {
 /// Planar 4:2:0 is one block as PK_GetPlanarBuffers lays it out. It is decoded as PK::DecompressYUV_420_8u does, to
 /// VUYX_4444_8u of the destination's matrix if that is 8-bit YUV, else of its own, and goes on from there as any image of
 /// that format. To encode it, rows are taken to VUYP_4444_8u of its matrix; each sample of chroma is the sum of two
-/// rows, of one field where it has field pictures, weighed 1-2-1 about the even pixel, over 8, rounded down. Of two rows
-/// of frame pictures: an odd height loses its last row. Formats of the full range go through BGRX_4444_8u, by the matrix
+/// rows, of one field where it has field pictures, weighed 1-2-1 about the even pixel, over 8, rounded down. Frame
+/// pictures lose the last row of an odd height; of field pictures, rows behind the last whole four make one row of chroma,
+/// of the first of them, which for a lone one lies behind half of the height. Formats of the full range go through BGRX_4444_8u, by the matrix
 /// of video range. Bytes of the block beside the samples stay.
 ///
 /// Origin: the picture keeps its sense. Between a format that is stored bottom-up and one that is stored

@@ -46,7 +46,8 @@ namespace PK {
 /// Sizes. With w x h the size of the source and / rounding down, the first that applies:
 ///  - width 4 w / 3 of a w that is a multiple of 96, or 3 w / 2 of a multiple of 16, and height h or h / 2, with SSE2:
 ///    rows get wider. Of three samples a, b, c come a, (a + 2 b) / 3, (2 b + c) / 3, c; of two come a, (a + b) >> 1, b, in
-///    each plane alone. Samples are rounded by the current mode. Chroma serves two pixels and two rows;
+///    each plane alone. Samples are rounded by the current mode, of BT.601 on their way to V210 to 10 bits. Chroma serves
+///    two pixels and two rows;
 ///  - width w and height h: all of it, chroma interpolated between its rows and columns;
 ///  - width w and height h / 2: one field, with chroma interpolated between the rows of that field; of frame pictures
 ///    every second row, chroma as it stands in rows;
@@ -56,7 +57,8 @@ namespace PK {
 /// Rows of chroma. Those of frame pictures lie half-way between two rows of luma: (3 a + b + 2) >> 2 and
 /// (a + 3 b + 2) >> 2 between rows a and b. Those of field pictures, which alternate between the fields as luma does,
 /// give (5 a + 3 b + 4) >> 3 and (a + 7 b + 4) >> 3 in the field of row 0, (7 a + b + 4) >> 3 and (3 a + 5 b + 4) >> 3 in
-/// the other. Beyond the first and the last row of chroma these stand; a field without a row has those of the other.
+/// the other. The first and the last row of a frame, or of a field, have the nearest row of chroma as it stands; a field
+/// without a row of chroma has those of the other.
 ///
 /// Columns of chroma. Under MPEG2 siting they lie on the even pixels: c[k] and (c[k] + c[k + 1] + 1) >> 1. Under MPEG4
 /// siting between the two: (c[k - 1] + 3 c[k] + 2) >> 2 and (3 c[k] + c[k + 1] + 2) >> 2. So a VUYX_4444_8u destination

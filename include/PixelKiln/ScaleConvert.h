@@ -76,7 +76,7 @@ extern "C" {
 ///  - What decoder, encoder, PK_Convert or PK_Motion return.
 ///
 /// Arguments are checked in this order, before memory is touched, and without memory for an image in between nothing is
-/// written.
+/// written; but for the second field of an interlaced destination, as PK_Motion tells.
 PK_API PK_Result PK_ScaleConvert(const void* src, int32_t srcRowBytes, int32_t srcWidth, int32_t srcHeight,
                                  PK_PixelFormat srcFormat, int32_t srcField, void* dst, int32_t dstRowBytes,
                                  int32_t dstWidth, int32_t dstHeight, PK_PixelFormat dstFormat,

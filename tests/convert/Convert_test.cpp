@@ -212,6 +212,18 @@ TEST(ConvertArguments, ImpossibleWidthsAndNullPointersAreRefused) {
               PK_ErrFailed);
 }
 
+TEST(ConvertArguments, PlanesWithoutPlacesIn32BitsAreRefused) {
+    const PK_PixelFormat planes = PK_PixelFormat_YUV_420_MPEG2_FRAME;
+    for (const PK_PixelFormat other : {kBGRA, PK_PixelFormat_YUV_420_MPEG2_FRAME_709}) {
+        EXPECT_EQ(
+            Refuse({.sourceFormat = planes, .destinationFormat = other, .width = 64, .height = 1 << 24}),
+            PK_ErrFailed);
+        EXPECT_EQ(
+            Refuse({.sourceFormat = other, .destinationFormat = planes, .width = 64, .height = 1 << 24}),
+            PK_ErrFailed);
+    }
+}
+
 TEST(ConvertArguments, RowBytesOfTheLowestValueAreNegatedSafely) {
     // One row: the row bytes are negated for the way from the bottom up, but lead nowhere.
     const uint8_t source[4] = {1, 2, 3, 4};

@@ -8,6 +8,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
 #include <vector>
 
 namespace {
@@ -192,6 +193,29 @@ TEST(Planar420, FourSamplesOfThree) {
     for (size_t i = 0; i < 96; ++i) picture.y[i] = static_cast<uint8_t>(i);
     picture.y[1] = 200;
     ExpectWider(picture, 128, 0, {0, 133, 134, 2, 3, 4, 4, 5});
+}
+
+TEST(Planar420, WiderRowsOf601KeepTheirFractionsInTenBits) {
+    Picture picture(PK_PixelFormat_YUV_420_MPEG2_FRAME, 96, 2);
+    for (size_t i = 0; i < picture.y.size(); ++i) picture.y[i] = i % 3 == 1 ? 101 : 100;
+    PKTest::AtEveryTarget([&] {
+        if (!PK::IsEnabled(PK::Target::sse2)) return;
+        Bytes pixels(static_cast<size_t>(PK_PixelFormatPackedRowBytes(PK_PixelFormat_V210_422_10u, 128)));
+        ASSERT_EQ(picture.Decode(pixels, 128, 1, PK_PixelFormat_V210_422_10u, 0, 2), PK_Success);
+        uint32_t words[2];
+        std::memcpy(words, pixels.data(), sizeof words);
+        EXPECT_EQ(words[0], 360u | 400u << 10 | 440u << 20);
+        EXPECT_EQ(words[1], 403u | 360u << 10 | 403u << 20);
+    });
+}
+
+TEST(Planar420, TheLastRowOfAFieldHasTheNearestChromaAsItStands) {
+    Picture picture(PK_PixelFormat_YUV_420_MPEG2_FIELD, 2,
+                    6); // rows 0, 2 and 4 of luma have rows 0 and 2 of chroma
+    picture.u = {0, 9, 80};
+    EXPECT_EQ(Decoded(picture, 2, 6, PK_PixelFormat_UYVY_422_8u, 0, kPairBytes, 0),
+              (Bytes{0, 9, 30, 9, 80, 9}));
+    EXPECT_EQ(Decoded(picture, 2, 3, PK_PixelFormat_UYVY_422_8u, 1, kPairBytes, 0), (Bytes{0, 30, 80}));
 }
 
 TEST(Planar420, WideningWantsSSE2) {

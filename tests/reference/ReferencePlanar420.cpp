@@ -1,5 +1,7 @@
 #include "reference/ReferencePlanar420.h"
 
+#include "reference/ReferenceBridges.h"
+
 #include <algorithm>
 #include <cmath>
 #include <string>
@@ -56,6 +58,7 @@ Samples DoubleRows(const Samples& chroma, size_t height, Between kind) {
     }
     while (out.size() < height) out.push_back(chroma.back());
     out.resize(height);
+    out.back() = chroma[std::min(height / 2, chroma.size() - 1)]; // as it stands
     return out;
 }
 
@@ -64,9 +67,8 @@ Samples DoubleRowsOfField(const Samples& chroma, size_t rowsOfField, bool isOdd)
     return DoubleRows(own, rowsOfField, isOdd ? Between::OddField : Between::EvenField);
 }
 
-/// Chroma of the picture's full height; grey where it has none.
-Samples FullHeight(const PlanarPicture& picture, int plane) {
-    const auto height = static_cast<size_t>(picture.height);
+/// Chroma for so many rows of the picture or of a field; grey where it has none.
+Samples FullHeight(const PlanarPicture& picture, int plane, size_t height, int32_t field) {
     const Samples& chroma = picture.planes[plane];
     if (chroma.empty() || chroma[0].empty())
         return Samples(height, Row(static_cast<size_t>(picture.width + 1) / 2, 128));
@@ -74,6 +76,7 @@ Samples FullHeight(const PlanarPicture& picture, int plane) {
     if (picture.width % 2 == 1)
         for (Row& row : complete) row.push_back(row.back());
     if (!IsField(picture.format)) return DoubleRows(complete, height, Between::Frame);
+    if (field != 0) return DoubleRowsOfField(complete, height, field == 2);
     const Samples even = DoubleRowsOfField(complete, (height + 1) / 2, false);
     const Samples odd = DoubleRowsOfField(complete, height / 2, true);
     Samples out;
@@ -150,21 +153,33 @@ uint8_t Code(float value) {
 
 using Floats = std::vector<float>;
 
-Row WidenedUYVY(const Floats& y, const Floats& u, const Floats& v, bool changesMatrix) {
-    Row out;
-    for (size_t i = 0; i < y.size(); i += 2) {
-        float cu = u[i / 2], cv = v[i / 2], y0 = y[i], y1 = y[i + 1];
-        if (changesMatrix) {
-            const float du = cu - 128, dv = cv - 128;
-            const auto luma = [&](float x) { return x - 16 - 0.11554975f * du - 0.20793764f * dv + 16; };
-            y0 = luma(y0);
-            y1 = luma(y1);
-            cu = 1.01863968f * du + 0.11461795f * dv + 128;
-            cv = 0.07504945f * du + 1.02532709f * dv + 128;
-        }
-        out.insert(out.end(), {Code(cu), Code(y0), Code(cv), Code(y1)});
+void To709(Floats& y, Floats& u, Floats& v) {
+    for (size_t i = 0; i < y.size(); ++i) {
+        const float du = u[i / 2] - 128, dv = v[i / 2] - 128;
+        y[i] = y[i] - 16 - 0.11554975f * du - 0.20793764f * dv + 16;
     }
+    for (size_t k = 0; k < u.size(); ++k) {
+        const float du = u[k] - 128, dv = v[k] - 128;
+        u[k] = 1.01863968f * du + 0.11461795f * dv + 128;
+        v[k] = 0.07504945f * du + 1.02532709f * dv + 128;
+    }
+}
+
+Row WidenedUYVY(const Floats& y, const Floats& u, const Floats& v) {
+    Row out;
+    for (size_t i = 0; i < y.size(); i += 2)
+        out.insert(out.end(), {Code(u[i / 2]), Code(y[i]), Code(v[i / 2]), Code(y[i + 1])});
     return out;
+}
+
+Row WidenedV210(const Floats& y, const Floats& u, const Floats& v) {
+    const auto codes = [](const Floats& samples) {
+        std::vector<uint32_t> out;
+        for (const float sample : samples)
+            out.push_back(static_cast<uint32_t>(std::clamp(std::nearbyint(4 * sample), 0.0f, 1023.0f)));
+        return out;
+    };
+    return ReferencePlanarToV210({codes(y), codes(u), codes(v)}, static_cast<int>(y.size()));
 }
 
 Row WidenedVUYX(const Floats& y, const Floats& u, const Floats& v) {
@@ -200,13 +215,17 @@ DecodedPicture ReferenceFullWidth(const PlanarPicture& picture, int32_t height, 
     const bool is444 = destination == vuyx;
     DecodedPicture out = {
         is444 ? vuyx : Pick(picture.format, PK_PixelFormat_UYVY_422_8u, PK_PixelFormat_UYVY_422_8u_709), {}};
-    const Samples full[2] = {FullHeight(picture, 1), FullHeight(picture, 2)};
+    const bool isFull = height == picture.height;
+    const auto doubled = [&](int plane) {
+        return FullHeight(picture, plane, static_cast<size_t>(height), isFull ? 0 : std::max(field, 1));
+    };
+    const Samples full[2] = {doubled(1), doubled(2)};
     for (int32_t row = 0; row < height; ++row) {
-        const int32_t luma = height == picture.height ? row : 2 * row + FirstRowOf(field);
-        const bool asItStands = height != picture.height && !IsField(picture.format);
+        const int32_t luma = isFull ? row : 2 * row + FirstRowOf(field);
+        const bool asItStands = !isFull && !IsField(picture.format);
         const auto chroma = [&](int plane) {
             return asItStands ? SharedChroma(picture, plane, luma)
-                              : full[plane - 1][static_cast<size_t>(luma)];
+                              : full[plane - 1][static_cast<size_t>(row)];
         };
         const Row& y = picture.planes[0][static_cast<size_t>(luma)];
         const bool isBetween = Names(picture.format, "MPEG4");
@@ -239,18 +258,26 @@ DecodedPicture ReferenceWidened(const PlanarPicture& picture, int32_t width, int
                to4444 = (destination & 0x3c) != 0 && (destination & 0x30) == 0;
     const bool to709 = (destination & 0x600) != 0, from709 = Is709(picture.format);
     DecodedPicture out = {};
-    out.format = toRGB    ? PK_PixelFormat_BGRX_4444_8u
-                 : to4444 ? Pick(picture.format, PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_VUYX_4444_8u_709)
-                 : !from709 && !to709 ? PK_PixelFormat_UYVY_422_8u
-                                      : PK_PixelFormat_UYVY_422_8u_709;
+    const bool toV210 = !from709 && (destination == PK_PixelFormat_V210_422_10u ||
+                                     destination == PK_PixelFormat_V210_422_10u_709);
+    if (toRGB)
+        out.format = PK_PixelFormat_BGRX_4444_8u;
+    else if (to4444)
+        out.format = Pick(picture.format, PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_VUYX_4444_8u_709);
+    else if (toV210)
+        out.format = destination;
+    else
+        out.format = from709 || to709 ? PK_PixelFormat_UYVY_422_8u_709 : PK_PixelFormat_UYVY_422_8u;
     for (int32_t row = 0; row < height; ++row) {
         const int32_t luma = height == picture.height ? row : 2 * row + FirstRowOf(field);
-        const Floats y = Widen(picture.planes[0][static_cast<size_t>(luma)], byThirds);
-        const Floats u = Widen(SharedChroma(picture, 1, luma), byThirds);
-        const Floats v = Widen(SharedChroma(picture, 2, luma), byThirds);
+        Floats y = Widen(picture.planes[0][static_cast<size_t>(luma)], byThirds);
+        Floats u = Widen(SharedChroma(picture, 1, luma), byThirds);
+        Floats v = Widen(SharedChroma(picture, 2, luma), byThirds);
+        if (!toRGB && !to4444 && !from709 && to709) To709(y, u, v);
         out.rows.push_back(toRGB    ? WidenedBGRX(y, u, v, from709)
                            : to4444 ? WidenedVUYX(y, u, v)
-                                    : WidenedUYVY(y, u, v, !from709 && to709));
+                           : toV210 ? WidenedV210(y, u, v)
+                                    : WidenedUYVY(y, u, v));
     }
     return out;
 }
@@ -286,7 +313,7 @@ PlanarPicture ReferenceEncoded(const Samples& pixels, PK_PixelFormat format, int
             if (row + 4 <= height) {
                 add(row, row + 2);
                 add(row + 1, row + 3);
-            } else if (row + 2 <= height) {
+            } else {
                 add(row, row);
             }
         }

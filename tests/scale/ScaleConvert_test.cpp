@@ -162,6 +162,9 @@ TEST(ScaleConvert, RefusesWhatCannotBeAnImage) {
     EXPECT_EQ(scale(2, 2, kBGRA, 3, -1, kBGRA), PK_ErrFailed);
     EXPECT_EQ(scale(INT32_MIN, 2, kBGRA, 3, 1, kBGRA), PK_ErrFailed);
     EXPECT_EQ(scale(INT32_MAX, 2, kBGRA, 3, 1, kBGRA), PK_ErrFailed);
+    // Planes whose places 32 bits cannot tell.
+    EXPECT_EQ(scale(64, 1 << 24, PK_PixelFormat_YUV_420_MPEG2_FRAME, 3, 1, kBGRA), PK_ErrFailed);
+    EXPECT_EQ(scale(3, 1, kBGRA, 64, 1 << 24, PK_PixelFormat_YUV_420_MPEG2_FRAME), PK_ErrFailed);
     EXPECT_EQ(scale(3, 1, kBGRA, INT32_MAX, 1, kBGRA), PK_ErrFailed);
     EXPECT_EQ(scale(-1, 1, kPlanes, 3, 1, kBGRA), PK_ErrFailed);
     EXPECT_EQ(scale(0, 0, kBGRA, 2, 1, kBGRA), PK_Success) << "nothing is drawn";

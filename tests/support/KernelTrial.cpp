@@ -442,7 +442,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"W210", PlanesTrial<1>},
     {"PlanarDecode", TwoRowTrialWith<ChromaWeights, DrawWeights>, "Blend"},
     {"PlanarDecode", PlanesTrial<1>},
-    {"PlanarWiden", PlanesTrial<1>, "Float"},
+    {"PlanarWiden", PlanesTrial<1>, "FloatPlanes"},
     {"PlanarEncode", EncodeTrial, "PixelsToPlanes"},
     {"NV12", PartPairsTrial, "PartPairs"},
     {"QuarterScale", InterleaveTrial, "Interleave"},
