@@ -52,12 +52,16 @@ PK_Result ConvertToRaster(const SourceImage& source, const DestinationImage& des
 
 PK_Result Convert(const SourceImage& source, const DestinationImage& destination, int32_t quality);
 
-/// The result for a stream that cannot be read or written, or for planes without a sample. Streams of DV have a size of
-/// their own.
-std::optional<PK_Result> ResultOfStream(PK_PixelFormat stream, const SourceImage& source,
-                                        const DestinationImage& destination) {
+/// A frame of DV has a size of its own, and so no empty picture.
+constexpr bool CanBeEmpty(PK_PixelFormat format) {
+    return !IsStream(format) || Is420Planar(format);
+}
+
+/// The result where a stream cannot be read or written, or there are planes without a sample.
+std::optional<PK_Result> ResultOfStream(const SourceImage& source, const DestinationImage& destination) {
     if (source.width < 0 || source.height < 0) return PK_ErrFailed;
-    if (Is420Planar(stream) && (source.width == 0 || source.height == 0)) return PK_Success;
+    const bool isEmpty = source.width == 0 || source.height == 0;
+    if (isEmpty && CanBeEmpty(source.format) && CanBeEmpty(destination.format)) return PK_Success;
     for (const PK_PixelFormat format : {source.format, destination.format})
         if (Is420Planar(format) && !HavePlanesOffsets(source.width, source.height)) return PK_ErrFailed;
     if (HasNull({source.pixels, destination.pixels})) return PK_ErrFailed;
@@ -65,7 +69,7 @@ std::optional<PK_Result> ResultOfStream(PK_PixelFormat stream, const SourceImage
 }
 
 PK_Result ConvertToStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
-    if (const auto result = ResultOfStream(destination.format, source, destination)) return *result;
+    if (const auto result = ResultOfStream(source, destination)) return *result;
 
     PK_PixelFormat format = PK_PixelFormat_Invalid;
     const PK_Result chosen = ChooseEncodeSource(source.format, destination.format, quality, format);
@@ -85,7 +89,7 @@ PK_Result ConvertRaster(const SourceImage& source, const DestinationImage& desti
 }
 
 PK_Result ConvertFromStream(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
-    if (const auto result = ResultOfStream(source.format, source, destination)) return *result;
+    if (const auto result = ResultOfStream(source, destination)) return *result;
 
     // A stream without a target of its own keeps what is wanted here, and is refused by DecodeStream.
     const DecodeTarget wanted = {destination.format, source.width, source.height};

@@ -110,7 +110,7 @@ PK_Result DecodePlan::BuildDecimation(const DecodeTarget& source, const DecodeTa
         if (step == 0) return PK_ErrBadWidth;
     }
     fFirstRow = 0;
-    fRowStep = source.height / target.height;
+    fRowStep = isQuarter ? 2 : source.height / target.height;
     fRow = DecimatedRow(source.format, step);
     return Finish(target.format, quality);
 }
