@@ -4,34 +4,24 @@
 
 #include "convert/Planar420.h"
 #include "frame/FloatMode.h"
-#include "frame/TransientMemory.h"
 #include "scale/ScaleArguments.h"
+#include "scale/ScaleRun.h"
 #include "scale/ScaleTrace.h"
 
 namespace PK {
 namespace {
 
-PK_Result ScalePlanes(const SourcePlanes& planes, const ScaleCall& call,
-                      const DestinationImage& destination) {
-    const auto& [from, to, renderField, quality] = call;
-    const DecodeTarget target =
-        ChoosePlanarTarget({from.format, from.width, from.height}, {to.format, to.width, to.height}, quality);
+/// \param job  without memory of a source: the planes lie apart.
+PK_Result ScalePlanes(const SourcePlanes& planes, const ScaleJob& job) {
+    const auto& [from, to, renderField, quality] = job.call;
+    const DecodeTarget target = DecodeTargetOf(job.call);
+    const auto decode = [&](const DestinationImage& image) {
+        return DecodePlanar420(planes, from.format, FromTop(image), from.field, quality);
+    };
     const bool isStraight =
         target.format == to.format && target.width == to.width && target.height == to.height;
-    TraceScale(call, isStraight ? ScaleRoute::StraightDecoding : ScaleRoute::Decoding);
-    if (isStraight) return DecodePlanar420(planes, from.format, FromTop(destination), from.field, quality);
-
-    const TransientPixelBuffer buffer(target.format, target.width, target.height);
-    if (buffer.Result() != PK_Success) return buffer.Result();
-    const DestinationImage picture = {buffer.Pixels(), buffer.RowBytes(), target.format, target.width,
-                                      target.height};
-    if (const PK_Result result = DecodePlanar420(planes, from.format, FromTop(picture), from.field, quality))
-        return result;
-    const ScaleImage decoded = AfterDecoding(call, target).source;
-    return PK_ScaleConvertOneField(buffer.Pixels(), buffer.RowBytes(), decoded.width, decoded.height,
-                                   decoded.format, decoded.field, destination.pixels,
-                                   static_cast<int32_t>(destination.rowBytes), to.width, to.height, to.format,
-                                   to.field, quality, renderField);
+    TraceScale(job.call, isStraight ? ScaleRoute::StraightDecoding : ScaleRoute::Decoding);
+    return isStraight ? decode(job.Destination()) : RunScaleDecoded(job, target, decode);
 }
 
 } // namespace
@@ -54,10 +44,9 @@ PK_Result PK_ScaleConvertPlanar(const void* const planes[3], const int32_t plane
 
     constexpr int32_t kAllRows = 0;
     const FloatMode mode;
-    return ScalePlanes(source,
-                       {{srcFormat, srcWidth, srcHeight, srcField},
-                        {dstFormat, dstWidth, dstHeight, dstField},
-                        kAllRows,
-                        quality},
-                       {static_cast<uint8_t*>(dst), dstRowBytes, dstFormat, dstWidth, dstHeight});
+    const ScaleCall call = {{srcFormat, srcWidth, srcHeight, srcField},
+                            {dstFormat, dstWidth, dstHeight, dstField},
+                            kAllRows,
+                            quality};
+    return ScalePlanes(source, {call, nullptr, 0, static_cast<uint8_t*>(dst), dstRowBytes});
 }

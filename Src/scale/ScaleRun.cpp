@@ -1,6 +1,5 @@
 #include "scale/ScaleRun.h"
 
-#include "frame/TransientMemory.h"
 #include "scale/CopyPlanarField.h"
 #include "scale/HalfSize.h"
 #include "scale/ScaleTrace.h"
@@ -25,18 +24,9 @@ PK_Result RunOneField(const ScaleJob& job) {
 }
 
 PK_Result RunDecoding(const ScaleJob& job) {
-    const DecodeTarget target = DecodeTargetOf(job.call);
-    const TransientPixelBuffer buffer(target.format, target.width, target.height);
-    if (buffer.Result() != PK_Success) return buffer.Result();
-    const DestinationImage picture = {buffer.Pixels(), buffer.RowBytes(), target.format, target.width,
-                                      target.height};
-    if (const PK_Result result = DecodeStream(job.Source(), job.call.source.field, picture, job.call.quality))
-        return result;
-    ScaleJob rest = job;
-    rest.call = AfterDecoding(job.call, target);
-    rest.source = picture.pixels;
-    rest.sourceRowBytes = buffer.RowBytes();
-    return RunScale(rest);
+    return RunScaleDecoded(job, DecodeTargetOf(job.call), [&](const DestinationImage& picture) {
+        return DecodeStream(job.Source(), job.call.source.field, picture, job.call.quality);
+    });
 }
 
 } // namespace

@@ -3,6 +3,7 @@
 // A scale-and-convert call with its memory, and the routes that it takes.
 
 #include "convert/Image.h"
+#include "frame/TransientMemory.h"
 #include "scale/ScaleRoute.h"
 
 namespace PK {
@@ -26,6 +27,22 @@ struct ScaleJob {
 
 /// By the first route that takes it. Formats, sizes and pointers were checked.
 PK_Result RunScale(const ScaleJob& job);
+
+/// Decodes to a buffer of the target, which then stands for the source and goes its own way.
+/// \param decode  takes the DestinationImage of the buffer and returns a PK_Result.
+template <class Decode>
+PK_Result RunScaleDecoded(const ScaleJob& job, const DecodeTarget& target, const Decode& decode) {
+    const TransientPixelBuffer buffer(target.format, target.width, target.height);
+    if (buffer.Result() != PK_Success) return buffer.Result();
+    const DestinationImage picture = {buffer.Pixels(), buffer.RowBytes(), target.format, target.width,
+                                      target.height};
+    if (const PK_Result result = decode(picture)) return result;
+    ScaleJob rest = job;
+    rest.call = AfterDecoding(job.call, target);
+    rest.source = buffer.Pixels();
+    rest.sourceRowBytes = buffer.RowBytes();
+    return RunScale(rest);
+}
 
 /// By PK_Motion.
 PK_Result RunScaleByMotion(const ScaleJob& job);
