@@ -13,10 +13,10 @@ namespace {
 
 /// \param job  without memory of a source: the planes lie apart.
 PK_Result ScalePlanes(const SourcePlanes& planes, const ScaleJob& job) {
-    const auto& [from, to, renderField, quality] = job.call;
+    const ScaleImage &from = job.call.source, &to = job.call.destination;
     const DecodeTarget target = DecodeTargetOf(job.call);
     const auto decode = [&](const DestinationImage& image) {
-        return DecodePlanar420(planes, from.format, FromTop(image), from.field, quality);
+        return DecodePlanar420(planes, from.format, FromTop(image), from.field, job.call.quality);
     };
     const bool isStraight =
         target.format == to.format && target.width == to.width && target.height == to.height;
