@@ -5,8 +5,9 @@
 // A coefficient has the place 8 v + h in its block, for column h and line v. In the scan, places 0 to 5 are area 0, 6 to
 // 20 area 1, 21 to 42 area 2 and the others area 3.
 
+#include "primitives/DVHuffman.h"
+
 #include <array>
-#include <bit>
 #include <cstdint>
 
 namespace PK {
@@ -17,7 +18,6 @@ inline constexpr int32_t kDVClasses = 4;
 inline constexpr int32_t kDVQuantisers = 16; ///< values of QNO
 
 /// By mode: 8-8 and 2-4-8.
-using DVScan = std::array<uint8_t, kCoefficients>;
 inline constexpr int32_t kDVModes = 2;
 inline constexpr DVScan kScan[kDVModes] = {
     {0,  1,  8,  16, 9,  2,  3,  10, 17, 24, 32, 25, 18, 11, 4,  5,  12, 19, 26, 33, 40, 48,

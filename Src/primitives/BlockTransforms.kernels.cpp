@@ -148,10 +148,14 @@ inline void PackFourColumns(const F32* columns, F32& firstTwo, F32& lastTwo) {
     for (int i = 0; i < kSide; ++i) x[i] = columns[i];
 }
 
+inline F32 LoadLine(const int16_t* block, int line) {
+    return ToFloat(LoadSignedWords(block + kSide * line));
+}
+
 template <class ColumnButterfly, class LineButterfly>
 inline void TransformInRegisters(const int16_t* source, int16_t* destination) {
     F32 vectors[kSide];
-    for (int i = 0; i < kSide; ++i) vectors[i] = ToFloat(LoadSignedWords(source + kSide * i));
+    for (int i = 0; i < kSide; ++i) vectors[i] = LoadLine(source, i);
     ColumnButterfly::Apply(vectors);
     TransposeBlock(vectors);
     LineButterfly::Apply(vectors);
@@ -190,6 +194,19 @@ void Transform(const int16_t* source, int16_t* destination) {
         TransformInRegisters<ColumnButterfly, LineButterfly>(source, destination);
 }
 
+/// The columns of four lines, then their lines.
+void Reduced(const int16_t* source, int16_t* destination) {
+    Four x =
+        InverseFour({LoadLine(source, 0), LoadLine(source, 1), LoadLine(source, 2), LoadLine(source, 3)});
+    TransposePixels(x.v0, x.v1, x.v2, x.v3);
+    x = InverseFour(x);
+    TransposePixels(x.v0, x.v1, x.v2, x.v3);
+    alignas(64) int16_t lines[2][2 * kLanes];
+    Store(lines[0], PackSignedInBlocks(Nearest(x.v0), Nearest(x.v1)));
+    Store(lines[1], PackSignedInBlocks(Nearest(x.v2), Nearest(x.v3)));
+    for (int i = 0; i < 2; ++i) std::memcpy(destination + kSide * i, lines[i], kSide * sizeof(int16_t));
+}
+
 /// A block has no use for sixteen lanes: those bodies are the ones of eight.
 template <int kVectorLanes>
 const BlockTransformKernels& Bodies() {
@@ -198,7 +215,7 @@ const BlockTransformKernels& Bodies() {
     } else {
         static constexpr BlockTransformKernels kernels = {
             Transform<ForwardEight, ForwardEight>, Transform<InverseEight, InverseEight>,
-            Transform<ForwardFields, ForwardEight>, Transform<InverseFields, InverseEight>};
+            Transform<ForwardFields, ForwardEight>, Transform<InverseFields, InverseEight>, Reduced};
         return kernels;
     }
 }

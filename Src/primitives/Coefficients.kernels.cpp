@@ -53,6 +53,13 @@ struct Divided {
     }
 };
 
+struct SteppedAndDivided {
+    int32_t step;
+    Divided division;
+
+    I32 Apply(I32 x) const { return division.Apply(x * Ints(step)); }
+};
+
 /// x times 2^bits for bits from 0 to 15, where what passes 16 bits may saturate first.
 struct Multiplied {
     int32_t bits;
@@ -71,7 +78,11 @@ void MultiplyScaled(const void* factors, void* data, ptrdiff_t count, const int3
     }
 }
 
-constexpr CoefficientKernels kKernels = {CountZeros, MultiplyScaled};
+void MultiplySteps(const void* factors, void* data, ptrdiff_t count, const StepAndScale& by) {
+    RunRow(ScaledProduct<SteppedAndDivided>({by.step, {by.scale}}), count, data, factors);
+}
+
+constexpr CoefficientKernels kKernels = {CountZeros, MultiplyScaled, MultiplySteps};
 
 } // namespace
 } // namespace PK_TARGET
