@@ -44,8 +44,8 @@ TEST(DVCodeWords, ALongAmplitudeIsWrittenAsItIs) {
 }
 
 TEST(DVCodeWords, APairWithoutAWordIsARunAndAnAmplitude) {
-    // One zero by the word for a run of none, 11111000110, and the amplitude.
-    EXPECT_EQ(kVLCCode[1][18], 0b11111000110u << 10 | kVLCCode[0][18]);
+    // One zero by the word for a run of none, 11111001110, and the amplitude.
+    EXPECT_EQ(kVLCCode[1][18], 0b11111001110u << 10 | kVLCCode[0][18]);
     EXPECT_EQ(kVLCLength[1][18], 11 + 10);
     // Runs of 6 and more as they are.
     EXPECT_EQ(kVLCCode[7][4], (0b1111110'000110u << 5) | 0b1001'0u);
