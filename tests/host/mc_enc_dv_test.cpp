@@ -53,10 +53,10 @@ Bytes SmoothVUYA(int32_t width, int32_t height) {
 }
 
 Bytes Converted(const Bytes& pixels, PK_PixelFormat from, PK_PixelFormat to, int32_t width, int32_t height) {
-    const int32_t rowBytes = PK_PixelFormatRowBytes(to, width);
+    const int32_t rowBytes = PK_PixelFormatPackedRowBytes(to, width);
     Bytes result(static_cast<size_t>(rowBytes) * static_cast<size_t>(height));
-    EXPECT_EQ(PK_Convert(pixels.data(), PK_PixelFormatRowBytes(from, width), from, result.data(), rowBytes,
-                         to, width, height, 4),
+    EXPECT_EQ(PK_Convert(pixels.data(), PK_PixelFormatPackedRowBytes(from, width), from, result.data(),
+                         rowBytes, to, width, height, 4),
               PK_Success);
     return result;
 }
@@ -79,7 +79,8 @@ TEST(DVEncoder, AllPixelKindsGiveWhatTheirConversionToPairsGives) {
                    .rowBytes = -4 * width,
                    .flags = kAlways | kHasAlpha,
                    .fourcc = format == kVUYA8 ? kVUYA : kBGRA};
-            EXPECT_EQ(Encoded(pixels.data() + 4 * width * (height - 1), job), frame);
+            EXPECT_TRUE(Encoded(pixels.data() + 4 * width * (height - 1), job) == frame)
+                << PK_PixelFormatName(format) << " " << width;
         }
     }
 }
