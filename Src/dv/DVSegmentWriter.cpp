@@ -14,38 +14,39 @@ constexpr DVArea kAreasHD[] = {{4, 10}, {14, 10}, {24, 10}, {34, 10}, {44, 10}, 
 
 constexpr int32_t kBitsOfByte = 8;
 
-/// Words one behind the other, the highest bit first.
+/// Words one behind the other, the highest bit first, and ones behind them.
 class BitWriter {
 public:
     explicit BitWriter(uint8_t* bytes) : fFirst(bytes), fNext(bytes) {}
 
     /// \param bits  up to 32, and none above `count`.
     void Put(uint32_t bits, int32_t count) {
-        fHeld = fHeld << count | bits;
         fCount += count;
-        if (fCount < kWord) return;
-        fCount -= kWord;
-        Store(static_cast<uint32_t>(fHeld >> fCount));
-        fNext += kWord / kBitsOfByte;
+        fHeld |= uint64_t{bits} << (kHeld - fCount);
+        Store(fHeld);
+        fNext += fCount / kBitsOfByte;
+        fHeld <<= fCount & ~(kBitsOfByte - 1);
+        fCount %= kBitsOfByte;
     }
 
     /// \return how many bits there are.
     int32_t Finish() {
-        Store(static_cast<uint32_t>(fHeld << (kWord - fCount)));
+        Store(fHeld | ~uint64_t{0} >> fCount);
+        std::memset(fNext + sizeof fHeld, 0xff, sizeof fHeld);
         return static_cast<int32_t>(fNext - fFirst) * kBitsOfByte + fCount;
     }
 
 private:
-    static constexpr int32_t kWord = 32;
+    static constexpr int32_t kHeld = 64;
 
-    void Store(uint32_t word) {
-        const uint32_t bigEndian = __builtin_bswap32(word);
+    void Store(uint64_t word) {
+        const uint64_t bigEndian = __builtin_bswap64(word);
         std::memcpy(fNext, &bigEndian, sizeof bigEndian);
     }
 
     uint8_t *fFirst, *fNext;
-    uint64_t fHeld = 0;
-    int32_t fCount = 0;
+    uint64_t fHeld = 0; // at the upper end
+    int32_t fCount = 0; // of its bits, below eight between two words
 };
 
 /// Up to eight bits from any place on, at the upper end of a byte; the bits behind them are of no meaning.
@@ -94,12 +95,11 @@ void DVSegmentWriter::FillOwnArea(int32_t place, uint8_t* macroblock) {
     uint8_t* const bytes = macroblock + area.offset;
     const int32_t room = kBitsOfByte * area.bytes;
     bits.packed = std::min(bits.count, room);
-    std::memcpy(bytes, bits.bytes, area.bytes);
     fSpare[place] = {bytes, bits.packed, room};
-    if (bits.packed == room) return;
-    uint8_t* const last = bytes + bits.packed / kBitsOfByte;
-    *last |= static_cast<uint8_t>(0xff >> bits.packed % kBitsOfByte);
-    std::fill(last + 1, bytes + area.bytes, uint8_t{0xff});
+    // Behind the last word there are ones enough for every area. Two copies of eight bytes make eight to sixteen.
+    constexpr size_t kHalf = 8;
+    std::memcpy(bytes, bits.bytes, kHalf);
+    std::memcpy(bytes + area.bytes - kHalf, bits.bytes + area.bytes - kHalf, kHalf);
 }
 
 /// Byte by byte of the area. Its bits from `next` on are ones.

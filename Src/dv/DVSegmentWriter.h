@@ -49,7 +49,8 @@ public:
     void Pack(uint8_t* segment);
 
 private:
-    static constexpr int32_t kRoom = 256; // 63 of the longest words, and a head, have 230 bytes
+    static constexpr int32_t kRoom =
+        256; // 63 of the longest words, and a head, have 231 bytes, and ones are behind them
 
     struct Bits {
         int32_t count; // in all
