@@ -65,11 +65,12 @@ private:
     };
 
     void FillOwnArea(int32_t place, uint8_t* macroblock);
-    static void Move(Bits& from, Spare& to);
+    void Move(Bits& from, Spare& to) const;
     void FillSpare(int32_t firstBlock, int32_t endBlock);
 
     int32_t fBlocks;
     std::span<const DVArea> fAreas;
+    uint8_t* fSegmentEnd = nullptr;
     Bits fBits[kMostBlocks];
     Spare fSpare[kMostBlocks];
 };

@@ -73,7 +73,8 @@ SegmentCompressor::SegmentCompressor(const DVPolicy& policy, bool haveDummies)
 }
 
 SegmentCompressor::SegmentCompressor(const DVPolicy& policy, int32_t blocksOfMacroblock, int32_t firstStep)
-    : fPolicy(policy), fTransforms(Best<BlockTransformKernels>()), fKernels(Best<DVBlockKernels>()),
+    : fPolicy(policy), fTransforms(Best<BlockTransformKernels>()),
+      fCoefficientKernels(Best<CoefficientKernels>()), fKernels(Best<DVBlockKernels>()),
       fBlocksOfMacroblock(blocksOfMacroblock), fLastStep(firstStep), fWriter(blocksOfMacroblock) {
     for (int32_t i = 0; i < DVSegmentWriter::kMostBlocks; ++i) fBlocks[i] = {fMemory[i], 0, 0, 0, false};
 }
@@ -96,9 +97,9 @@ void SegmentCompressor::Transform(DVBlock& block) const {
     fTransforms.forward248(block.coefficients, values[1]);
     block.dc = DCOf(values[0][0]);
     if (fPolicy.coefficientBits == 0) {
-        const CoefficientKernels& kernels = Best<CoefficientKernels>();
         for (int32_t mode = 0; mode < kDVModes; ++mode)
-            kernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients, kScale16);
+            fCoefficientKernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients,
+                                                  kScale16);
         constexpr int32_t kFieldDifference = 32;
         static_assert(kWeights248[kFieldDifference] == INT16_MIN, "1/2 with the wrong sign");
         int16_t& difference = values[1][kFieldDifference];
@@ -115,8 +116,7 @@ void SegmentCompressor::Transform(DVBlock& block) const {
 
 bool SegmentCompressor::IsBetterInFields(const int16_t (&values)[kDVModes][kCoefficients]) const {
     if (fPolicy.mode == DVPolicy::Mode::MoreZeros) {
-        const CoefficientKernels& kernels = Best<CoefficientKernels>();
-        return kernels.countZeros8x8(values[0]) < kernels.countZeros8x8(values[1]);
+        return fCoefficientKernels.countZeros8x8(values[0]) < fCoefficientKernels.countZeros8x8(values[1]);
     }
     const float unit = PowerOfTwo(-fPolicy.coefficientBits);
     return fKernels.sumOfLogarithms(values[1], unit) < fKernels.sumOfLogarithms(values[0], unit);

@@ -8,6 +8,7 @@
 namespace PK {
 
 struct BlockTransformKernels;
+struct CoefficientKernels;
 
 /// Compresses segment after segment, and begins the search for a quantiser where the one before has found its own.
 class SegmentCompressor {
@@ -58,6 +59,7 @@ protected:
 
     const DVPolicy& fPolicy;
     const BlockTransformKernels& fTransforms;
+    const CoefficientKernels& fCoefficientKernels;
     const DVBlockKernels& fKernels;
 
 private:
