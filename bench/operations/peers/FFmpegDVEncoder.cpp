@@ -2,44 +2,24 @@
 
 #include "operations/DVFrames.h"
 #include "operations/Operation.h"
-
-extern "C" {
-#include <libavcodec/avcodec.h>
-#include <libavutil/frame.h>
-}
-
-#include <memory>
-#include <stdexcept>
+#include "operations/peers/FFmpegCodec.h"
 
 namespace OperationBench {
 namespace {
 
-struct Free {
-    void operator()(AVCodecContext* context) const { avcodec_free_context(&context); }
-    void operator()(AVFrame* frame) const { av_frame_free(&frame); }
-    void operator()(AVPacket* packet) const { av_packet_free(&packet); }
-};
-
-void Check(int result) {
-    if (result < 0) throw std::runtime_error("FFmpeg refuses to encode");
-}
-
 class Encoder {
 public:
-    explicit Encoder(const DVFrame& format)
-        : fContext(avcodec_alloc_context3(avcodec_find_encoder(AV_CODEC_ID_DVVIDEO)), Free()),
-          fFrame(av_frame_alloc(), Free()), fPacket(av_packet_alloc(), Free()) {
+    explicit Encoder(const DVFrame& format) : fContext(ContextOf(avcodec_find_encoder(AV_CODEC_ID_DVVIDEO))) {
         fContext->width = format.width;
         fContext->height = format.height;
         fContext->pix_fmt = format.chromaLines == 2 ? AV_PIX_FMT_YUV420P : AV_PIX_FMT_YUV422P;
         fContext->time_base = {1, 25};
-        fContext->thread_count = 1;
         fContext->flags |= AV_CODEC_FLAG_INTERLACED_DCT;
-        Check(avcodec_open2(fContext.get(), nullptr, nullptr));
+        CheckFFmpeg(avcodec_open2(fContext.get(), nullptr, nullptr));
         fFrame->format = fContext->pix_fmt;
         fFrame->width = format.width;
         fFrame->height = format.height;
-        Check(av_frame_get_buffer(fFrame.get(), 64));
+        CheckFFmpeg(av_frame_get_buffer(fFrame.get(), 64));
         const std::vector<uint8_t> picture = PictureOf(format);
         Fill(0, picture.data(), 2, format.width, format.height, 2 * format.width);
         for (int i = 0; i < 2; ++i)
@@ -50,8 +30,8 @@ public:
 
     void Run() {
         ++fFrame->pts;
-        Check(avcodec_send_frame(fContext.get(), fFrame.get()));
-        Check(avcodec_receive_packet(fContext.get(), fPacket.get()));
+        CheckFFmpeg(avcodec_send_frame(fContext.get(), fFrame.get()));
+        CheckFFmpeg(avcodec_receive_packet(fContext.get(), fPacket.get()));
         av_packet_unref(fPacket.get());
     }
 
@@ -65,8 +45,8 @@ private:
     }
 
     std::shared_ptr<AVCodecContext> fContext;
-    std::shared_ptr<AVFrame> fFrame;
-    std::shared_ptr<AVPacket> fPacket;
+    std::shared_ptr<AVFrame> fFrame = MakeFrame();
+    std::shared_ptr<AVPacket> fPacket = MakePacket();
 };
 
 template <const DVFrame& kFrame>
