@@ -290,11 +290,19 @@ KernelTrial TransformTrial(const KernelRow& kernel, int32_t, Random&) {
             })};
 }
 
-/// With a step and factors that are drawn.
+/// A step and factors.
+struct DrawnSteps {
+    explicit DrawnSteps(Random& random) {
+        for (float& factor : factors.raster) factor = static_cast<float>(random.Below(32768)) / 256;
+        for (int i = 0; i < 64; ++i) factors.parted[i - i % 8 + i % 8 / 2 + i % 2 * 4] = factors.raster[i];
+        step = static_cast<float>(1 + random.Below(416));
+    }
+    PK::DVFactorTable factors;
+    float step;
+};
+
 KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
-    const auto factors = std::make_shared<std::array<float, 64>>();
-    for (float& factor : *factors) factor = static_cast<float>(random.Below(32768)) / 256;
-    const auto step = static_cast<float>(1 + random.Below(416));
+    const auto drawn = std::make_shared<DrawnSteps>(random);
     using Transform = DVTransformKernels::Transform;
     const TrialRow samples = RowOf(kernel.operands.destination, 1);
     return {{RowOf(kernel.operands.source, 1)},
@@ -302,9 +310,25 @@ KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
             Typed<Transform>([=](Transform run, const Sources& sources, uint8_t* destination) {
                 int16_t block[64];
                 std::memcpy(block, sources[0], sizeof block);
-                run(block, {factors->data(), step}, block);
+                run(block, {&drawn->factors, drawn->step}, block);
                 std::memcpy(destination, block, samples.bytes);
             })};
+}
+
+KernelTrial LevelsOfFourTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto drawn = std::make_shared<std::vector<DrawnSteps>>();
+    for (int i = 0; i < kDVBlocksAtOnce; ++i) drawn->emplace_back(random);
+    using Transform = DVFourBlocksKernels::Transform;
+    const TrialRow blocks = RowOf(kernel.operands.source, kDVBlocksAtOnce);
+    return {
+        {blocks}, blocks, Typed<Transform>([=](Transform run, const Sources& sources, uint8_t* destination) {
+            int16_t levels[kDVBlocksAtOnce * 64], samples[kDVBlocksAtOnce * 64];
+            std::memcpy(levels, sources[0], sizeof levels);
+            DVSteps steps[kDVBlocksAtOnce];
+            for (size_t i = 0; i < kDVBlocksAtOnce; ++i) steps[i] = {&(*drawn)[i].factors, (*drawn)[i].step};
+            run(levels, steps, samples);
+            std::memcpy(destination, samples, sizeof samples);
+        })};
 }
 
 KernelTrial SamplesToBytesTrial(const KernelRow& kernel, int32_t, Random&) {
@@ -553,6 +577,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"Transpose", TransposeTrial, "TransposeArea"},
     {"BlockTransform", TransformTrial},
     {"DVTransform", LevelsTrial},
+    {"DVFourBlocks", LevelsOfFourTrial},
     {"DVMacroblock", SamplesToBytesTrial, "SamplesToBytes"},
     {"DVMacroblock", SamplesToYUYVTrial},
     {"DVRow", PlanesTrial<1>, "FullPlanes"},
