@@ -392,6 +392,8 @@ constexpr KernelRow kMotion[] = {
 constexpr KernelRow kDV[] = {
     Entry<&DVSampleKernels::loadYUYV>("LoadDVBlocks_YUYV", {Bytes(256), SignedWords(256)}),
     Entry<&DVSampleKernels::loadUYVY>("LoadDVBlocks_UYVY", {Bytes(256), SignedWords(256)}),
+    Entry<&DVBlockKernels::lineDifferences>("DVLineDifferences", {SignedWords(64), Integers(2)}),
+    Entry<&DVBlockKernels::greatest>("GreatestOfDVBlock", {SignedWords(64), Integers(1)}),
     Entry<&DVBlockKernels::scale>("ScaleDVBlock", {SignedWords(64), SignedWords(64)}),
     Entry<&DVBlockKernels::sumOfLogarithms>("SumOfDVLogarithms", {SignedWords(64), Integers(1)}),
     Entry<&DVBlockKernels::quantise>("QuantiseDVBlock", {SignedWords(64), Bytes(73)}),

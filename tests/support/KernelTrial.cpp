@@ -355,18 +355,6 @@ KernelTrial SamplesToYUYVTrial(const KernelRow& kernel, int32_t, Random& random)
             })};
 }
 
-KernelTrial CountTrial(const KernelRow& kernel, int32_t, Random&) {
-    using CountZeros = decltype(CoefficientKernels::countZeros8x8);
-    return {{RowOf(kernel.operands.source, 1)},
-            RowOf(kernel.operands.destination, 1),
-            Typed<CountZeros>([](CountZeros run, const Sources& sources, uint8_t* destination) {
-                int16_t block[64];
-                std::memcpy(block, sources[0], sizeof block);
-                const uint32_t count = run(block);
-                std::memcpy(destination, &count, sizeof count);
-            })};
-}
-
 /// Sixteen pixels of eight rows to four blocks.
 KernelTrial LoadBlocksTrial(const KernelRow& kernel, int32_t, Random& random) {
     const auto bits = static_cast<int32_t>(random.Below(4));
@@ -402,6 +390,20 @@ KernelTrial ScaleBlockTrial(const KernelRow& kernel, int32_t, Random& random) {
                 std::memcpy(block, sources[0], sizeof block);
                 run(AsBlockFactors(*factors), roundUp, block);
                 std::memcpy(destination, block, sizeof block);
+            })};
+}
+
+/// A function of a block that tells a number or two.
+template <class Told>
+KernelTrial BlockTrial(const KernelRow& kernel, int32_t, Random&) {
+    using Tell = Told (*)(const int16_t* block);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Tell>([](Tell run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                const Told told = run(block);
+                std::memcpy(destination, &told, sizeof told);
             })};
 }
 
@@ -568,7 +570,7 @@ struct SpecialTrial {
 constexpr SpecialTrial kSpecial[] = {
     {"Channel", TrialWith<ChannelPattern, DrawFloat>, "InvertChannelRow_Float"},
     {"Channel", TrialWith<ChannelPattern, DrawInteger>},
-    {"Coefficient", CountTrial, "CountZeros"},
+    {"Coefficient", BlockTrial<uint32_t>, "CountZeros"},
     {"Coefficient", TrialWith<int32_t, DrawScale>},
     {"ConvertFloat", TrialWith<PowerOfTwo, DrawPower>},
     {"MultiplyConstant", TrialWith<ChannelFactors, DrawUnscaled>, "MultiplyConstantRow_Unscaled"},
@@ -583,6 +585,8 @@ constexpr SpecialTrial kSpecial[] = {
     {"DVRow", PlanesTrial<1>, "FullPlanes"},
     {"DVSample", LoadBlocksTrial},
     {"DVBlock", ScaleBlockTrial, "Scale"},
+    {"DVBlock", BlockTrial<DVLineDifferences>, "DVLineDifferences"},
+    {"DVBlock", BlockTrial<uint32_t>, "Greatest"},
     {"DVBlock", SumOfLogarithmsTrial, "Sum"},
     {"DVBlock", QuantiseBlockTrial, "Quantise"},
     {"W210", PlanesTrial<2>, "Average"},
