@@ -12,6 +12,7 @@
 #include <PixelKiln/Composite.h>
 #include <PixelKiln/Convert.h>
 #include <PixelKiln/CrossDissolve.h>
+#include <PixelKiln/DV.h>
 #include <PixelKiln/Deinterlace.h>
 #include <PixelKiln/Fills.h>
 #include <PixelKiln/GaussianBlur.h>
