@@ -2,6 +2,7 @@
 
 #include "convert/ConversionChain.h"
 #include "convert/Planar420.h"
+#include "dv/CompressDV.h"
 
 #include <algorithm>
 #include <iterator>
@@ -70,6 +71,14 @@ PK_PixelFormat ChoosePlanarSource(PK_PixelFormat source, PK_PixelFormat stream) 
     return IsStream(source) ? PK_PixelFormat_VUYX_4444_8u : source;
 }
 
+PK_Result EncodeToPlanes(const SourceImage& source, const DestinationImage& destination, int32_t quality) {
+    if (!Is420Planar(destination.format)) return PK_ErrNotSupported;
+    if (source.width == 0 || source.height == 0) return PK_Success;
+    const auto planes = PlanesOfStream(destination);
+    if (!planes) return PK_ErrFailed;
+    return EncodePlanar420(FromTop(source), destination.format, *planes, quality);
+}
+
 } // namespace
 
 PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wanted, int32_t quality,
@@ -124,11 +133,24 @@ PK_Result DecodeStreamThrough(const ConversionChain& onward, const SourceImage& 
 
 PK_Result EncodeStream(const SourceImage& source, const DestinationImage& destination,
                        int32_t quality) noexcept {
-    if (!Is420Planar(destination.format)) return PK_ErrNotSupported;
-    if (source.width == 0 || source.height == 0) return PK_Success;
-    const auto planes = PlanesOfStream(destination);
-    if (!planes) return PK_ErrFailed;
-    return EncodePlanar420(FromTop(source), destination.format, *planes, quality);
+    const auto sourceRowBytes = static_cast<int32_t>(source.rowBytes);
+    const auto frameBytes = static_cast<int32_t>(destination.rowBytes);
+    switch (CodecOf(destination.format)) {
+    case Codec::DV25:
+        return CompressDV25(source.pixels, sourceRowBytes, source.format, source.width, source.height,
+                            destination.pixels, frameBytes, destination.format, false, quality);
+    case Codec::DV50:
+        return CompressDV50(source.pixels, sourceRowBytes, source.width, source.height, destination.pixels,
+                            destination.format, quality);
+    case Codec::DV100:
+        return CompressDV100(source.pixels, sourceRowBytes, source.width, source.height, destination.pixels,
+                             frameBytes, 0, destination.format, quality);
+    case Codec::Planar420:
+        return EncodeToPlanes(source, destination, quality);
+    case Codec::None:
+        break;
+    }
+    return PK_ErrNotSupported;
 }
 
 } // namespace PK

@@ -1,6 +1,7 @@
 // Start and stop of the library.
 
 #include "frame/Capabilities.h"
+#include "frame/DVEncoder.h"
 #include "frame/PrimitivesStart.h"
 #include "frame/Task.h"
 #include "frame/Wrap32.h"
@@ -37,6 +38,7 @@ PK_Result PK_Initialize(void) noexcept {
     if (sNestingCount != 1) return PK_Success;
     DetectProcessor();
     StartPrimitives();
+    OpenDVEncoder();
     Threading::CreateTaskExecutor();
     return PK_Success;
 }
@@ -45,6 +47,8 @@ PK_Result PK_Terminate(void) noexcept {
     using namespace PK;
     const std::scoped_lock lock(sMutex);
     sNestingCount = WrapAdd(sNestingCount, -1);
-    if (sNestingCount == 0) Threading::ReleaseTaskExecutor();
+    if (sNestingCount != 0) return PK_Success;
+    Threading::ReleaseTaskExecutor();
+    CloseDVEncoder();
     return PK_Success;
 }

@@ -341,6 +341,11 @@ inline I32 HalvesAt(I32 a) {
     return {_mm256_shuffle_epi8(a.v, _mm256_broadcastsi128_si256(order))};
 }
 
+/// A bit for each byte, the lowest for the first: set where the byte is not 0.
+inline uint64_t NonZeroBytes(I32 a) {
+    return ~static_cast<uint32_t>(_mm256_movemask_epi8(_mm256_cmpeq_epi8(a.v, _mm256_setzero_si256())));
+}
+
 /// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
 /// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
 inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {

@@ -607,6 +607,11 @@ inline bool AnyNegative(I32 a) {
     return _mm512_movepi32_mask(a.v) != 0;
 }
 
+/// A bit for each byte, the lowest for the first: set where the byte is not 0.
+inline uint64_t NonZeroBytes(I32 a) {
+    return _mm512_test_epi8_mask(a.v, a.v);
+}
+
 /// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
 /// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
 inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {

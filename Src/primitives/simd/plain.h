@@ -606,6 +606,15 @@ inline bool AnyNegative(I32 a) {
     return ((a.lane[0] | a.lane[1] | a.lane[2] | a.lane[3]) >> 31) != 0;
 }
 
+/// A bit for each byte, the lowest for the first: set where the byte is not 0.
+inline uint64_t NonZeroBytes(I32 a) {
+    uint8_t bytes[4 * kLanes];
+    Store(bytes, a);
+    uint64_t bits = 0;
+    for (int i = 0; i < 4 * kLanes; ++i) bits |= uint64_t{bytes[i] != 0} << i;
+    return bits;
+}
+
 /// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
 /// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
 inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {

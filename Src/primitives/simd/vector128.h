@@ -574,6 +574,11 @@ inline bool AnyNegative(I32 a) {
     return _mm_movemask_ps(_mm_castsi128_ps(a.v)) != 0;
 }
 
+/// A bit for each byte, the lowest for the first: set where the byte is not 0.
+inline uint64_t NonZeroBytes(I32 a) {
+    return static_cast<uint16_t>(~_mm_movemask_epi8(_mm_cmpeq_epi8(a.v, _mm_setzero_si128())));
+}
+
 /// Two four-byte pixels side by side for each block, from places of any alignment: block i has its first at
 /// index[4 x i], in pixels. Their bytes go to lanes, a pixel a block.
 inline void LoadPixelPairs(const uint8_t* pixels, const int32_t* index, I32& first, I32& second) {

@@ -1,0 +1,244 @@
+#include "dv/SegmentCompressor.h"
+
+#include "primitives/BlockTransforms.h"
+#include "primitives/Coefficients.h"
+#include "primitives/Dispatch.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace PK {
+namespace {
+
+constexpr int32_t kBlocks = 6;     // of a macroblock
+constexpr int32_t kLumaBlocks = 4; // of them
+constexpr int32_t kScale16 = 16;   // of the weights that are 16-bit fractions
+constexpr int16_t kLeastDC = -256, kGreatestDC = 255;
+constexpr int32_t kGreatestLevel = 255;
+
+constexpr float PowerOfTwo(int32_t exponent) {
+    float power = 1;
+    for (; exponent > 0; --exponent) power *= 2;
+    for (; exponent < 0; ++exponent) power /= 2;
+    return power;
+}
+
+/// 1 / step of each row of kDVRowShifts, for coefficients of so many fractional bits.
+template <int32_t kBits>
+constexpr auto kRowFactors = [] {
+    std::array<std::array<float, kCoefficients>, kDVQuantRows> factors{};
+    for (int32_t row = 0; row < kDVQuantRows; ++row)
+        for (int32_t place = 0; place < kCoefficients; ++place)
+            factors[row][place] = PowerOfTwo(-kDVRowShifts[row][AreaOf(place)] - kBits);
+    return factors;
+}();
+constexpr int32_t kBestBits = kBestDVPolicy.coefficientBits;
+
+const DVBlockFactors& FactorsOfRow(int32_t row, int32_t coefficientBits) {
+    const auto& rows = coefficientBits == 0 ? kRowFactors<0> : kRowFactors<kBestBits>;
+    return *reinterpret_cast<const DVBlockFactors*>(rows[static_cast<size_t>(row)].data());
+}
+
+/// The forward weights, by mode, for the best policy.
+constexpr auto kFineWeights = [] {
+    std::array<std::array<float, kCoefficients>, kDVModes> weights{};
+    for (int32_t mode = 0; mode < kDVModes; ++mode)
+        for (int32_t place = 0; place < kCoefficients; ++place)
+            weights[mode][place] = static_cast<float>(WeightProduct(mode, place) / 2) *
+                                   PowerOfTwo(kBestBits - kBestDVPolicy.sampleBits);
+    return weights;
+}();
+
+/// The steps of one quantiser for all blocks, from the coarsest. At the coarse end, class 3 has steps that no other class
+/// has, and then small levels are left out.
+struct Step {
+    uint8_t qno, classNumber;
+    float least;
+};
+constexpr Step kSteps[] = {{0, 3, 6}, {0, 3, 4},  {0, 3, 3},  {0, 3, 2},  {0, 3, 1},
+                           {2, 3, 1}, {0, 2, 1},  {2, 2, 1},  {4, 2, 1},  {6, 2, 1},
+                           {8, 2, 1}, {10, 2, 1}, {12, 2, 1}, {14, 2, 1}, {15, 2, 1}};
+
+} // namespace
+
+SegmentCompressor::SegmentCompressor(const DVPolicy& policy, bool haveDummies)
+    : SegmentCompressor(policy, kBlocks, 0) {
+    if (!haveDummies) return;
+    for (int32_t i = 0; i < kMacroblocksOfSegment; ++i)
+        for (const int32_t place : {1, 3}) fBlocks[kBlocks * i + place].isDummy = true;
+}
+
+SegmentCompressor::SegmentCompressor(const DVPolicy& policy, int32_t blocksOfMacroblock, int32_t firstStep)
+    : fPolicy(policy), fTransforms(Best<BlockTransformKernels>()), fKernels(Best<DVBlockKernels>()),
+      fBlocksOfMacroblock(blocksOfMacroblock), fLastStep(firstStep), fWriter(blocksOfMacroblock) {
+    for (int32_t i = 0; i < DVSegmentWriter::kMostBlocks; ++i) fBlocks[i] = {fMemory[i], 0, 0, 0, false};
+}
+
+void SegmentCompressor::TakeInOrder(DVBlock& block, const int16_t* values) {
+    const DVScan& scan = kScan[block.mode];
+    for (int32_t i = 0; i < kCoefficients; ++i) block.coefficients[i] = values[scan[i]];
+    block.coefficients[0] = 0;
+}
+
+int16_t SegmentCompressor::DCOf(int16_t transformed) const {
+    const int32_t bits = fPolicy.sampleBits + 2;
+    const int32_t dc = (transformed + (1 << (bits - 1))) >> bits;
+    return static_cast<int16_t>(std::clamp<int32_t>(dc, kLeastDC, kGreatestDC));
+}
+
+void SegmentCompressor::Transform(DVBlock& block) const {
+    if (block.isDummy) {
+        std::fill_n(block.coefficients, kCoefficients, int16_t{0});
+        block.dc = kLeastDC;
+        return;
+    }
+    alignas(64) int16_t values[kDVModes][kCoefficients];
+    fTransforms.forward8x8(block.coefficients, values[0]);
+    fTransforms.forward248(block.coefficients, values[1]);
+    block.dc = DCOf(values[0][0]);
+    if (fPolicy.coefficientBits == 0) {
+        const CoefficientKernels& kernels = Best<CoefficientKernels>();
+        for (int32_t mode = 0; mode < kDVModes; ++mode)
+            kernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients, kScale16);
+        block.dc = std::clamp(values[0][0], kLeastDC, kGreatestDC);
+    } else {
+        for (int32_t mode = 0; mode < kDVModes; ++mode)
+            fKernels.scale(*reinterpret_cast<const DVBlockFactors*>(kFineWeights[mode].data()), 0.5f,
+                           values[mode]);
+    }
+    block.mode = IsBetterInFields(values) ? 1 : 0;
+    TakeInOrder(block, values[block.mode]);
+}
+
+bool SegmentCompressor::IsBetterInFields(const int16_t (&values)[kDVModes][kCoefficients]) const {
+    if (fPolicy.mode == DVPolicy::Mode::MoreZeros) {
+        const CoefficientKernels& kernels = Best<CoefficientKernels>();
+        return kernels.countZeros8x8(values[0]) < kernels.countZeros8x8(values[1]);
+    }
+    const float unit = PowerOfTwo(-fPolicy.coefficientBits);
+    return fKernels.sumOfLogarithms(values[1], unit) < fKernels.sumOfLogarithms(values[0], unit);
+}
+
+/// 12 more, a class more. Chroma begins one class higher, and its second block two.
+void SegmentCompressor::ChooseClass(DVBlock& block, int32_t placeInMacroblock) const {
+    if (fPolicy.classes != DVPolicy::Class::ByMagnitude) return;
+    int32_t greatest = 0;
+    for (int32_t i = 0; i < kCoefficients; ++i)
+        greatest = std::max(greatest, std::abs(int32_t{block.coefficients[i]}));
+    constexpr int32_t kMagnitudes = 12, kHighest = 3;
+    const int32_t first = std::max(0, placeInMacroblock - kLumaBlocks + 1);
+    block.classNumber = static_cast<uint8_t>(std::min(greatest / kMagnitudes + first, kHighest));
+}
+
+SegmentCompressor::Quantiser SegmentCompressor::QuantiserOf(const DVBlock& block, int32_t step,
+                                                            bool isTooLarge) const {
+    if (fPolicy.classes == DVPolicy::Class::ByMagnitude) {
+        const auto qno = static_cast<uint8_t>(step);
+        return {FactorsOfRow(kDVQuantRow[block.classNumber][qno], fPolicy.coefficientBits), 1, qno,
+                block.classNumber};
+    }
+    const Step& of = kSteps[step];
+    const uint8_t classNumber = isTooLarge ? kDVClasses - 1 : of.classNumber;
+    return {FactorsOfRow(kDVQuantRow[classNumber][of.qno], fPolicy.coefficientBits), of.least, of.qno,
+            classNumber};
+}
+
+int32_t SegmentCompressor::FinestStep() const {
+    if (fPolicy.classes == DVPolicy::Class::ByMagnitude) return kDVQuantisers - 1;
+    return static_cast<int32_t>(std::size(kSteps)) - 1;
+}
+
+SegmentCompressor::Quantiser SegmentCompressor::Quantise(const DVBlock& block, int32_t step,
+                                                         DVLevels& levels) const {
+    for (bool isTooLarge = false;; isTooLarge = true) {
+        const Quantiser quantiser = QuantiserOf(block, step, isTooLarge);
+        fKernels.quantise(block.coefficients, {quantiser.factors, fRoundUp, quantiser.least}, levels);
+        if (!levels.areTooLarge || isTooLarge) return quantiser;
+    }
+}
+
+int32_t SegmentCompressor::BitsOfMacroblock(int32_t macroblock, int32_t step) {
+    int32_t& known = fBits[macroblock][step];
+    if (known != kUnknown) return known;
+    int32_t bits = 0;
+    DVLevels levels;
+    for (int32_t i = 0; i < fBlocksOfMacroblock; ++i) {
+        Quantise(fBlocks[macroblock * fBlocksOfMacroblock + i], step, levels);
+        bits += levels.areTooLarge ? kBudget : BitsOfBlock(levels);
+    }
+    return known = bits;
+}
+
+bool SegmentCompressor::Fits(int32_t step) {
+    int32_t bits = 0;
+    for (int32_t i = 0; i < kMacroblocksOfSegment && bits <= kBudget; ++i) bits += BitsOfMacroblock(i, step);
+    return bits <= kBudget;
+}
+
+/// From the step of the segment before. The coarsest is taken without a test.
+int32_t SegmentCompressor::FinestThatFits() {
+    int32_t step = fLastStep;
+    if (Fits(step)) {
+        while (step < FinestStep() && Fits(step + 1)) ++step;
+    } else {
+        do --step;
+        while (step > 0 && !Fits(step));
+    }
+    return std::max(step, 0);
+}
+
+/// Goes on by a step with those macroblocks that together make the most of the room that is left, as long as there are
+/// such.
+void SegmentCompressor::RefineMacroblocks(int32_t (&steps)[kMacroblocksOfSegment]) {
+    for (;;) {
+        int32_t room = kBudget, more[kMacroblocksOfSegment], candidates = 0;
+        for (int32_t i = 0; i < kMacroblocksOfSegment; ++i) {
+            const int32_t bits = BitsOfMacroblock(i, steps[i]);
+            room -= bits;
+            if (steps[i] == FinestStep()) continue;
+            more[i] = BitsOfMacroblock(i, steps[i] + 1) - bits;
+            candidates |= 1 << i;
+        }
+        int32_t best = 0, mostTaken = INT32_MIN;
+        for (int32_t set = 1; set < 1 << kMacroblocksOfSegment; ++set) {
+            if ((set & ~candidates) != 0) continue;
+            int32_t taken = 0;
+            for (int32_t i = 0; i < kMacroblocksOfSegment; ++i)
+                if ((set >> i & 1) != 0) taken += more[i];
+            if (taken > room || taken < mostTaken) continue;
+            best = set;
+            mostTaken = taken;
+        }
+        if (best == 0) return;
+        for (int32_t i = 0; i < kMacroblocksOfSegment; ++i) steps[i] += best >> i & 1;
+    }
+}
+
+void SegmentCompressor::QuantiseAndWrite(float roundUp, uint8_t* segment) {
+    fRoundUp = roundUp;
+    for (auto& bits : fBits) std::fill(std::begin(bits), std::end(bits), kUnknown);
+    fLastStep = FinestThatFits();
+    int32_t steps[kMacroblocksOfSegment];
+    std::fill(std::begin(steps), std::end(steps), fLastStep);
+    if (fPolicy.quantiser == DVPolicy::Quantiser::OfMacroblock) RefineMacroblocks(steps);
+    for (int32_t place = 0; DVBlock & block : Blocks()) {
+        const int32_t macroblock = place / fBlocksOfMacroblock;
+        DVLevels levels;
+        const Quantiser quantiser = Quantise(block, steps[macroblock], levels);
+        block.classNumber = quantiser.classNumber;
+        constexpr int32_t kQNO = 3; // behind the ID
+        segment[kDIFBlockBytes * macroblock + kQNO] = quantiser.qno;
+        fWriter.SetBlock(place++, block, levels);
+    }
+    fWriter.Pack(segment);
+}
+
+void SegmentCompressor::Compress(uint8_t* segment) {
+    for (int32_t place = 0; DVBlock & block : Blocks()) {
+        Transform(block);
+        ChooseClass(block, place++ % fBlocksOfMacroblock);
+    }
+    QuantiseAndWrite(fPolicy.roundUp, segment);
+}
+
+} // namespace PK
