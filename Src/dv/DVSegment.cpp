@@ -6,6 +6,30 @@
 #include <algorithm>
 
 namespace PK {
+namespace {
+
+using Factors = std::array<float, kCoefficients>;
+
+/// The steps of DV25 and DV50 by mode and row, without the fractional bits.
+constexpr auto kInverseSteps = [] {
+    std::array<std::array<Factors, kDVQuantRows>, kDVModes> steps{};
+    for (int32_t mode = 0; mode < kDVModes; ++mode)
+        for (int32_t row = 0; row < kDVQuantRows; ++row)
+            for (int32_t i = 1; i < kCoefficients; ++i)
+                steps[mode][row][i] = static_cast<float>(kDVDequant[mode][row][i]) / kDVDequantUnit;
+    return steps;
+}();
+
+/// What the step of DV100 is multiplied by.
+constexpr auto kInverseWeights = [] {
+    std::array<Factors, std::size(kDV100Weights)> weights{};
+    for (size_t table = 0; table < std::size(kDV100Weights); ++table)
+        for (int32_t i = 1; i < kCoefficients; ++i)
+            weights[table][i] = static_cast<float>(kDV100Weights[table][i]) / kDV100WeightUnit;
+    return weights;
+}();
+
+} // namespace
 
 const DVHuffmanTable& DVCodeTable() {
     static constinit FirstUse<DVHuffmanTable> sTable;
@@ -43,54 +67,47 @@ void DVDecodeState::Parse(const uint8_t* segment) {
         HuffmanDecodeSegmentDV(segment, kScan, &fTable, fCoefficients, fParameters, depth);
 }
 
-/// Levels to the coefficients of the orthonormal transform.
-void DVDecodeState::Dequantise(int16_t* block, int32_t index, uint32_t parameters) const {
+/// What levels are multiplied by to be coefficients of the orthonormal transform.
+DVSteps DVDecodeState::Steps(int32_t macroblock, int32_t block) const {
+    const uint32_t parameters = Parameters(macroblock, block);
     const uint32_t mode = parameters >> 6 & 1, classNumber = parameters >> 4 & 3, qno = parameters >> 16;
-    if (!fFormat.IsHD()) {
-        constexpr int32_t kFactorScale = 8;
-        block[0] = static_cast<int16_t>(2 * block[0]);
-        fProducts.multiplyScaled16s(kDVDequant[mode][kDVQuantRow[classNumber][qno]].data(), block,
-                                    kCoefficients, kFactorScale);
-        return;
-    }
-    constexpr int32_t kLumaBlocks = 4, kWeightScale = 5;
-    const auto dc = static_cast<int16_t>(4 * block[0]);
-    const DVFactors& weights = kDV100Weights[(fFormat.isProgressive ? 2 : 0) + (index < kLumaBlocks ? 0 : 1)];
-    fProducts.multiplySteps(weights.data(), block, kCoefficients,
-                            {kDV100Steps[qno] << classNumber, kWeightScale});
-    block[0] = dc;
+    if (!fFormat.IsHD()) return {kInverseSteps[mode][kDVQuantRow[classNumber][qno]].data(), 1};
+    constexpr int32_t kLumaBlocks = 4;
+    const auto& weights = kInverseWeights[(fFormat.isProgressive ? 2 : 0) + (block < kLumaBlocks ? 0 : 1)];
+    return {weights.data(), static_cast<float>(kDV100Steps[qno] << classNumber)};
 }
 
 void DVDecodeState::Transform(int32_t macroblock) {
-    for (int32_t i = 0; i < Blocks(); ++i) Dequantise(Block(macroblock, i), i, Parameters(macroblock, i));
-    if (fHasLinesInTurns[macroblock] && fSize != DVSize::Full) {
-        constexpr int32_t kPairs[][2] = {{0, 2}, {1, 3}, {4, 5}, {6, 7}};
-        for (const auto& [first, second] : kPairs)
-            JoinHalvedFields(Block(macroblock, first), Block(macroblock, second));
-        return;
-    }
+    if (fHasLinesInTurns[macroblock] && fSize != DVSize::Full) return JoinHalvedFields(macroblock);
     for (int32_t i = 0; i < Blocks(); ++i) {
         int16_t* const block = Block(macroblock, i);
+        const DVSteps steps = Steps(macroblock, i);
         if (fSize != DVSize::Full)
-            ReduceBlockDV(fTransforms, block, fSize);
+            ReduceBlockDV(fTransforms, block, steps, fSize);
         else if (!fFormat.IsHD() && (Parameters(macroblock, i) & kModeBit) != 0)
-            fTransforms.inverse248(block, block);
+            fTransforms.inverse248(block, steps, block);
         else
-            fTransforms.inverse8x8(block, block);
+            fTransforms.inverse88(block, steps, block);
     }
 }
 
-/// Blocks of the lines of one field each to half the size: the upper four lines of both, then the lower four.
-void DVDecodeState::JoinHalvedFields(int16_t* first, int16_t* second) const {
-    fTransforms.inverse8x8(first, first);
-    fTransforms.inverse8x8(second, second);
-    int16_t joined[kCoefficients / 2];
-    for (int32_t i = 0; i < kCoefficients / 2; ++i) {
-        const int32_t sum = first[2 * i] + first[2 * i + 1] + second[2 * i] + second[2 * i + 1];
-        joined[i] = static_cast<int16_t>((sum + 2) >> 2);
+/// Blocks of the lines of one field each to half the size: in the first the upper four lines of both, in the second the
+/// lower four.
+void DVDecodeState::JoinHalvedFields(int32_t macroblock) {
+    constexpr int32_t kPairs[][2] = {{0, 2}, {1, 3}, {4, 5}, {6, 7}};
+    for (const auto& [upper, lower] : kPairs) {
+        int16_t* const first = Block(macroblock, upper);
+        int16_t* const second = Block(macroblock, lower);
+        fTransforms.inverse88(first, Steps(macroblock, upper), first);
+        fTransforms.inverse88(second, Steps(macroblock, lower), second);
+        int16_t joined[kCoefficients / 2];
+        for (int32_t i = 0; i < kCoefficients / 2; ++i) {
+            const int32_t sum = first[2 * i] + first[2 * i + 1] + second[2 * i] + second[2 * i + 1];
+            joined[i] = static_cast<int16_t>((sum + 2) >> 2);
+        }
+        std::copy_n(joined, kCoefficients / 4, first);
+        std::copy_n(joined + kCoefficients / 4, kCoefficients / 4, second);
     }
-    std::copy_n(joined, kCoefficients / 4, first);
-    std::copy_n(joined + kCoefficients / 4, kCoefficients / 4, second);
 }
 
 } // namespace PK

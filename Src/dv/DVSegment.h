@@ -4,9 +4,8 @@
 
 #include "dv/DVPlacement.h"
 #include "dv/DVTables.h"
-#include "primitives/BlockTransforms.h"
-#include "primitives/Coefficients.h"
 #include "primitives/DVHuffman.h"
+#include "primitives/DVTransforms.h"
 #include "primitives/Dispatch.h"
 
 namespace PK {
@@ -57,15 +56,14 @@ private:
 
     void TakeDC(const uint8_t* segment);
     void Parse(const uint8_t* segment);
-    void Dequantise(int16_t* block, int32_t index, uint32_t parameters) const;
+    DVSteps Steps(int32_t macroblock, int32_t block) const;
     void Transform(int32_t macroblock);
-    void JoinHalvedFields(int16_t* first, int16_t* second) const;
+    void JoinHalvedFields(int32_t macroblock);
 
     const DVFormat& fFormat;
     DVSize fSize;
     const DVHuffmanTable& fTable = DVCodeTable();
-    const BlockTransformKernels& fTransforms = Best<BlockTransformKernels>();
-    const CoefficientKernels& fProducts = Best<CoefficientKernels>();
+    const DVTransformKernels& fTransforms = Best<DVTransformKernels>();
     bool fHasLinesInTurns[kMacroblocksOfSegment] = {};
     uint32_t fParameters[kMostBlocks] = {};
     alignas(64) int16_t fCoefficients[kMostBlocks * kCoefficients] = {};

@@ -66,8 +66,9 @@ constexpr double WeightProduct(int32_t mode, int32_t place) {
 
 using DVFactors = std::array<int16_t, kCoefficients>;
 
-/// What a level is multiplied by, with 8 fractional bits, by mode and row: the step, and the inverse of half the weight.
-/// That of DC is 2 once DC, which has a step of 4, was doubled.
+/// What a level is multiplied by, in 256ths, by mode and row: the step, and the inverse of half the weight. DC, whose step
+/// is 4, has half of it here.
+inline constexpr float kDVDequantUnit = 256;
 inline constexpr auto kDVDequant = [] {
     std::array<std::array<DVFactors, kDVQuantRows>, kDVModes> factors{};
     for (int32_t mode = 0; mode < kDVModes; ++mode)
@@ -110,6 +111,7 @@ static_assert(kWeights248[8] == 30273 && kWeights248[10] == 27969 && kWeights248
 
 /// DV100: what a step is multiplied by, in 32nds, by place. 720 chroma at column 5, line 4 is not as its mirror; streams
 /// have it so.
+inline constexpr float kDV100WeightUnit = 32;
 enum class DV100Table : uint8_t { Luma1080, Chroma1080, Luma720, Chroma720 };
 inline constexpr DVFactors kDV100Weights[4] = {
     {128, 16, 17, 18,  18, 19, 42, 44, 16, 17, 18,  18,  19, 38, 43, 45, 17,  18,  19,  19, 40, 41,

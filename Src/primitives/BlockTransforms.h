@@ -30,11 +30,6 @@ struct BlockTransformKernels {
     using Transform = void (*)(const int16_t* source, int16_t* destination);
     Transform forward8x8, inverse8x8, forward248, inverse248;
 
-    /// Half the size: the inverse of the first four coefficients of the first four lines alone, on four samples of four
-    /// lines, whose mean is that of the block. In 2-4-8 mode these lines are the sums, and so the samples the means of
-    /// neighbouring lines.
-    Transform reduced;
-
     static constexpr const char* kFamily = "BlockTransform";
     static constexpr Offer kOffer = Offer::flags;
     template <Target>

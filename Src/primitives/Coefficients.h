@@ -6,20 +6,11 @@
 
 namespace PK {
 
-/// What products are multiplied by before they are scaled.
-struct StepAndScale {
-    int32_t step;  ///< so small that products stay in 32 bits
-    int32_t scale; ///< 1 to 31
-};
-
 /// The bodies of one target. They check nothing but the count; a caller with many blocks takes
 /// Best<CoefficientKernels>() once and calls these.
 struct CoefficientKernels {
     uint32_t (*countZeros8x8)(const int16_t* block);
     RowKernelWith<int32_t> multiplyScaled16s; ///< Factors, the data that they multiply, and the scale.
-
-    /// data[i] = data[i] x factors[i] x step / 2^scale, as multiplyScaled16s rounds and saturates.
-    RowKernelWith<StepAndScale> multiplySteps;
 
     static constexpr const char* kFamily = "Coefficient";
     static constexpr Offer kOffer = Offer::flags;

@@ -53,13 +53,6 @@ struct Divided {
     }
 };
 
-struct SteppedAndDivided {
-    int32_t step;
-    Divided division;
-
-    I32 Apply(I32 x) const { return division.Apply(x * Ints(step)); }
-};
-
 /// x times 2^bits for bits from 0 to 15, where what passes 16 bits may saturate first.
 struct Multiplied {
     int32_t bits;
@@ -78,11 +71,7 @@ void MultiplyScaled(const void* factors, void* data, ptrdiff_t count, const int3
     }
 }
 
-void MultiplySteps(const void* factors, void* data, ptrdiff_t count, const StepAndScale& by) {
-    RunRow(ScaledProduct<SteppedAndDivided>({by.step, {by.scale}}), count, data, factors);
-}
-
-constexpr CoefficientKernels kKernels = {CountZeros, MultiplyScaled, MultiplySteps};
+constexpr CoefficientKernels kKernels = {CountZeros, MultiplyScaled};
 
 } // namespace
 } // namespace PK_TARGET

@@ -16,6 +16,12 @@ constexpr uint32_t kLongPrefixBits = kWindowBits - kIndexBits;
 constexpr int32_t kPlaces = 64;
 constexpr uint8_t kPastTheEnd = 2 * kPlaces; // an advance that no two others add up to
 
+constexpr int32_t kMacroblocks = 5;
+constexpr int32_t kBlockBytes = 80; // of a DIF block
+constexpr int32_t kSegmentBytes = kMacroblocks * kBlockBytes;
+constexpr int32_t kFirstArea = 4;
+constexpr uint32_t kHeadBits = 12; // DC, mode and class
+
 /// The first bits of a window of 16.
 constexpr uint32_t Leading(uint32_t window, uint32_t bits) {
     return window >> (kWindowBits - bits);
@@ -55,19 +61,55 @@ constexpr DVHuffmanTable::Pair PairOf(Symbol first, Symbol second) {
             first.bits,    static_cast<uint8_t>(first.bits + second.bits)};
 }
 
-/// At least 57 bits from a position on, the first of them highest.
-uint64_t Window(const uint8_t* data, uint32_t position) {
+uint64_t WordAt(const uint8_t* data) {
     uint64_t word;
-    std::memcpy(&word, data + position / 8, sizeof word);
-    return __builtin_bswap64(word) << (position % 8);
+    std::memcpy(&word, data, sizeof word);
+    return __builtin_bswap64(word);
 }
 
-/// Bits that are still to be read, with eight bytes of memory behind them.
+/// What a window may load of what lies behind its bits.
+constexpr int32_t kReadAhead = 16;
+
+/// Bits that nobody has read, with kReadAhead bytes of memory behind them.
 struct BitRange {
     const uint8_t* data;
     uint32_t position, end;
+};
 
-    uint32_t Count() const { return end - position; }
+/// The next bits, highest first, and how many of them are there.
+class BitWindow {
+public:
+    explicit BitWindow(BitRange range) : BitWindow(0, 0, range) {}
+
+    /// \param bits   of which the first `count` come before those of the range; the others are 0.
+    /// \param count  at most 48
+    BitWindow(uint64_t bits, uint32_t count, BitRange range) : fNext(range.data + range.position / 8 + 1) {
+        const uint32_t read = range.position % 8;
+        const uint64_t first = uint64_t{range.data[range.position / 8]} << (56 + read);
+        fBits = bits | first >> count;
+        fCount = count + 8 - read;
+        Refill();
+    }
+
+    /// To at least 56 bits.
+    void Refill() {
+        fBits |= WordAt(fNext) >> fCount;
+        fNext += (63 - fCount) / 8;
+        fCount |= 56;
+    }
+    void Skip(uint32_t count) {
+        fBits <<= count;
+        fCount -= count;
+    }
+    uint64_t Leading(uint32_t count) const { return fBits >> (64 - count); }
+
+    /// The first bits, fewer than 56, with zeros behind them.
+    uint64_t Cut(uint32_t count) const { return count == 0 ? 0 : Leading(count) << (64 - count); }
+
+private:
+    const uint8_t* fNext;
+    uint64_t fBits;
+    uint32_t fCount;
 };
 
 /// A block as far as it was parsed.
@@ -81,97 +123,103 @@ struct Block {
     uint64_t cut;     ///< begins with them
 };
 
-/// Reads code words until the block is done with or no whole one is left.
-void Parse(const DVHuffmanTable& table, BitRange& bits, Block& block) {
-    const uint8_t* const data = bits.data;
-    const uint32_t end = bits.end, stop = block.stop;
-    uint32_t position = bits.position, place = block.place;
+/// Reads code words until the block is done with or no whole one is left: then it keeps what there is of the next.
+/// \param left  the bits of the window that may be read.
+/// \return those that were not.
+uint32_t Parse(const DVHuffmanTable& table, BitWindow window, uint32_t left, Block& block) {
+    int16_t* const coefficients = block.coefficients;
+    const uint8_t* const scan = block.scan;
+    const uint32_t stop = block.stop;
+    uint32_t place = block.place;
+    bool isDone = false;
     for (;;) {
-        const uint64_t window = Window(data, position);
-        const DVHuffmanTable::Pair pair = table.pairs[window >> (64 - kIndexBits)];
+        const DVHuffmanTable::Pair pair = table.pairs[window.Leading(kIndexBits)];
         const uint32_t last = place + pair.advance;
-        if (last < stop && position + pair.bits <= end) [[likely]] {
-            block.coefficients[block.scan[place + pair.firstAdvance]] = pair.firstLevel;
-            block.coefficients[block.scan[last]] = pair.secondLevel;
+        if (last < stop && pair.bits <= left) [[likely]] {
+            coefficients[scan[place + pair.firstAdvance]] = pair.firstLevel;
+            coefficients[scan[last]] = pair.secondLevel;
             place = last;
-            position += pair.bits;
+            left -= pair.bits;
+            window.Skip(pair.bits);
+            window.Refill();
             continue;
         }
         Symbol symbol = {pair.firstLevel, pair.firstAdvance, pair.firstBits};
-        if (symbol.bits == 0)
-            symbol = table.longCodes[(window >> (64 - kWindowBits)) & ((1 << kIndexBits) - 1)];
-        if (position + symbol.bits > end) break;
-        position += symbol.bits;
+        if (symbol.bits == 0) symbol = table.longCodes[window.Leading(kWindowBits) & ((1 << kIndexBits) - 1)];
+        if (symbol.bits > left) break;
+        left -= symbol.bits;
+        window.Skip(symbol.bits);
         place += symbol.advance;
-        if (place < kPlaces) block.coefficients[block.scan[place]] = symbol.level;
+        if (place < kPlaces) coefficients[scan[place]] = symbol.level;
+        if (place < stop && pair.bits > symbol.bits) {
+            // The second code word of a pair, which has no room or is the last.
+            const uint32_t bits = pair.bits - uint32_t{symbol.bits};
+            if (bits > left) break;
+            left -= bits;
+            place = last;
+            if (place < kPlaces) coefficients[scan[place]] = pair.secondLevel;
+        }
         if (place >= stop) {
-            block.isDone = true;
+            isDone = true;
             break;
         }
+        window.Refill();
     }
-    bits.position = position;
     block.place = place;
+    block.isDone = isDone;
+    block.cutBits = isDone ? 0 : left;
+    block.cut = window.Cut(block.cutBits);
+    return isDone ? left : 0;
 }
 
 /// Spare bits of a macroblock or a segment, one behind the other.
+template <int32_t kBytes>
 class BitPool {
 public:
-    void Clear() { fPosition = fEnd = kHeadBits; }
+    /// Without a branch for what an area leaves, since nobody can guess how much it is.
+    void AppendArea(BitRange range) {
+        static_assert(2 * kMost >= 8 * 14, "an area");
+        const uint32_t count = range.end - range.position, first = std::min(count, kMost);
+        AppendBits(range.data, range.position, first);
+        AppendBits(range.data, range.position + first, count - first);
+    }
 
-    void Append(BitRange bits) {
-        constexpr uint32_t kMost = 56; // that a word takes at any position
-        while (bits.position < bits.end) {
-            const uint32_t count = std::min(bits.Count(), kMost);
-            Replace(fEnd, Window(bits.data, bits.position), count);
-            fEnd += count;
-            bits.position += count;
-        }
+    void Append(BitRange range) {
+        for (; range.end - range.position > kMost; range.position += kMost)
+            AppendBits(range.data, range.position, kMost);
+        AppendBits(range.data, range.position, range.end - range.position);
     }
 
     BitRange Rest() const { return {fBytes, fPosition, fEnd}; }
 
-    /// Goes on with a block: the code word that it was cut in is put before what the pool still has.
-    void Continue(const DVHuffmanTable& table, Block& block) {
-        fPosition -= block.cutBits;
-        Replace(fPosition, block.cut, block.cutBits);
-        BitRange bits = Rest();
-        Parse(table, bits, block);
-        if (!block.isDone) Cut(bits, block);
-        fPosition = bits.position;
-    }
-
-    /// Keeps what is left of bits that end in a code word of the block.
-    static void Cut(BitRange& bits, Block& block) {
-        block.cutBits = bits.Count();
-        block.cut = Window(bits.data, bits.position);
-        bits.position = bits.end;
+    /// Goes on with blocks that are not done with, in the code word that each was cut in, as long as there are bits.
+    template <size_t kBlocks>
+    void Continue(const DVHuffmanTable& table, Block (&blocks)[kBlocks]) {
+        for (Block& block : blocks) {
+            if (fPosition == fEnd) return;
+            if (block.isDone) continue;
+            const BitWindow window(block.cut, block.cutBits, Rest());
+            fPosition = fEnd - Parse(table, window, block.cutBits + fEnd - fPosition, block);
+        }
     }
 
 private:
-    static constexpr uint32_t kHeadBits = 64; // room to put bits back
+    static constexpr uint32_t kMost = 56; // bits that a word has at any position
 
-    /// Puts the first bits of a word to a position.
-    void Replace(uint32_t position, uint64_t bits, uint32_t count) {
-        if (count == 0) return;
-        uint8_t* const place = fBytes + position / 8;
-        uint64_t word;
-        std::memcpy(&word, place, sizeof word);
-        word = __builtin_bswap64(word);
-        const uint32_t shift = position % 8;
-        const uint64_t mask = ~uint64_t{0} << (64 - count) >> shift;
-        word = __builtin_bswap64((word & ~mask) | (bits >> shift & mask));
-        std::memcpy(place, &word, sizeof word);
+    void AppendBits(const uint8_t* data, uint32_t position, uint32_t count) {
+        const uint64_t bits = WordAt(data + position / 8) << position % 8 & ~(~uint64_t{0} >> count);
+        const uint64_t word = fBegun | bits >> fEnd % 8;
+        const uint64_t bytes = __builtin_bswap64(word);
+        std::memcpy(fBytes + fEnd / 8, &bytes, sizeof bytes);
+        const uint32_t end = fEnd + count;
+        fBegun = word << 8 * (end / 8 - fEnd / 8);
+        fEnd = end;
     }
 
-    uint8_t fBytes[kHeadBits / 8 + 400 + 8] = {};
-    uint32_t fPosition = kHeadBits, fEnd = kHeadBits;
+    uint8_t fBytes[kBytes + kReadAhead] = {};
+    uint64_t fBegun = 0; ///< bits of the last byte, highest first
+    uint32_t fPosition = 0, fEnd = 0;
 };
-
-constexpr int32_t kMacroblocks = 5;
-constexpr int32_t kBlockBytes = 80; // of a DIF block
-constexpr int32_t kSegmentBytes = kMacroblocks * kBlockBytes;
-constexpr int32_t kFirstArea = 4;
-constexpr uint32_t kHeadBits = 12; // DC, mode and class
 
 struct Layout50 {
     static constexpr uint8_t kAreaBytes[] = {14, 14, 14, 14, 10, 10};
@@ -180,82 +228,120 @@ struct Layout100 {
     static constexpr uint8_t kAreaBytes[] = {10, 10, 10, 10, 10, 10, 8, 8};
 };
 
+/// Where the parse of a segment takes its scans from, by the mode, and writes to.
+struct Target {
+    const uint8_t* scans[2];
+    int16_t* coefficients;
+    uint32_t* parameters;
+};
+
+constexpr DVParseDepth kWhole = {};
+
 template <class Layout>
 class Segment {
 public:
-    static constexpr int32_t kBlocks = std::size(Layout::kAreaBytes); // of a macroblock
-
-    Segment(const uint8_t* segment, const DVHuffmanTable& table) : fTable(table) {
+    Segment(const uint8_t* segment, const DVHuffmanTable& table, const Target& target)
+        : fTable(table), fTarget(target) {
         std::memcpy(fBytes, segment, kSegmentBytes);
     }
 
-    /// Each block in its own area.
-    /// \param scans  by the mode; of one mode, the same twice.
-    /// \return whether all are done with.
-    bool ParseAreas(const uint8_t* const (&scans)[2], int16_t* coefficients, uint32_t* parameters,
-                    const uint8_t (&stops)[2]) {
+    void Parse() {
         bool isDone = true;
+        for (int32_t i = 0; i < kMacroblocks; ++i) isDone = ParseAreas(i, kWhole) && isDone;
+        if (!isDone) ParseSpareBits();
+    }
+
+    /// Until every block has reached the last place that is wanted. Most do so in their own areas; where one does not, only
+    /// whole blocks tell what they leave to others.
+    void ParseTo(DVParseDepth depth) {
         for (int32_t i = 0; i < kMacroblocks; ++i) {
-            const uint8_t* const block = fBytes + kBlockBytes * i;
-            const uint32_t quantiser = block[kFirstArea - 1] & 0xf;
-            const uint8_t* area = block + kFirstArea;
-            for (int32_t j = 0; j < kBlocks; ++j, coefficients += kPlaces) {
-                const uint32_t mode = area[1] >> 6 & 1;
-                *parameters++ = area[1] | quantiser << 16;
-                coefficients[0] = static_cast<int16_t>(static_cast<int16_t>(area[0] << 8 | area[1]) >> 7);
-                Block& parsed = fBlocks[i][j];
-                parsed = {coefficients, scans[mode], 0, stops[mode], false, 0, 0};
-                BitRange& rest = fRest[i][j];
-                const auto begin = static_cast<uint32_t>(area - fBytes) * 8;
-                area += Layout::kAreaBytes[j];
-                rest = {fBytes, begin + kHeadBits, static_cast<uint32_t>(area - fBytes) * 8};
-                Parse(fTable, rest, parsed);
-                if (!parsed.isDone) {
-                    BitPool::Cut(rest, parsed);
-                    isDone = false;
-                }
-            }
+            if (ParseAreas(i, depth)) continue;
+            if (!ParseAgain(i)) ParseSpareBitsOfMacroblock(i);
+            if (HasReached(i, depth)) continue;
+            return ParseAllAgain();
+        }
+    }
+
+private:
+    static constexpr int32_t kBlocks = std::size(Layout::kAreaBytes); // of a macroblock
+
+    /// The blocks of a macroblock, each in its own area.
+    /// \return whether all are done with.
+    bool ParseAreas(int32_t macroblock, DVParseDepth depth) {
+        bool isDone = true;
+        const uint8_t* area = fBytes + kBlockBytes * macroblock + kFirstArea;
+        const uint32_t quantiser = area[-1] & 0xf;
+        for (int32_t i = 0; i < kBlocks; ++i) {
+            const bool is248 = (area[1] & 0x40) != 0;
+            const int32_t index = kBlocks * macroblock + i;
+            int16_t* const coefficients = fTarget.coefficients + kPlaces * index;
+            fTarget.parameters[index] = area[1] | quantiser << 16;
+            coefficients[0] = static_cast<int16_t>(static_cast<int16_t>(area[0] << 8 | area[1]) >> 7);
+            const uint32_t stop = is248 ? depth.stop248 : depth.stop88;
+            Block& block = fBlocks[macroblock][i];
+            block = {coefficients, fTarget.scans[is248 ? 1 : 0], 0, stop, false, 0, 0};
+            const auto begin = static_cast<uint32_t>(area - fBytes) * 8;
+            area += Layout::kAreaBytes[i];
+            const BitRange codes = {fBytes, begin + kHeadBits, static_cast<uint32_t>(area - fBytes) * 8};
+            const uint32_t left = PK::Parse(fTable, BitWindow(codes), codes.end - codes.position, block);
+            fRest[macroblock][i] = {fBytes, codes.end - left, codes.end};
+            isDone = isDone && block.isDone;
         }
         return isDone;
     }
 
-    /// Goes on with the blocks that are not done with in what the others leave.
-    void ParseSpareBits() {
-        BitPool ofSegment;
-        for (int32_t i = 0; i < kMacroblocks; ++i) {
-            fPool.Clear();
-            for (const BitRange& rest : fRest[i]) fPool.Append(rest);
-            for (Block& block : fBlocks[i])
-                if (!block.isDone) fPool.Continue(fTable, block);
-            ofSegment.Append(fPool.Rest());
-        }
-        for (auto& blocks : fBlocks)
-            for (Block& block : blocks)
-                if (!block.isDone) ofSegment.Continue(fTable, block);
+    /// To the end of the blocks.
+    bool ParseAgain(int32_t macroblock) {
+        std::fill_n(fTarget.coefficients + kBlocks * macroblock * kPlaces, kBlocks * kPlaces, int16_t{0});
+        return ParseAreas(macroblock, kWhole);
     }
 
-private:
+    void ParseAllAgain() {
+        for (int32_t i = 0; i < kMacroblocks; ++i) ParseAgain(i);
+        for (auto& pool : fPools) pool = {};
+        ParseSpareBits();
+    }
+
+    bool HasReached(int32_t macroblock, DVParseDepth depth) const {
+        return std::ranges::all_of(fBlocks[macroblock], [&](const Block& block) {
+            return block.place >= (block.scan == fTarget.scans[0] ? depth.stop88 : depth.stop248);
+        });
+    }
+
+    /// Goes on with the blocks of a macroblock that are not done with in what its others leave; the rest stays in the pool.
+    void ParseSpareBitsOfMacroblock(int32_t macroblock) {
+        BitPool<kBlockBytes>& pool = fPools[macroblock];
+        for (const BitRange& rest : fRest[macroblock]) pool.AppendArea(rest);
+        pool.Continue(fTable, fBlocks[macroblock]);
+    }
+
+    /// And with those that are left in what all macroblocks leave.
+    void ParseSpareBits() {
+        for (int32_t i = 0; i < kMacroblocks; ++i) ParseSpareBitsOfMacroblock(i);
+        BitPool<kSegmentBytes> ofSegment;
+        for (const auto& pool : fPools) ofSegment.Append(pool.Rest());
+        for (auto& blocks : fBlocks) ofSegment.Continue(fTable, blocks);
+    }
+
     const DVHuffmanTable& fTable;
-    uint8_t fBytes[kSegmentBytes + 8] = {};
+    const Target& fTarget;
+    uint8_t fBytes[kSegmentBytes + kReadAhead] = {};
     Block fBlocks[kMacroblocks][kBlocks];
     BitRange fRest[kMacroblocks][kBlocks];
-    BitPool fPool;
+    BitPool<kBlockBytes> fPools[kMacroblocks];
 };
 
 template <class Layout>
-int32_t DecodeSegment(const uint8_t* segment, const uint8_t* const (&scans)[2], const DVHuffmanTable* table,
-                      int16_t* coefficients, uint32_t* blockParams, DVParseDepth depth) {
-    if (segment == nullptr || table == nullptr || coefficients == nullptr || blockParams == nullptr)
+int32_t DecodeSegment(const uint8_t* segment, const DVHuffmanTable* table, const Target& target,
+                      DVParseDepth depth) {
+    if (segment == nullptr || table == nullptr || target.coefficients == nullptr ||
+        target.parameters == nullptr)
         return kStatusNullPointer;
-    Segment<Layout> parse(segment, *table);
-    if (parse.ParseAreas(scans, coefficients, blockParams, {depth.stop88, depth.stop248})) return kStatusOk;
-    constexpr uint8_t kAll = DVParseDepth::kAll;
-    if (depth.stop88 != kAll) {
-        // Only whole blocks tell what they leave to others.
-        std::fill_n(coefficients, kMacroblocks * Segment<Layout>::kBlocks * kPlaces, int16_t{0});
-        if (parse.ParseAreas(scans, coefficients, blockParams, {kAll, kAll})) return kStatusOk;
-    }
-    parse.ParseSpareBits();
+    Segment<Layout> parse(segment, *table, target);
+    if (depth.stop88 == kWhole.stop88)
+        parse.Parse();
+    else
+        parse.ParseTo(depth);
     return kStatusOk;
 }
 
@@ -283,14 +369,14 @@ int32_t InitDVHuffmanTable(std::span<const DVCode> codes, const DVEscape (&escap
 
 int32_t HuffmanDecodeSegmentDV(const uint8_t* segment, const DVScan (&scans)[2], const DVHuffmanTable* table,
                                int16_t* coefficients, uint32_t* blockParams, DVParseDepth depth) noexcept {
-    return DecodeSegment<Layout50>(segment, {scans[0].data(), scans[1].data()}, table, coefficients,
-                                   blockParams, depth);
+    return DecodeSegment<Layout50>(segment, table,
+                                   {{scans[0].data(), scans[1].data()}, coefficients, blockParams}, depth);
 }
 
 int32_t HuffmanDecodeSegmentDV100(const uint8_t* segment, const DVScan& scan, const DVHuffmanTable* table,
                                   int16_t* coefficients, uint32_t* blockParams, DVParseDepth depth) noexcept {
     depth.stop248 = depth.stop88;
-    return DecodeSegment<Layout100>(segment, {scan.data(), scan.data()}, table, coefficients, blockParams,
+    return DecodeSegment<Layout100>(segment, table, {{scan.data(), scan.data()}, coefficients, blockParams},
                                     depth);
 }
 

@@ -1,0 +1,35 @@
+#pragma once
+
+// From the levels of a block of DV to its samples.
+
+#include "primitives/simd/Targets.h"
+
+#include <cstdint>
+
+namespace PK {
+
+/// What the levels of a block are multiplied by: a factor each, and a step for all. The factor of DC is 0, since DC is 8
+/// samples in steps of 4 whatever the others are.
+struct DVSteps {
+    const float* factors; ///< 64
+    float step;
+};
+
+/// The bodies of one target. Levels times factors, rounded to integers, are coefficients of the orthonormal transforms
+/// (BlockTransforms.h), whose inverse gives the samples: 64 around 0, rounded too, by the current rounding mode, and
+/// saturated to 16 bits. Source and destination may be the same block.
+struct DVTransformKernels {
+    using Transform = void (*)(const int16_t* levels, const DVSteps& steps, int16_t* samples);
+    Transform inverse88, inverse248;
+
+    /// Half the size, of either mode: four lines of four samples, from the first four coefficients of the first four lines
+    /// alone; their mean is that of the block. In 2-4-8 mode these are the sums of lines.
+    Transform half;
+
+    static constexpr const char* kFamily = "DVTransform";
+    static constexpr Offer kOffer = Offer::flags;
+    template <Target>
+    static const DVTransformKernels& For(); // DVTransforms.kernels.cpp
+};
+
+} // namespace PK
