@@ -1,6 +1,7 @@
 // Fills with black and white, opaque and transparent.
 
 #include "convert/FillImage.h"
+#include "dv/BlackDVFrame.h"
 
 #include <PixelKiln/Fills.h>
 
@@ -67,13 +68,16 @@ PK_Result FillRaster(const DestinationImage& image, Colour colour) {
     return FillWithUnits(image, unit, image.width / unit.pixels);
 }
 
-/// Encoded black frames come with the encoder.
-PK_Result FillDV25() {
-    return PK_ErrNotSupported;
+/// Black, whatever the colour, and the whole frame, whatever the size: a frame has its own.
+PK_Result FillDV25(const DestinationImage& image) {
+    if (image.pixels == nullptr) return PK_ErrFailed;
+    std::ranges::copy(BlackDVFrame(image.format), image.pixels);
+    return PK_Success;
 }
 
 PK_Result FillStream(const DestinationImage& image, Colour colour) {
-    if (image.format == PK_PixelFormat_NTSCDV25 || image.format == PK_PixelFormat_PALDV25) return FillDV25();
+    if (image.format == PK_PixelFormat_NTSCDV25 || image.format == PK_PixelFormat_PALDV25)
+        return FillDV25(image);
     if (StreamKind(image.format) <= kStreamLastDV) return PK_Success; // deliberately left as it is
     if (Is420Planar(image.format)) return FillPlanes(image, CodesOf(colour.shade));
     return PK_ErrBadSrcFormat;

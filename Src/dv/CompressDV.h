@@ -13,7 +13,7 @@ namespace PK {
 /// \param isDVCPRO   SMPTE 314M: 4:1:1 for 625 lines too.
 /// \param quality    below 3 a quick result.
 /// \return PK_Success; PK_ErrBadSrcFormat where dstFormat is no DV25; PK_ErrSizeMismatch; PK_ErrBadDstFormat for another
-///         format of pixels; PK_ErrBadDVDestination where the encoder does not write as many bytes.
+///         format of pixels; PK_ErrBadDVDestination where the encoder does not write as many bytes; what it reports besides.
 PK_Result CompressDV25(const void* src, int32_t rowBytes, PK_PixelFormat format, int32_t width,
                        int32_t height, void* dst, int32_t dstBytes, PK_PixelFormat dstFormat, bool isDVCPRO,
                        int32_t quality) noexcept;

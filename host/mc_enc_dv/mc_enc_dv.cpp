@@ -46,7 +46,7 @@ constexpr bool IsPairs(uint32_t fourcc) {
 }
 
 /// Rows from the top of the picture, as a conversion from their format takes them.
-bool ToYUYV(const Picture& from, const TransientPixelBuffer& buffer) {
+PK_Result ToYUYV(const Picture& from, const TransientPixelBuffer& buffer) {
     const PK_PixelFormat format = FormatOfPixels(from);
     const uint8_t* first = from.pixels;
     int32_t rowBytes = from.rowBytes;
@@ -56,7 +56,7 @@ bool ToYUYV(const Picture& from, const TransientPixelBuffer& buffer) {
     }
     constexpr int32_t kAnyQuality = 0;
     return PK_Convert(first, rowBytes, format, buffer.Pixels(), buffer.RowBytes(), PK_PixelFormat_YUYV_422_8u,
-                      from.width, from.height, kAnyQuality) == PK_Success;
+                      from.width, from.height, kAnyQuality);
 }
 
 struct Job {
@@ -72,17 +72,17 @@ struct Job {
     }
 
 private:
-    static constexpr int32_t kNothing = 0;
-
     int32_t RunConverted(const Picture& picture) const {
         const TransientPixelBuffer buffer(PK_PixelFormat_YUYV_422_8u, picture.width, picture.height);
-        if (buffer.Result() != PK_Success || !ToYUYV(picture, buffer)) return kNothing;
+        if (buffer.Result() != PK_Success) return buffer.Result();
+        const PK_Result result = ToYUYV(picture, buffer);
+        if (result != PK_Success) return result;
         return Run({buffer.Pixels(), buffer.RowBytes(), picture.width, picture.height, kYUYV, false});
     }
 
     int32_t RunDoubled(const Picture& picture) const {
         const TransientPixelBuffer buffer(PK_PixelFormat_YUYV_422_8u, format.width, format.height);
-        if (buffer.Result() != PK_Success) return kNothing;
+        if (buffer.Result() != PK_Success) return buffer.Result();
         DoublePicture({picture.pixels, picture.rowBytes, picture.fourcc == kYUYV}, picture.width,
                       picture.height, buffer.Pixels(), buffer.RowBytes());
         return Run({buffer.Pixels(), buffer.RowBytes(), format.width, format.height, kYUYV, false});

@@ -7,6 +7,8 @@
 /// time, whatever the number of threads that ask for it, and holds a lock over the call: an encoder needs none. It may call
 /// the library's exported functions, but none that encodes DV25, starts or stops it.
 
+#include <PixelKiln/Types.h>
+
 #include <cstdint>
 
 namespace mc_enc_dv {
@@ -51,7 +53,8 @@ void Close(Handle encoder) noexcept;
 /// \param flags     see above.
 /// \param fourcc    kYUYV, kUYVY, kVUYA or kBGRA.
 /// The arguments without a name are 0.
-/// \return the bytes written; another number than dstBytes where the frame could not be made.
+/// \return the bytes written; another number than dstBytes where the frame could not be made, and a negative one to say by a
+///         PK_Result why, as PK_ErrOutOfMemory.
 int32_t Encode(Handle encoder, const void* pixels, int32_t rowBytes, void* dst, int32_t dstBytes,
                int32_t width, int32_t height, int32_t, int32_t flags, uint32_t fourcc, int32_t,
                int32_t) noexcept;

@@ -25,7 +25,7 @@ extern "C" {
 /// | V210                    | whole groups of six pixels up to the width, each sample 4 times the 8-bit one |
 /// | planar 4:2:0            | width bytes of Y in each row; width / 2 bytes of U and V in height / 2 rows,
 ///                             placed as PK_GetPlanarBuffers does; the same codes for full range |
-/// | NTSCDV25, PALDV25       | not offered yet: PK_ErrNotSupported |
+/// | NTSCDV25, PALDV25       | an encoded frame of black, whatever the fill, the width and the height |
 /// | other DV                | nothing, with PK_Success |
 ///
 /// \param buffer    the image.
@@ -36,7 +36,7 @@ extern "C" {
 /// \return
 ///  - PK_Success: filled. A width or height of 0 does nothing, with any buffer.
 ///  - PK_ErrBadSrcFormat: a stream that is neither DV nor a well-formed planar 4:2:0 format.
-///  - PK_ErrNotSupported: any other depth or layout, RGB_444_10u among them; a DV25 stream.
+///  - PK_ErrNotSupported: any other depth or layout, RGB_444_10u among them.
 ///  - PK_ErrFailed: a null buffer, a negative width or height, a width too great, or planes too large for 32 bits.
 ///  Nothing is written unless the result is PK_Success.
 PK_API PK_Result PK_FillWithOpaqueBlack(void* buffer, int32_t rowBytes, int32_t width, int32_t height,
