@@ -70,7 +70,7 @@ int32_t FirstChannel(const uint8_t* frame, const DVFormat& format) {
 /// Decodes the segments that have some of the picture, one after the other.
 /// \param write  takes the decoded segment and the places of its macroblocks.
 template <class Write>
-void ForEachSegment(const uint8_t* frame, const DVPicture& picture, const Write& write) {
+void ForEachSegment(const uint8_t* frame, const DecodedPicture& picture, const Write& write) {
     const DVFormat& format = picture.format;
     const int32_t firstChannel = FirstChannel(frame, format);
     DVDecodeState state(format, picture.size);
@@ -91,7 +91,7 @@ struct Lines {
 };
 
 /// The wanted ones of a block whose first line is row y of the picture, and the next so many rows further on.
-Lines LinesAt(const DVPicture& picture, int32_t y, int32_t lineStep) {
+Lines LinesAt(const DecodedPicture& picture, int32_t y, int32_t lineStep) {
     const int32_t side = SideOfBlock(picture.size);
     if (picture.field == 0) return {0, 1, side, y, lineStep};
     const int32_t parity = picture.field - 1;
@@ -101,7 +101,7 @@ Lines LinesAt(const DVPicture& picture, int32_t y, int32_t lineStep) {
 
 class PlaneWriter {
 public:
-    PlaneWriter(const DVPicture& picture, const DestinationPlanes& planes)
+    PlaneWriter(const DecodedPicture& picture, const DestinationPlanes& planes)
         : fPicture(picture), fPlanes(planes) {}
 
     void operator()(const DVDecodeState& state, const DVPlace (&places)[kMacroblocksOfSegment]) const {
@@ -148,14 +148,14 @@ private:
         }
     }
 
-    const DVPicture& fPicture;
+    const DecodedPicture& fPicture;
     const DestinationPlanes& fPlanes;
     const DVMacroblockKernels& fKernels = Best<DVMacroblockKernels>();
 };
 
 class YUYVWriter {
 public:
-    YUYVWriter(const DVPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes)
+    YUYVWriter(const DecodedPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes)
         : fPicture(picture), fPixels(pixels), fRowBytes(rowBytes) {}
 
     void operator()(const DVDecodeState& state, const DVPlace (&places)[kMacroblocksOfSegment]) const {
@@ -201,7 +201,7 @@ private:
         PackMacroblocksDV100(state.Block(0, 0), pieces);
     }
 
-    const DVPicture& fPicture;
+    const DecodedPicture& fPicture;
     uint8_t* fPixels;
     ptrdiff_t fRowBytes;
 };
@@ -216,7 +216,7 @@ struct PlaneSizes {
     }
 };
 
-PlaneSizes SizesOf(const DVPicture& picture) {
+PlaneSizes SizesOf(const DecodedPicture& picture) {
     const int32_t width = picture.Width(), height = picture.Height();
     const int32_t sharing = 1 << picture.format.ChromaShift();
     const bool is420 = picture.format.sampling == DVSampling::k420;
@@ -225,7 +225,7 @@ PlaneSizes SizesOf(const DVPicture& picture) {
 
 } // namespace
 
-DestinationPlanes DVPlanesIn(uint8_t* block, const DVPicture& picture) {
+DestinationPlanes DVPlanesIn(uint8_t* block, const DecodedPicture& picture) {
     const PlaneSizes sizes = SizesOf(picture);
     uint8_t* const u = block + sizes.LumaBytes();
     const int32_t chromaWidth = sizes.chromaWidth, chromaHeight = sizes.chromaHeight;
@@ -234,16 +234,16 @@ DestinationPlanes DVPlanesIn(uint8_t* block, const DVPicture& picture) {
              {u + sizes.ChromaBytes(), chromaWidth, chromaWidth, chromaHeight}}};
 }
 
-size_t DVPlanesBytes(const DVPicture& picture) {
+size_t DVPlanesBytes(const DecodedPicture& picture) {
     const PlaneSizes sizes = SizesOf(picture);
     return sizes.LumaBytes() + 2 * sizes.ChromaBytes();
 }
 
-void DecodeDVToPlanes(const uint8_t* frame, const DVPicture& picture, const DestinationPlanes& planes) {
+void DecodeDVToPlanes(const uint8_t* frame, const DecodedPicture& picture, const DestinationPlanes& planes) {
     ForEachSegment(frame, picture, PlaneWriter(picture, planes));
 }
 
-void DecodeDVToYUYV(const uint8_t* frame, const DVPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes) {
+void DecodeDVToYUYV(const uint8_t* frame, const DecodedPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes) {
     ForEachSegment(frame, picture, YUYVWriter(picture, pixels, rowBytes));
 }
 

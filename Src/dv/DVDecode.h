@@ -10,7 +10,7 @@
 namespace PK {
 
 /// A size and, of the full one, which lines: 0 all, 1 rows 0, 2, 4 and so on, 2 rows 1, 3, 5 and so on.
-struct DVPicture {
+struct DecodedPicture {
     const DVFormat& format;
     DVSize size;
     int32_t field;
@@ -21,18 +21,18 @@ struct DVPicture {
 
 /// The planes that a picture has, in a block of memory. A sample of chroma is for 2 or 4 luma samples of a row, a last one
 /// for as many as are left; 4:2:0 has a row for every two.
-DestinationPlanes DVPlanesIn(uint8_t* block, const DVPicture& picture);
+DestinationPlanes DVPlanesIn(uint8_t* block, const DecodedPicture& picture);
 
 /// What they take in all.
-size_t DVPlanesBytes(const DVPicture& picture);
+size_t DVPlanesBytes(const DecodedPicture& picture);
 
 /// Whatever the bytes of the frame: what cannot be read stays as far as it came, and damage in a segment changes nothing
 /// outside its five macroblocks.
 /// \param frame  FrameBytes() of the format.
-void DecodeDVToPlanes(const uint8_t* frame, const DVPicture& picture, const DestinationPlanes& planes);
+void DecodeDVToPlanes(const uint8_t* frame, const DecodedPicture& picture, const DestinationPlanes& planes);
 
 /// DV50 and DV100 at full size, to pairs of pixels.
 /// \param pixels  of the first row of the picture.
-void DecodeDVToYUYV(const uint8_t* frame, const DVPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes);
+void DecodeDVToYUYV(const uint8_t* frame, const DecodedPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes);
 
 } // namespace PK
