@@ -56,6 +56,11 @@ void DrawNote(cairo_t* context, const std::string& text, double x, double baseli
     DrawText(context, text, x, baseline, {12, false, Align::Left, kPaleInk});
 }
 
+/// On the line of a heading, up to the margin.
+void DrawRemark(cairo_t* context, const std::string& text, double baseline) {
+    DrawText(context, text, kWidth - kMargin, baseline, {12, false, Align::Right, kPaleInk});
+}
+
 // A frame of DV50 in 525 lines: two channels of ten sequences.
 void DrawFrame(cairo_t* context, double top) {
     constexpr int32_t kChannels = 2, kSequences = 10;
@@ -267,12 +272,12 @@ void DrawDVSequence(const std::string& name) {
         {"DV100",
          {{"Y0", 10}, {"Y1", 10}, {"Y2", 10}, {"Y3", 10}, {"Cr0", 10}, {"Cr1", 10}, {"Cb0", 8}, {"Cb1", 8}}}};
     WritePngDrawing(
-        kWidth, 640,
+        kWidth, 612,
         [&](cairo_t* context) {
             DrawHeading(context, "A frame: channel after channel, each of 10 or 12 sequences", 34);
             DrawFrame(context, 46);
             DrawHeading(context, "A sequence: 150 blocks of 80 bytes", 138);
-            DrawNote(context, "27 segments of five macroblocks, a to e", 320, 138);
+            DrawRemark(context, "27 segments of five macroblocks, a to e", 138);
             DrawSequence(context, 150);
             DrawHeading(context, "A video block: one macroblock, in bytes", 420);
             DrawNote(context, "Q is the quantiser; each area begins with DC, mode and class of its block",
@@ -295,7 +300,7 @@ void DrawDVPlacement(const std::string& name) {
         {*PK::FindDVFormat(PK_PixelFormat_PAL_DV100_1080i), "PAL_DV100_1080i, 1440 x 1080"}};
     constexpr double kGap = 18, kPanel = (kWidth - 2 * kMargin - 2 * kGap) / 3;
     WritePngDrawing(
-        kWidth, 640,
+        kWidth, 620,
         [&](cairo_t* context) {
             DrawHeading(context, "Where the first sequence of the first channel lies", 34);
             DrawNote(context, "In black, its segment 7: five macroblocks, one in each column of the picture",
@@ -310,7 +315,7 @@ void DrawDVPlacement(const std::string& name) {
 
 void DrawDVPasses(const std::string& name) {
     WritePngDrawing(
-        kWidth, 500,
+        kWidth, 462,
         [](cairo_t* context) {
             DrawHeading(context, "What five macroblocks of six blocks need, and the room of their areas", 34);
             DrawNeeds(context, 140);
