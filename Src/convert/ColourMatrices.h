@@ -43,6 +43,8 @@ struct YUVToRGBMatrix {
 
 inline constexpr YUVToRGBMatrix kYUV8ToRGB8_601 = {1.16438f, 2.01723f, -0.391762f, -0.812969f, 1.59603f};
 inline constexpr YUVToRGBMatrix kYUV8ToRGB8_709 = {1.16438f, 2.1124f, -0.213249f, -0.532909f, 1.79274f};
+/// What decoders of DV25 multiply by: the same to one more decimal.
+inline constexpr YUVToRGBMatrix kDVToRGB8 = {1.1643828f, 2.0172305f, -0.39176172f, -0.81296873f, 1.5960274f};
 /// From 8-bit codes to float samples.
 inline constexpr YUVToRGBMatrix kYUV8ToRGB601 = {0.00456621f, 0.00791072f, -0.00153632f, -0.00318811f,
                                                  0.00625893f};

@@ -100,7 +100,7 @@ PK_Result ConvertFromStream(const SourceImage& source, const DestinationImage& d
     constexpr int32_t kWholeFrame = 0;
     if (target.format == destination.format) return DecodeStream(source, kWholeFrame, destination, quality);
     ConversionChain onward;
-    if (Is420Planar(source.format) && onward.Build(target.format, destination.format, quality))
+    if (DecodesRows(source.format) && onward.Build(target.format, destination.format, quality))
         return DecodeStreamThrough(onward, source, kWholeFrame, destination, quality);
 
     const TransientPixelBuffer buffer(target.format, target.width, target.height);

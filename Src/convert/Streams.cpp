@@ -1,11 +1,11 @@
 #include "convert/Streams.h"
 
 #include "convert/ConversionChain.h"
+#include "convert/DVTarget.h"
+#include "convert/DecodeDV.h"
 #include "convert/Planar420.h"
 #include "dv/CompressDV.h"
-
-#include <algorithm>
-#include <iterator>
+#include "dv/DVFormat.h"
 
 namespace PK {
 
@@ -22,42 +22,6 @@ Codec CodecOf(PK_PixelFormat format) {
     };
     const uint32_t kind = StreamKind(format);
     return kind <= kStreamLast420 ? codecs[kind] : Codec::None;
-}
-
-/// A DV format whose decoder gives 4:2:2 at full size and four channels at half size.
-struct DVPicture {
-    PK_PixelFormat stream;
-    int32_t width;
-    int32_t height;
-    PK_PixelFormat native;
-    PK_PixelFormat reduced;
-};
-
-constexpr DVPicture kDVPictures[] = {
-    {PK_PixelFormat_NTSC_DV100_720p, 960, 720, PK_PixelFormat_YUYV_422_8u_709,
-     PK_PixelFormat_VUYA_4444_8u_709},
-    {PK_PixelFormat_PAL_DV100_720p, 960, 720, PK_PixelFormat_YUYV_422_8u_709,
-     PK_PixelFormat_VUYA_4444_8u_709},
-    {PK_PixelFormat_NTSC_DV100_1080i, 1280, 1080, PK_PixelFormat_YUYV_422_8u_709,
-     PK_PixelFormat_VUYA_4444_8u_709},
-    {PK_PixelFormat_PAL_DV100_1080i, 1440, 1080, PK_PixelFormat_YUYV_422_8u_709,
-     PK_PixelFormat_VUYA_4444_8u_709},
-    {PK_PixelFormat_NTSCDV50, 720, 480, PK_PixelFormat_YUYV_422_8u, PK_PixelFormat_VUYA_4444_8u},
-    {PK_PixelFormat_PALDV50, 720, 576, PK_PixelFormat_YUYV_422_8u, PK_PixelFormat_VUYA_4444_8u},
-};
-
-DecodeTarget ChooseDVTarget(const DVPicture& picture, const DecodeTarget& wanted, int32_t quality) {
-    const int32_t halfWidth = picture.width / 2;
-    const int32_t halfHeight = picture.height / 2;
-    const DecodeTarget reduced = {picture.reduced, halfWidth, halfHeight};
-
-    if (wanted.width == picture.width && wanted.height == halfHeight) {
-        return {picture.native, picture.width, halfHeight}; // one field
-    }
-    if (wanted.width <= halfWidth && wanted.height <= halfHeight) return reduced;
-    const bool isSmaller = wanted.width < picture.width && wanted.height < picture.height;
-    if (quality < kExactSizeQuality && isSmaller) return reduced;
-    return {picture.native, picture.width, picture.height};
 }
 
 PK_PixelFormat ChooseDV25Source(PK_PixelFormat source) {
@@ -83,27 +47,24 @@ PK_Result EncodeToPlanes(const SourceImage& source, const DestinationImage& dest
 
 PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wanted, int32_t quality,
                              DecodeTarget& target) noexcept {
-    const auto picture = std::ranges::find(kDVPictures, stream.format, &DVPicture::stream);
-    if (picture != std::end(kDVPictures)) {
-        target = ChooseDVTarget(*picture, wanted, quality);
+    if (FindDVFormat(stream.format) != nullptr) {
+        const bool isDV25 = CodecOf(stream.format) == Codec::DV25;
+        target = isDV25 ? ChooseDV25Target(stream.format, wanted, quality)
+                        : ChooseDVTarget(stream.format, wanted, quality);
         return PK_Success;
     }
     if (Is420Planar(stream.format)) {
         target = ChoosePlanarTarget(stream, wanted, quality);
         return PK_Success;
     }
-    return CodecOf(stream.format) == Codec::DV25 ? PK_ErrNotSupported : PK_ErrBadSrcFormat;
+    return PK_ErrBadSrcFormat;
 }
 
 PK_Result ChooseEncodeSource(PK_PixelFormat source, PK_PixelFormat stream, int32_t,
                              PK_PixelFormat& format) noexcept {
-    const auto picture = std::ranges::find(kDVPictures, stream, &DVPicture::stream);
-    if (picture != std::end(kDVPictures)) {
-        format = picture->native;
-        return PK_Success;
-    }
-    if (stream == PK_PixelFormat_NTSCDV25 || stream == PK_PixelFormat_PALDV25) {
-        format = ChooseDV25Source(source);
+    if (FindDVFormat(stream) != nullptr) {
+        const bool isDV25 = CodecOf(stream) == Codec::DV25;
+        format = isDV25 ? ChooseDV25Source(source) : DVPairsFormat(stream);
         return PK_Success;
     }
     if (Is420Planar(stream)) {
@@ -120,15 +81,32 @@ PK_Result DecodeStream(const SourceImage& source, int32_t field, const Destinati
     return DecodeStreamThrough(stays, source, field, destination, quality);
 }
 
-// No codec of DV is built yet. A decoder or encoder is taken in here, chosen by CodecOf.
+bool DecodesRows(PK_PixelFormat stream) noexcept {
+    const Codec codec = CodecOf(stream);
+    return codec == Codec::Planar420 || codec == Codec::DV25;
+}
+
 PK_Result DecodeStreamThrough(const ConversionChain& onward, const SourceImage& source, int32_t field,
                               const DestinationImage& destination, int32_t quality) noexcept {
-    if (!Is420Planar(source.format)) return PK_ErrNotSupported;
+    const Codec codec = CodecOf(source.format);
+    if (codec == Codec::None || (codec == Codec::Planar420 && !Is420Planar(source.format)))
+        return PK_ErrNotSupported;
     if (onward.count == 0) return PK_ErrBadDstFormat;
     if (destination.width == 0 || destination.height == 0) return PK_Success;
+    const DestinationImage image = FromTop(destination);
+    switch (codec) {
+    case Codec::DV25:
+        return DecodeDV25(onward, source.pixels, source.format, image, field, quality);
+    case Codec::DV50:
+        return DecodeDV50(onward, source.pixels, source.format, image, field);
+    case Codec::DV100:
+        return DecodeDV100(onward, source.pixels, source.format, image, field);
+    default:
+        break;
+    }
     const auto planes = PlanesOfStream(source);
-    if (!planes) return PK_ErrFailed;
-    return DecodePlanar420Through(onward, *planes, source.format, FromTop(destination), field, quality);
+    return planes ? DecodePlanar420Through(onward, *planes, source.format, image, field, quality)
+                  : PK_ErrFailed;
 }
 
 PK_Result EncodeStream(const SourceImage& source, const DestinationImage& destination,

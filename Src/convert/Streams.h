@@ -24,8 +24,7 @@ struct DecodeTarget {
 /// \param stream  format and size of the stream.
 /// \param wanted  format and size that the caller is after.
 /// \param target  receives the answer; untouched on failure.
-/// \return PK_Success; PK_ErrBadSrcFormat for a format that is no stream of the catalogue;
-///         PK_ErrNotSupported for a stream whose decoder is not there.
+/// \return PK_Success; PK_ErrBadSrcFormat for a format that is no stream of the catalogue.
 PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wanted, int32_t quality,
                              DecodeTarget& target) noexcept;
 
@@ -37,7 +36,11 @@ PK_Result ChooseDecodeTarget(const DecodeTarget& stream, const DecodeTarget& wan
 PK_Result DecodeStream(const SourceImage& source, int32_t field, const DestinationImage& destination,
                        int32_t quality) noexcept;
 
-/// The same to the format that a chain begins with, and by the chain to the destination's.
+/// Whether a stream is decoded row by row, so that a chain can take the rows on.
+bool DecodesRows(PK_PixelFormat stream) noexcept;
+
+/// The same to the format that a chain begins with, and, of a stream that is decoded row by row, by the chain to the
+/// destination's.
 PK_Result DecodeStreamThrough(const ConversionChain& onward, const SourceImage& source, int32_t field,
                               const DestinationImage& destination, int32_t quality) noexcept;
 

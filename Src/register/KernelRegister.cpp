@@ -13,6 +13,7 @@
 #include "composite/SumKernels.h"
 #include "convert/BridgeKernels.h"
 #include "convert/ConvertNV12toYV12Kernels.h"
+#include "convert/DVRowKernels.h"
 #include "convert/KernelTable.h"
 #include "convert/PlanarKernels.h"
 #include "filters/BoxBlurKernels.h"
@@ -26,6 +27,8 @@
 #include "primitives/Channels.h"
 #include "primitives/Coefficients.h"
 #include "primitives/ConvertFloat.h"
+#include "primitives/DVMacroblocks.h"
+#include "primitives/DVTransforms.h"
 #include "primitives/FillPixels.h"
 #include "primitives/MultiplyConstant.h"
 #include "primitives/TransposeKernels.h"
@@ -102,6 +105,11 @@ constexpr KernelRow kPrimitives[] = {
     Entry<&BlockTransformKernels::inverse8x8>("InverseDCT8x8", {SignedWords(64), SignedWords(64)}),
     Entry<&BlockTransformKernels::forward248>("ForwardDCT248", {SignedWords(64), SignedWords(64)}),
     Entry<&BlockTransformKernels::inverse248>("InverseDCT248", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVTransformKernels::inverse88>("LevelsToSamples_88", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVTransformKernels::inverse248>("LevelsToSamples_248", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVTransformKernels::half>("LevelsToSamples_Half", {SignedWords(64), SignedWords(16)}),
+    Entry<&DVMacroblockKernels::toBytes>("SamplesToBytes", {SignedWords(64), Bytes(64)}),
+    Entry<&DVMacroblockKernels::toYUYV>("SamplesToYUYV", {SignedWords(64), Bytes(32)}),
 };
 
 constexpr KernelRow kBridges[] = {
@@ -137,6 +145,11 @@ constexpr KernelRow kPlanar[] = {
     Entry<&PlanarDecodeKernels::every2>("PlanesToVUYARow_Every2", {Bytes(2), Bytes(1), kVUYA8}),
     Entry<&PlanarDecodeKernels::every4>("PlanesToVUYARow_Every4", {Bytes(4), Bytes(2), kVUYA8}),
     Entry<&PlanarDecodeKernels::every8>("PlanesToVUYARow_Every8", {Bytes(8), Bytes(4), kVUYA8}),
+    Entry<&DVRowKernels::spread>("ChromaSpreadRow_ToPixels", {Bytes(1, 4), Bytes(1)}),
+    Entry<&DVRowKernels::spread2>("ChromaSpreadRow_ToPairs", {Bytes(1, 2), Bytes(1)}),
+    Entry<&DVRowKernels::repeat>("ChromaRepeatRow", {Bytes(1, 2), Bytes(1)}),
+    Entry<&DVRowKernels::toVUYX>("FullPlanesToVUYXRow", {Bytes(1), Bytes(1), kVUYA8}),
+    Entry<&DVRowKernels::toBGRX>("VUYXToBGRXRow_DV", {kVUYA8, kBGRA8}),
     Entry<&PlanarWidenKernels::by3To2>("WidenRow_3To2", {Bytes(2, 3), Floats(3, 3)}),
     Entry<&PlanarWidenKernels::by4To3>("WidenRow_4To3", {Bytes(3, 4), Floats(4, 4)}),
     Entry<&PlanarWidenKernels::lumaTo709>("FloatPlanesToLumaRow_601To709",

@@ -18,6 +18,8 @@
 #include "primitives/Channels.h"
 #include "primitives/Coefficients.h"
 #include "primitives/ConvertFloat.h"
+#include "primitives/DVMacroblocks.h"
+#include "primitives/DVTransforms.h"
 #include "primitives/FillPixels.h"
 #include "primitives/MultiplyConstant.h"
 #include "primitives/TransposeKernels.h"
@@ -286,6 +288,47 @@ KernelTrial TransformTrial(const KernelRow& kernel, int32_t, Random&) {
             })};
 }
 
+/// With a step and factors that are drawn.
+KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto factors = std::make_shared<std::array<float, 64>>();
+    for (float& factor : *factors) factor = static_cast<float>(random.Below(32768)) / 256;
+    const auto step = static_cast<float>(1 + random.Below(416));
+    using Transform = DVTransformKernels::Transform;
+    const TrialRow samples = RowOf(kernel.operands.destination, 1);
+    return {{RowOf(kernel.operands.source, 1)},
+            samples,
+            Typed<Transform>([=](Transform run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                run(block, {factors->data(), step}, block);
+                std::memcpy(destination, block, samples.bytes);
+            })};
+}
+
+KernelTrial SamplesToBytesTrial(const KernelRow& kernel, int32_t, Random&) {
+    using ToBytes = decltype(DVMacroblockKernels::toBytes);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<ToBytes>([](ToBytes run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                run(block, destination);
+            })};
+}
+
+/// Four blocks to all lines, or to every second one.
+KernelTrial SamplesToYUYVTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto lineStep = 1 + static_cast<int32_t>(random.Below(2));
+    using ToYUYV = decltype(DVMacroblockKernels::toYUYV);
+    return {{RowOf(kernel.operands.source, 4)},
+            RowOf(kernel.operands.destination, 8 / lineStep),
+            Typed<ToYUYV>([=](ToYUYV run, const Sources& sources, uint8_t* destination) {
+                int16_t blocks[4][64];
+                std::memcpy(blocks, sources[0], sizeof blocks);
+                run({blocks[0], blocks[1], blocks[2], blocks[3], lineStep}, destination, 32);
+            })};
+}
+
 KernelTrial CountTrial(const KernelRow& kernel, int32_t, Random&) {
     using CountZeros = decltype(CoefficientKernels::countZeros8x8);
     return {{RowOf(kernel.operands.source, 1)},
@@ -438,6 +481,10 @@ constexpr SpecialTrial kSpecial[] = {
     {"Fill", FillTrial},
     {"Transpose", TransposeTrial, "TransposeArea"},
     {"BlockTransform", TransformTrial},
+    {"DVTransform", LevelsTrial},
+    {"DVMacroblock", SamplesToBytesTrial, "SamplesToBytes"},
+    {"DVMacroblock", SamplesToYUYVTrial},
+    {"DVRow", PlanesTrial<1>, "FullPlanes"},
     {"W210", PlanesTrial<2>, "Average"},
     {"W210", PlanesTrial<1>},
     {"PlanarDecode", TwoRowTrialWith<ChromaWeights, DrawWeights>, "Blend"},
