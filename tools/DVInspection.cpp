@@ -158,6 +158,14 @@ private:
             CheckID(block, place, channel, sequence, here);
             TakeBlock(block, place, here);
         }
+        TakeShape(first, sequence);
+    }
+
+    /// The pack that merging and players go by: that of the last block of VAUX, or in odd sequences of the first.
+    void TakeShape(const uint8_t* first, int32_t sequence) {
+        constexpr uint8_t kSourceControl = 0x61;
+        const uint8_t* const pack = first + (sequence % 2 == 0 ? 453 : 248);
+        if (pack[0] == kSourceControl) fShapes.Add(ShapeText(pack));
     }
 
     void CheckID(const uint8_t* block, const BlockPlace& place, int32_t channel, int32_t sequence,
@@ -210,10 +218,9 @@ private:
     }
 
     void TakeVAUX(const uint8_t* pack) {
-        constexpr int32_t kSourceControl = 0x61, kDate = 0x62, kTime = 0x63;
+        constexpr int32_t kDate = 0x62, kTime = 0x63;
         if (pack[0] == kNoPack) return;
         fFacts.vaux.insert(pack[0]);
-        if (pack[0] == kSourceControl) fShapes.Add(ShapeText(pack));
         if (pack[0] == kDate && fDate.empty()) fDate = DateText(pack);
         if (pack[0] == kTime && fTime.empty()) fTime = TimeText(pack);
     }
