@@ -16,6 +16,7 @@
 #include "convert/DVRowKernels.h"
 #include "convert/KernelTable.h"
 #include "convert/PlanarKernels.h"
+#include "dv/DVBlockKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
 #include "filters/GaussianBlurKernels.h"
@@ -383,6 +384,14 @@ constexpr KernelRow kMotion[] = {
     Sampler<&MotionResampleKernels::alphaFirst>("ResampleMotionRow", PK_PixelFormat_PRGB_4444_32f_Linear),
 };
 
+constexpr KernelRow kDV[] = {
+    Entry<&DVBlockKernels::loadYUYV>("LoadDVBlocks_YUYV", {Bytes(256), SignedWords(256)}),
+    Entry<&DVBlockKernels::loadUYVY>("LoadDVBlocks_UYVY", {Bytes(256), SignedWords(256)}),
+    Entry<&DVBlockKernels::scale>("ScaleDVBlock", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVBlockKernels::sumOfLogarithms>("SumOfDVLogarithms", {SignedWords(64), Integers(1)}),
+    Entry<&DVBlockKernels::quantise>("QuantiseDVBlock", {SignedWords(64), Bytes(73)}),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -414,6 +423,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kDissolves);
     add(kDeinterlacing);
     add(kMotion);
+    add(kDV);
     add(kColour);
     return all;
 }

@@ -9,6 +9,7 @@
 #include "convert/BridgeKernels.h"
 #include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/PlanarKernels.h"
+#include "dv/DVBlockKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/GaussianCoefficients.h"
 #include "filters/ResampleKernel.h"
@@ -341,6 +342,75 @@ KernelTrial CountTrial(const KernelRow& kernel, int32_t, Random&) {
             })};
 }
 
+/// Sixteen pixels of eight rows to four blocks.
+KernelTrial LoadBlocksTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto bits = static_cast<int32_t>(random.Below(4));
+    using Load = DVBlockKernels::Load;
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Load>([=](Load run, const Sources& sources, uint8_t* destination) {
+                int16_t blocks[4][64];
+                run(sources[0], 32, {blocks[0], blocks[1], blocks[2], 3 * 64, bits});
+                std::memcpy(destination, blocks, sizeof blocks);
+            })};
+}
+
+/// Factors as those of weights or steps.
+std::shared_ptr<std::vector<float>> DrawBlockFactors(Random& random, float most) {
+    const auto factors = std::make_shared<std::vector<float>>(64);
+    for (float& factor : *factors) factor = most * static_cast<float>(random.Below(1000)) / 1000;
+    return factors;
+}
+
+const DVBlockFactors& AsBlockFactors(const std::vector<float>& factors) {
+    return *reinterpret_cast<const DVBlockFactors*>(factors.data());
+}
+
+KernelTrial ScaleBlockTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto factors = DrawBlockFactors(random, 4);
+    const float roundUp = DrawAmount(random);
+    using Scale = decltype(DVBlockKernels::scale);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Scale>([=](Scale run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                run(AsBlockFactors(*factors), roundUp, block);
+                std::memcpy(destination, block, sizeof block);
+            })};
+}
+
+KernelTrial SumOfLogarithmsTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const float factor = DrawAmount(random);
+    using Sum = decltype(DVBlockKernels::sumOfLogarithms);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Sum>([=](Sum run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                const uint32_t sum = run(block, factor);
+                std::memcpy(destination, &sum, sizeof sum);
+            })};
+}
+
+/// The levels, which of them are not 0, and whether one is too large.
+KernelTrial QuantiseBlockTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto factors = DrawBlockFactors(random, random.Below(2) ? 0.02f : 0.005f);
+    const float roundUp = DrawAmount(random), least = static_cast<float>(1 + random.Below(3));
+    using Quantise = decltype(DVBlockKernels::quantise);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Quantise>([=](Quantise run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                DVLevels levels;
+                run(block, {AsBlockFactors(*factors), roundUp, least}, levels);
+                std::memcpy(destination, levels.level, sizeof levels.level);
+                std::memcpy(destination + 64, &levels.nonZero, sizeof levels.nonZero);
+                destination[72] = levels.areTooLarge ? 1 : 0;
+            })};
+}
+
 KernelTrial BoxTrial(const KernelRow& kernel, int32_t size, Random& random) {
     const int32_t radius = 1 + static_cast<int32_t>(random.Below(40));
     const int32_t length = size + radius + 2;
@@ -485,6 +555,10 @@ constexpr SpecialTrial kSpecial[] = {
     {"DVMacroblock", SamplesToBytesTrial, "SamplesToBytes"},
     {"DVMacroblock", SamplesToYUYVTrial},
     {"DVRow", PlanesTrial<1>, "FullPlanes"},
+    {"DVBlock", LoadBlocksTrial, "Load"},
+    {"DVBlock", ScaleBlockTrial, "Scale"},
+    {"DVBlock", SumOfLogarithmsTrial, "Sum"},
+    {"DVBlock", QuantiseBlockTrial, "Quantise"},
     {"W210", PlanesTrial<2>, "Average"},
     {"W210", PlanesTrial<1>},
     {"PlanarDecode", TwoRowTrialWith<ChromaWeights, DrawWeights>, "Blend"},

@@ -1,0 +1,138 @@
+// Levels to samples, against the sums in double that define it.
+
+#include "primitives/DVTransforms.h"
+
+#include "primitives/Dispatch.h"
+#include "support/Random.h"
+#include "support/Targets.h"
+
+#include <gtest/gtest.h>
+
+#include <array>
+#include <cmath>
+
+namespace PK {
+namespace {
+
+constexpr int kSide = 8, kPlaces = 64;
+using Levels = std::array<int16_t, kPlaces>;
+using Factors = std::array<float, kPlaces>;
+using Reals = std::array<double, kPlaces>;
+
+double C(int k) {
+    return k == 0 ? 1 / std::sqrt(8.0) : 0.5;
+}
+double Wave(int k, int place, int period) {
+    return C(k) * std::cos(std::acos(-1.0) * k * (2 * place + 1) / (2 * period));
+}
+
+Reals Coefficients(const Levels& levels, const DVSteps& steps) {
+    Reals coefficients;
+    for (size_t i = 0; i < kPlaces; ++i)
+        coefficients[i] = std::nearbyint(static_cast<double>(levels[i]) * steps.factors[i] * steps.step);
+    coefficients[0] = 4 * levels[0];
+    return coefficients;
+}
+
+double Sample88(const Reals& coefficients, int x, int y) {
+    double sum = 0;
+    for (int v = 0; v < kSide; ++v)
+        for (int h = 0; h < kSide; ++h)
+            sum += coefficients[size_t(8 * v + h)] * Wave(v, y, 8) * Wave(h, x, 8);
+    return sum;
+}
+
+/// Of the sums of two lines, and plus or minus their differences.
+double Sample248(const Reals& coefficients, int x, int y) {
+    double sum = 0;
+    for (int u = 0; u < 4; ++u)
+        for (int h = 0; h < kSide; ++h) {
+            const double ofSums = coefficients[size_t(8 * u + h)],
+                         ofDifferences = coefficients[size_t(8 * (u + 4) + h)];
+            sum += (y % 2 == 0 ? ofSums + ofDifferences : ofSums - ofDifferences) * Wave(u, y / 2, 4) *
+                   Wave(h, x, 8);
+        }
+    return sum;
+}
+
+double SampleOfHalf(const Reals& coefficients, int x, int y) {
+    double sum = 0;
+    for (int v = 0; v < 4; ++v)
+        for (int h = 0; h < 4; ++h) sum += coefficients[size_t(8 * v + h)] * Wave(v, y, 4) * Wave(h, x, 4);
+    return sum;
+}
+
+struct Case {
+    const char* name;
+    DVTransformKernels::Transform DVTransformKernels::*body;
+    double (*sample)(const Reals&, int x, int y);
+    int side;
+};
+constexpr Case kCases[] = {{"8-8", &DVTransformKernels::inverse88, Sample88, 8},
+                           {"2-4-8", &DVTransformKernels::inverse248, Sample248, 8},
+                           {"half", &DVTransformKernels::half, SampleOfHalf, 4}};
+
+void Check(const Levels& levels, const DVSteps& steps) {
+    const Reals coefficients = Coefficients(levels, steps);
+    for (const Case& one : kCases)
+        for (const Target target : PKTest::TargetsOfThisProcessor()) {
+            Levels samples = levels;
+            (KernelsFor<DVTransformKernels>(target).*one.body)(samples.data(), steps, samples.data());
+            for (int y = 0; y < one.side; ++y)
+                for (int x = 0; x < one.side; ++x)
+                    ASSERT_NEAR(one.sample(coefficients, x, y), samples[size_t(one.side * y + x)], 0.501)
+                        << one.name << ' ' << TargetName(target) << ", column " << x << ", line " << y;
+        }
+}
+
+TEST(DVTransforms, EverySingleLevel) {
+    Factors factors;
+    for (size_t i = 0; i < kPlaces; ++i) factors[i] = static_cast<float>(95 * i) / 256; // exact
+    for (size_t place = 0; place < kPlaces; ++place)
+        for (const int level : {-255, -3, 1, 17, 255}) {
+            Levels levels{};
+            levels[place] = static_cast<int16_t>(level);
+            Check(levels, {factors.data(), 1});
+            Check(levels, {factors.data(), 3});
+        }
+}
+
+TEST(DVTransforms, RandomLevels) {
+    PKTest::Random random(20261125);
+    for (int turn = 0; turn < 300; ++turn) {
+        Factors factors;
+        for (float& factor : factors) factor = static_cast<float>(random.Below(4000)) / 256;
+        factors[0] = 0;
+        Levels levels;
+        for (int16_t& level : levels)
+            level = static_cast<int16_t>(static_cast<int32_t>(random.Below(31)) - 15);
+        levels[0] = static_cast<int16_t>(static_cast<int32_t>(random.Below(512)) - 256);
+        Check(levels, {factors.data(), static_cast<float>(1 + random.Below(4))});
+    }
+}
+
+/// DC is half a sample, whatever the step.
+TEST(DVTransforms, AFlatBlock) {
+    const Factors factors{};
+    for (const int dc : {-256, -7, 0, 10, 255}) {
+        Levels levels{};
+        levels[0] = static_cast<int16_t>(dc);
+        for (const float step : {1.0f, 416.0f}) Check(levels, {factors.data(), step});
+    }
+}
+
+TEST(DVTransforms, SamplesSaturate) {
+    Factors factors;
+    factors.fill(1000);
+    factors[0] = 0;
+    Levels levels;
+    levels.fill(255);
+    PKTest::AtEveryTarget([&] {
+        Levels samples;
+        Best<DVTransformKernels>().inverse88(levels.data(), {factors.data(), 416}, samples.data());
+        EXPECT_EQ(32767, samples[0]);
+    });
+}
+
+} // namespace
+} // namespace PK
