@@ -1,6 +1,6 @@
 #include "support/DVSegmentReader.h"
 
-#include "dv/DVCodes.h"
+#include "primitives/DVCodes.h"
 
 #include <deque>
 #include <map>
