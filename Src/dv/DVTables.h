@@ -7,7 +7,6 @@
 
 #include "primitives/DVHuffman.h"
 
-#include <algorithm>
 #include <array>
 #include <cstdint>
 
@@ -95,13 +94,13 @@ inline constexpr auto kAreaShift = [] {
 static_assert(kAreaShift[0] == 0x03020201 && kAreaShift[3] == 0x05050404 && kAreaShift[63] == 0x01010101);
 
 /// The weights of the forward transforms as 16-bit fractions, those of AC rounded before they are halved; 1/4 for DC. The
-/// first difference of 2-4-8 has 1/2, which with a sign has no room in 16 bits.
+/// one weight of 1/2, of the difference of the fields, does not fit a signed value: it stands there as -1/2.
 inline constexpr auto kForwardWeights = [] {
     std::array<DVFactors, kDVModes> weights{};
     for (int32_t mode = 0; mode < kDVModes; ++mode)
         for (int32_t place = 0; place < kCoefficients; ++place) {
             const auto whole = static_cast<int32_t>(65536 * WeightProduct(mode, place) + 0.5);
-            weights[mode][place] = static_cast<int16_t>(place == 0 ? 16384 : std::min(whole / 2, 32767));
+            weights[mode][place] = static_cast<int16_t>(place == 0 ? 16384 : whole / 2);
         }
     return weights;
 }();
@@ -109,8 +108,7 @@ inline constexpr const DVFactors& kWeights88 = kForwardWeights[0];
 inline constexpr const DVFactors& kWeights248 = kForwardWeights[1];
 static_assert(kWeights88[2] == 30273 && kWeights88[7] == 23624 && kWeights88[9] == 31521 &&
               kWeights88[11] == 28924);
-static_assert(kWeights248[32] > 0 && kWeights248[8] == 30273 && kWeights248[10] == 27969 &&
-              kWeights248[15] == 21826);
+static_assert(kWeights248[8] == 30273 && kWeights248[10] == 27969 && kWeights248[15] == 21826);
 
 /// DV100: what a step is multiplied by, in 32nds, by place. 720 chroma at column 5, line 4 is not as its mirror; streams
 /// have it so.

@@ -100,6 +100,10 @@ void SegmentCompressor::Transform(DVBlock& block) const {
         const CoefficientKernels& kernels = Best<CoefficientKernels>();
         for (int32_t mode = 0; mode < kDVModes; ++mode)
             kernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients, kScale16);
+        constexpr int32_t kFieldDifference = 32;
+        static_assert(kWeights248[kFieldDifference] == INT16_MIN, "1/2 with the wrong sign");
+        int16_t& difference = values[1][kFieldDifference];
+        difference = static_cast<int16_t>(-difference);
         block.dc = std::clamp(values[0][0], kLeastDC, kGreatestDC);
     } else {
         for (int32_t mode = 0; mode < kDVModes; ++mode)

@@ -3,7 +3,6 @@
 #include "dv/DV100SegmentCompressor.h"
 #include "dv/DVCodeWords.h"
 #include "primitives/BlockTransforms.h"
-#include "primitives/Coefficients.h"
 #include "support/DVSegmentReader.h"
 #include "support/Random.h"
 #include "support/Targets.h"
@@ -70,12 +69,19 @@ struct PlainBlock {
     std::array<int32_t, 64> coefficients{};
 };
 
+/// Weights are 16-bit fractions without a sign.
+int16_t Weighted(int16_t value, int16_t weight) {
+    return static_cast<int16_t>(std::nearbyint(value * static_cast<uint16_t>(weight) / 65536.0));
+}
+
 PlainBlock PlainBlockOf(const Values& samples, int32_t place) {
     Values frame, fields = samples;
     ForwardDCT8x8(samples.data(), frame.data());
     ForwardDCT248(fields.data());
-    MultiplyScaled16s(kWeights88.data(), frame.data(), 64, 16);
-    MultiplyScaled16s(kWeights248.data(), fields.data(), 64, 16);
+    for (size_t i = 0; i < 64; ++i) {
+        frame[i] = Weighted(frame[i], kWeights88[i]);
+        fields[i] = Weighted(fields[i], kWeights248[i]);
+    }
     PlainBlock block;
     block.mode = std::ranges::count(frame, 0) < std::ranges::count(fields, 0) ? 1 : 0;
     const Values& values = block.mode == 1 ? fields : frame;
