@@ -57,7 +57,8 @@ void FuzzDecode(ByteStream& stream) {
     const Size size = DrawSize(stream, frame.size);
     const bool isWhole = size.width == frame.size.width && size.height == frame.size.height;
     const bool scales = !isWhole || stream.OneIn(4);
-    const int32_t fields[] = {stream.Between(0, 2), stream.Between(0, 2)};
+    // Between images of different earlier fields the picture moves by a row, and leaves one as it was.
+    const int32_t field = stream.Between(0, 2), fields[] = {field, stream.Bool() ? field : 0};
     const int32_t quality = stream.BetweenOrAny(0, 5, 16);
     SetCall((scales ? "PK_ScaleConvert of " : "PK_Convert of ") + Words(frame.format) + ", field " +
             std::to_string(fields[0]) + " to " + Words(to) + ", " + Words(size) + ", field " +
