@@ -1,6 +1,7 @@
 #include "dv/BlackDVFrame.h"
 
 #include "dv/EncodeDV.h"
+#include "frame/FloatMode.h"
 #include "primitives/FirstUse.h"
 
 #include <array>
@@ -23,6 +24,7 @@ Frame<kStream> Encode() {
     }
     constexpr int64_t kSameRowAgain = 0;
     Frame<kStream> frame;
+    const InitialFloatMode mode;
     EncodeDV(kFormat, {row.data(), kSameRowAgain, true}, 0, kBestDVPolicy, frame.data());
     return frame;
 }

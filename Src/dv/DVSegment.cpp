@@ -77,17 +77,17 @@ DVSteps DVDecodeState::Steps(int32_t macroblock, int32_t block) const {
     return {weights.data(), static_cast<float>(kDV100Steps[qno] << classNumber)};
 }
 
+DVTransformKernels::Transform DVDecodeState::TransformOf(bool is248) const {
+    if (fSize == DVSize::Full) return is248 ? fTransforms.inverse248 : fTransforms.inverse88;
+    return ReduceBlockDV(fTransforms, fSize, is248);
+}
+
 void DVDecodeState::Transform(int32_t macroblock) {
     if (fHasLinesInTurns[macroblock] && fSize != DVSize::Full) return JoinHalvedFields(macroblock);
     for (int32_t i = 0; i < Blocks(); ++i) {
         int16_t* const block = Block(macroblock, i);
-        const DVSteps steps = Steps(macroblock, i);
-        if (fSize != DVSize::Full)
-            ReduceBlockDV(fTransforms, block, steps, fSize);
-        else if (!fFormat.IsHD() && (Parameters(macroblock, i) & kModeBit) != 0)
-            fTransforms.inverse248(block, steps, block);
-        else
-            fTransforms.inverse88(block, steps, block);
+        const bool is248 = !fFormat.IsHD() && (Parameters(macroblock, i) & kModeBit) != 0;
+        TransformOf(is248)(block, Steps(macroblock, i), block);
     }
 }
 

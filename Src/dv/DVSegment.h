@@ -57,6 +57,7 @@ private:
     void TakeDC(const uint8_t* segment);
     void Parse(const uint8_t* segment);
     DVSteps Steps(int32_t macroblock, int32_t block) const;
+    DVTransformKernels::Transform TransformOf(bool is248) const;
     void Transform(int32_t macroblock);
     void JoinHalvedFields(int32_t macroblock);
 

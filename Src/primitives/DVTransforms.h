@@ -26,6 +26,11 @@ struct DVTransformKernels {
     /// alone; their mean is that of the block. In 2-4-8 mode these are the sums of lines.
     Transform half;
 
+    /// A quarter of the size: two lines of two samples, the means of each 2 x 2 of those that the first two coefficients of
+    /// the first two lines give in `half`. In 2-4-8 mode without the last of the four, which comes so late in the scan that it
+    /// may lie anywhere in the segment.
+    Transform quarter88, quarter248;
+
     static constexpr const char* kFamily = "DVTransform";
     static constexpr Offer kOffer = Offer::flags;
     template <Target>

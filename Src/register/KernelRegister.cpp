@@ -109,6 +109,8 @@ constexpr KernelRow kPrimitives[] = {
     Entry<&DVTransformKernels::inverse88>("LevelsToSamples_88", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::inverse248>("LevelsToSamples_248", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::half>("LevelsToSamples_Half", {SignedWords(64), SignedWords(16)}),
+    Entry<&DVTransformKernels::quarter88>("LevelsToSamples_Quarter88", {SignedWords(64), SignedWords(4)}),
+    Entry<&DVTransformKernels::quarter248>("LevelsToSamples_Quarter248", {SignedWords(64), SignedWords(4)}),
     Entry<&DVMacroblockKernels::toBytes>("SamplesToBytes", {SignedWords(64), Bytes(64)}),
     Entry<&DVMacroblockKernels::toYUYV>("SamplesToYUYV", {SignedWords(64), Bytes(32)}),
 };

@@ -62,6 +62,22 @@ double SampleOfHalf(const Reals& coefficients, int x, int y) {
     return sum;
 }
 
+/// The mean of four samples of half the size, of the lowest coefficients alone.
+double SampleOfQuarter(const Reals& coefficients, int x, int y, bool hasTwist) {
+    Reals lowest{};
+    for (const size_t place : {0u, 1u, 8u}) lowest[place] = coefficients[place];
+    if (hasTwist) lowest[9] = coefficients[9];
+    double sum = 0;
+    for (int i = 0; i < 4; ++i) sum += SampleOfHalf(lowest, 2 * x + i % 2, 2 * y + i / 2);
+    return sum / 4;
+}
+double SampleOfQuarter88(const Reals& coefficients, int x, int y) {
+    return SampleOfQuarter(coefficients, x, y, true);
+}
+double SampleOfQuarter248(const Reals& coefficients, int x, int y) {
+    return SampleOfQuarter(coefficients, x, y, false);
+}
+
 struct Case {
     const char* name;
     DVTransformKernels::Transform DVTransformKernels::*body;
@@ -70,7 +86,9 @@ struct Case {
 };
 constexpr Case kCases[] = {{"8-8", &DVTransformKernels::inverse88, Sample88, 8},
                            {"2-4-8", &DVTransformKernels::inverse248, Sample248, 8},
-                           {"half", &DVTransformKernels::half, SampleOfHalf, 4}};
+                           {"half", &DVTransformKernels::half, SampleOfHalf, 4},
+                           {"quarter, 8-8", &DVTransformKernels::quarter88, SampleOfQuarter88, 2},
+                           {"quarter, 2-4-8", &DVTransformKernels::quarter248, SampleOfQuarter248, 2}};
 
 void Check(const Levels& levels, const DVSteps& steps) {
     const Reals coefficients = Coefficients(levels, steps);
