@@ -271,6 +271,12 @@ expect 1 "'in/plain.dv' is NTSCDV25 and 'black.dv' is PAL_DV100_1080i; both must
 expect 3 "'in/plain.dv' has fewer frames than 'in/two.dv'; both must have as many" dv merge in/two.dv in/plain.dv out/x.dv
 expect 3 "'in/plain.dv' has fewer frames than 'in/two.dv'" dv merge in/plain.dv in/two.dv out/x.dv
 
+# Drawings.
+expect 0 "" dv draw drawings
+is "drawings" "$(names drawings)" "dv-passes.png dv-placement.png dv-sequence.png "
+expect 3 "cannot make the folder 'in/two.dv'" dv draw in/two.dv
+expect 2 "OUTDIR is required" dv draw
+
 # refused CODE TEXT ARGUMENT...: of all commands that read DV
 refused() {
     local code=$1 text=$2
