@@ -3,6 +3,7 @@
 #include "Numbers.h"
 
 #include <algorithm>
+#include <map>
 #include <optional>
 
 namespace tool {

@@ -4,9 +4,7 @@
 
 #include "DVFormats.h"
 
-#include <array>
 #include <cstdint>
-#include <map>
 #include <set>
 #include <string>
 #include <vector>
