@@ -83,8 +83,7 @@ TEST(DecodeDV, SizesThatNobodyDecodesTo) {
     for (const PK_PixelFormat stream :
          {PK_PixelFormat_NTSCDV25, PK_PixelFormat_PALDV50, PK_PixelFormat_NTSC_DV100_1080i}) {
         const std::vector<uint8_t> frame(static_cast<size_t>(PK_PixelFormatSize(stream, 0, 0)));
-        for (const auto& [width, height] :
-             {std::pair{721, 480}, {720, 481}, {100, 100}, {1440, 1080}}) {
+        for (const auto& [width, height] : {std::pair{721, 480}, {720, 481}, {100, 100}, {1440, 1080}}) {
             Image image(PK_PixelFormat_BGRA_4444_8u, width, height, 4);
             EXPECT_EQ(PK_ErrSizeMismatch, Decode(frame, stream, image)) << width << " x " << height;
             EXPECT_TRUE(image.IsUntouched());
