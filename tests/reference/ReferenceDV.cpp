@@ -42,7 +42,7 @@ void ReadCodes(Block& block) {
         if (code == codes.end()) break;
         const DVCode& found = code->second;
         bool isNegative = false;
-        if (found.is == DVCode::Is::kLevel) {
+        if (found.amplitude > 0) {
             if (next == block.rest.size()) break;
             isNegative = block.rest[next++] == '1';
         }
@@ -99,11 +99,8 @@ std::vector<Block> ReadSegment(const DVLayout& layout, const uint8_t* segment) {
     return blocks;
 }
 
-using Coefficients = std::array<double, 64>; ///< whole numbers, in the raster
-
-double Saturated(double value) {
-    return std::clamp(std::floor(value + 0.5), -32768.0, 32767.0);
-}
+/// In the raster; whole numbers, halves rounded to the even one, and as great as they come.
+using Coefficients = std::array<double, 64>;
 
 Coefficients WithSteps(const Block& block, int qno) {
     Coefficients coefficients{};
@@ -112,7 +109,7 @@ Coefficients WithSteps(const Block& block, int qno) {
         const auto [raster, area] = DVScan(block.mode)[i];
         const auto place = static_cast<size_t>(raster);
         const int factor = DVFactors(block.mode)[place] << DVAreaShift(area, block.classNumber, qno);
-        coefficients[place] = Saturated(block.levels[i] * factor / 256.0);
+        coefficients[place] = std::nearbyint(block.levels[i] * factor / 256.0);
     }
     return coefficients;
 }
@@ -122,8 +119,8 @@ Coefficients WithStepsOfDV100(const Block& block, int qno, const std::array<int,
     coefficients[0] = 4 * block.dc;
     for (size_t i = 1; i < 64; ++i) {
         const auto place = static_cast<size_t>(DVScan(false)[i].raster);
-        coefficients[place] =
-            Saturated(block.levels[i] * DV100Step(qno) * std::pow(2, block.classNumber) * table[place] / 32);
+        coefficients[place] = std::nearbyint(block.levels[i] * DV100Step(qno) *
+                                             std::pow(2, block.classNumber) * table[place] / 32);
     }
     return coefficients;
 }
