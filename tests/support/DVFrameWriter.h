@@ -1,6 +1,6 @@
 #pragma once
 
-// Frames of DV for tests: those of media/dv, and such as are put together from code words.
+// Frames of DV that are put together from code words.
 
 #include "reference/ReferenceDVTables.h"
 
@@ -8,9 +8,6 @@
 #include <vector>
 
 namespace PKTest {
-
-/// A frame of media/dv, by its name without ending.
-std::vector<uint8_t> ReadDVFrame(const std::string& name);
 
 /// One block of a macroblock before it is packed.
 struct DVBlockBits {

@@ -1,10 +1,7 @@
-#include "support/DVFrames.h"
+#include "support/DVFrameWriter.h"
 
 #include <algorithm>
 #include <cstdlib>
-#include <fstream>
-#include <iterator>
-#include <stdexcept>
 
 namespace PKTest {
 namespace {
@@ -56,13 +53,6 @@ std::vector<uint8_t> EmptyFrame(DVKind kind) {
 }
 
 } // namespace
-
-std::vector<uint8_t> ReadDVFrame(const std::string& name) {
-    const std::string path = PIXELKILN_MEDIA_DIR "/dv/" + name + ".dif";
-    std::ifstream file(path, std::ios::binary);
-    if (!file) throw std::runtime_error(path + " cannot be read");
-    return {std::istreambuf_iterator<char>(file), {}};
-}
 
 std::string DVLevelBits(int run, int level) {
     const int amplitude = std::abs(level);
