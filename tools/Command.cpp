@@ -19,6 +19,17 @@ Command::Command(Group group, const char* name, const char* description, Declare
     Register().insert(std::ranges::upper_bound(Register(), place(this), {}, place), this);
 }
 
+std::string Command::Name() const {
+    const std::string name = fName;
+    return name.substr(name.find(' ') + 1);
+}
+
+std::string Command::Family() const {
+    const std::string name = fName;
+    const size_t space = name.find(' ');
+    return space == std::string::npos ? std::string() : name.substr(0, space);
+}
+
 const char* Command::Heading() const {
     switch (fGroup) {
     case Group::Listings:

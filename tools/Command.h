@@ -8,11 +8,15 @@
 //     void Declare(Words& words, Options& options) { ... } // Words.h, SharedWords.h
 //     void Run(const Options& options) { ... }             // throws Failure
 //     const Command sRotate(Group::Operations, "rotate", "Turn frames by quarters", Declare, Run);
+//
+// Commands that belong together are a family: a command of no words and nothing to do, and others whose names begin with
+// its name and a space.
 
 #include "Words.h"
 
 #include <functional>
 #include <memory>
+#include <string>
 #include <vector>
 
 namespace tool {
@@ -35,8 +39,19 @@ public:
     Command(Group group, const char* name, const char* description, void (*run)())
         : Command(group, name, description, [run](Words&) { return run; }) {}
 
+    /// A family.
+    Command(Group group, const char* name, const char* description)
+        : Command(group, name, description, DeclareWords()) {}
+
     const char* Heading() const;
-    const char* Name() const { return fName; }
+
+    /// Within its family.
+    std::string Name() const;
+
+    /// The name of the family that it belongs to; empty if it stands alone.
+    std::string Family() const;
+    bool IsFamily() const { return !fDeclare; }
+
     const char* Description() const { return fDescription; }
 
     /// Declares the words, and gives what is to be called once they are read.

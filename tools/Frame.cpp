@@ -20,6 +20,7 @@ Frame::Frame(PK_PixelFormat format, int32_t width, int32_t height)
                                        SizeText(width, height) + "; a frame may take up to 2 GiB");
     fPixels = static_cast<uint8_t*>(pixels);
     fBytes = static_cast<uint64_t>(PK_PixelFormatSize(format, width, height));
+    if (!IsRaster(format) && !IsPlanar(format)) fRowBytes = static_cast<int32_t>(fBytes);
     std::memset(fPixels, 0, fBytes);
 }
 

@@ -36,6 +36,8 @@ public:
     int32_t Width() const { return fWidth; }
     int32_t Height() const { return fHeight; }
     Size PixelSize() const { return {fWidth, fHeight}; }
+
+    /// Of a DV frame all bytes of it.
     int32_t RowBytes() const { return fRowBytes; }
     uint64_t Bytes() const { return fBytes; }
     uint8_t* Pixels() { return fPixels; }

@@ -3,6 +3,7 @@
 #include "Failure.h"
 #include "Formats.h"
 #include "Png.h"
+#include "SamplePlanes.h"
 
 namespace tool {
 
@@ -100,13 +101,15 @@ void FrameOutput::WriteAsRaw() {
     WriteRaw(*fConverted, fPlan.to.Packing(), *fRawFile);
 }
 
-/// Planes of 4:2:0 go into the stream as they are, and all else as 4:4:4.
+/// Planes of 4:2:0, and UYVY of the matrix that players take for its size, go into the stream as they are, and all else
+/// as 4:4:4.
 void FrameOutput::WriteToStream() {
     if (!fStream) {
         const std::optional<Video420> video = Video420Of(fConverted->Format());
         fHead.width = fConverted->Width();
         fHead.height = fConverted->Height();
-        fHead.format = video ? fConverted->Format() : PK_PixelFormat_Invalid;
+        const bool isPlain = fConverted->Format() == UYVYOf(Is709("", fConverted->PixelSize()));
+        fHead.format = video || isPlain ? fConverted->Format() : PK_PixelFormat_Invalid;
         if (video && !video->areFields) fHead.field = 0;
         if (video && video->areFields && fHead.field == 0) fHead.field = 1; // as most streams
         fStream.emplace(fName.At(0), fHead);

@@ -1,5 +1,8 @@
 #include "SharedWords.h"
 
+#include <algorithm>
+#include <thread>
+
 namespace tool {
 namespace {
 
@@ -8,13 +11,6 @@ constexpr const char* kNotes =
 without it is BGRA, with 16 bits a sample as float. Directions and places are those of the picture as
 one sees it, from its top left corner.
 )";
-
-void AddRawFrames(Words& words, PipeOptions& options) {
-    words.Take("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
-    words.Flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
-    words.Take("--matrix", options.matrix,
-               "601 or 709, of Y4M, yuv420p and nv12; without it, 709 from 1280 columns or 577 rows on");
-}
 
 void AddFormats(Words& words, PipeOptions& options) {
     AddQuality(words, options.quality);
@@ -29,6 +25,13 @@ void AddFormatsOfOperation(Words& words, PipeOptions& options) {
 
 } // namespace
 
+void AddRawFrames(Words& words, PipeOptions& options) {
+    words.Take("--size", options.size, "Width x height of raw input frames, such as 1920x1080");
+    words.Flag("--packed", options.packed, "Rows of raw frames have no padding, in and out");
+    words.Take("--matrix", options.matrix,
+               "601 or 709, of Y4M, yuv420p and nv12; without it, 709 from 1280 columns or 577 rows on");
+}
+
 void AddQuality(Words& words, int32_t& quality) {
     words.Take("--quality,-q", quality, "Render quality, 0 to 5; above 1, chroma is interpolated")
         .Between(0, 5)
@@ -42,6 +45,14 @@ void AddListing(Words& words, ListOptions& options) {
 void AddOutput(Words& words, PipeOptions& options) {
     words.Take("OUT", options.output, "PNG file, Y4M stream, raw frames, or -").Required();
     AddOutputForm(words, options);
+}
+
+void AddThreads(Words& words, int32_t& threads) {
+    constexpr int32_t kMost = 256;
+    threads = std::clamp(static_cast<int32_t>(std::thread::hardware_concurrency()), 1, kMost);
+    words.Take("--threads", threads, "Threads that work at once, each on a frame")
+        .Between(1, kMost)
+        .ShowDefault();
 }
 
 void AddOutputForm(Words& words, PipeOptions& options) {

@@ -9,10 +9,16 @@ namespace tool {
 
 void AddQuality(Words& words, int32_t& quality);
 
+/// As many as the machine has processors, unless it is told.
+void AddThreads(Words& words, int32_t& threads);
+
 struct ListOptions {
     bool csv = false;
 };
 void AddListing(Words& words, ListOptions& options);
+
+/// What raw input frames do not tell.
+void AddRawFrames(Words& words, PipeOptions& options);
 
 /// For commands that write frames.
 void AddOutput(Words& words, PipeOptions& options);

@@ -3,6 +3,7 @@
 #include "DensePlanes.h"
 #include "Failure.h"
 #include "Numbers.h"
+#include "SamplePlanes.h"
 
 #include <charconv>
 #include <sstream>
@@ -13,8 +14,13 @@ namespace {
 constexpr size_t kLongestLine = 4096;
 constexpr char kMagic[] = "YUV4MPEG2";
 
-PK_PixelFormat FormatOf444(const Frame& frame) {
-    return Is709("", frame.PixelSize()) ? PK_PixelFormat_VUYX_4444_8u_709 : PK_PixelFormat_VUYX_4444_8u;
+PK_PixelFormat FormatOf444(bool is709) {
+    return is709 ? PK_PixelFormat_VUYX_4444_8u_709 : PK_PixelFormat_VUYX_4444_8u;
+}
+
+size_t FrameBytes(const Y4MHead& head) {
+    return HasSamplePlanes(head.format) ? SamplePlanesBytes(head.format, head.width, head.height)
+                                        : DenseBytes(head.width, head.height);
 }
 
 /// Reads the words of a head.
@@ -27,11 +33,17 @@ public:
         for (std::string word; words >> word;) Take(word[0], word.substr(1));
         if (fHead.width <= 0 || fHead.height <= 0) Refuse("tells no size");
         fVideo.is709 = Is709(fMatrix, {fHead.width, fHead.height});
-        fHead.format = fVideo.Format();
+        fHead.format = Format();
         return fHead;
     }
 
 private:
+    PK_PixelFormat Format() const {
+        if (fChroma == "420") return fVideo.Format();
+        if (fVideo.isFullRange) Refuse("is C" + fChroma + " of the full range, which only 4:2:0 is read in");
+        return fChroma == "422" ? UYVYOf(fVideo.is709) : FormatOf444(fVideo.is709);
+    }
+
     void Take(char tag, const std::string& value) {
         switch (tag) {
         case 'W':
@@ -79,9 +91,11 @@ private:
             Refuse("has the chroma of DV in PAL (C420paldv), of which U and V lie on different rows; nothing "
                    "here "
                    "takes that");
-        if (value != "420" && value != "420jpeg" && value != "420mpeg2")
-            Refuse("has the colour space C" + value + "; of those, 420, 420jpeg and 420mpeg2 are read");
+        if (value != "420" && value != "420jpeg" && value != "420mpeg2" && value != "422" && value != "444")
+            Refuse("has the colour space C" + value +
+                   "; of those, 420, 420jpeg, 420mpeg2, 422 and 444 are read");
         fVideo.isCentred = value != "420mpeg2";
+        fChroma = value.substr(0, 3);
     }
 
     [[noreturn]] void Refuse(const std::string& what) const {
@@ -89,27 +103,19 @@ private:
     }
 
     std::string fName, fMatrix;
+    std::string fChroma = "420"; ///< where no word tells, and so centred
     Y4MHead fHead{0, 0, "25:1", "1:1", 0, PK_PixelFormat_Invalid};
-    Video420 fVideo{.isCentred = true}; // where no word tells
+    Video420 fVideo{.isCentred = true};
 };
 
 std::string HeadText(const Y4MHead& head) {
     constexpr char kInterlacing[] = {'p', 't', 'b'};
     const std::optional<Video420> video = Video420Of(head.format);
-    const char* const chroma = !video ? "444" : video->isCentred ? "420jpeg" : "420mpeg2";
+    const char* const samples = Is422(head.format) ? "422" : "444";
+    const char* const chroma = !video ? samples : video->isCentred ? "420jpeg" : "420mpeg2";
     const char* const range = video && video->isFullRange ? "FULL" : "LIMITED";
     return Formatted("%s W%d H%d F%s I%c A%s C%s XCOLORRANGE=%s\n", kMagic, head.width, head.height,
                      head.rate.c_str(), kInterlacing[head.field], head.aspect.c_str(), chroma, range);
-}
-
-void AppendPlanesOf444(const Frame& frame, std::string& bytes) {
-    const Frame pixels = Converted(frame, FormatOf444(frame), kDefaultQuality);
-    constexpr int kPlanes[] = {2, 1, 0}; // Y, U, V of V, U, Y, X
-    for (const int plane : kPlanes)
-        for (int32_t y = 0; y < pixels.Height(); ++y) {
-            const uint8_t* const from = pixels.Row(y) + plane;
-            for (int32_t x = 0; x < pixels.Width(); ++x) bytes += static_cast<char>(from[4 * x]);
-        }
 }
 
 } // namespace
@@ -123,7 +129,7 @@ Y4MReader::Y4MReader(const std::string& name, const std::string& matrix) : fFile
     if (!line || !line->starts_with(kMagic))
         throw Failure(kExitFile, "'" + fFile.Name() + "' is no Y4M stream");
     fHead = HeadParser(fFile.Name(), matrix).Parse(*line);
-    fBytes.resize(DenseBytes(fHead.width, fHead.height));
+    fBytes.resize(FrameBytes(fHead));
 }
 
 bool Y4MReader::Read(Frame& frame) {
@@ -136,7 +142,10 @@ bool Y4MReader::Read(Frame& frame) {
     if (got != fBytes.size())
         throw Failure(kExitFile, "the stream '" + fFile.Name() + "' ends within a frame, " +
                                      std::to_string(got) + " bytes into " + std::to_string(fBytes.size()));
-    FromDense(fBytes, RowPacking::Planes, frame);
+    if (HasSamplePlanes(fHead.format))
+        FromSamplePlanes(fBytes, frame);
+    else
+        FromDense(fBytes, RowPacking::Planes, frame);
     fHasFrames = true;
     return true;
 }
@@ -148,8 +157,11 @@ Y4MWriter::Y4MWriter(const std::string& name, const Y4MHead& head) : fFile(name)
 
 void Y4MWriter::Write(const Frame& frame) {
     std::string bytes = "FRAME\n";
-    if (fFormat == PK_PixelFormat_Invalid) {
-        AppendPlanesOf444(frame, bytes);
+    if (Is422(fFormat)) {
+        AppendSamplePlanes(frame, bytes);
+    } else if (fFormat == PK_PixelFormat_Invalid) {
+        AppendSamplePlanes(Converted(frame, FormatOf444(Is709("", frame.PixelSize())), kDefaultQuality),
+                           bytes);
     } else {
         const std::vector<uint8_t> planes = ToDense(frame, RowPacking::Planes);
         bytes.append(planes.begin(), planes.end());

@@ -21,13 +21,13 @@ struct Y4MHead {
     std::string aspect = "1:1";
     int32_t field = 0; ///< the earlier one, 1 for that of the top row, 2 for the other; 0: progressive
 
-    /// A format of planar 4:2:0, of any matrix; Invalid: planes of 4:4:4 in limited range.
+    /// A format of planar 4:2:0, or UYVY_422_8u or VUYX_4444_8u, of any matrix; Invalid: planes of 4:4:4 in limited range.
     PK_PixelFormat format = PK_PixelFormat_Invalid;
 };
 
 class Y4MReader {
 public:
-    /// Throws for what is no stream of 4:2:0 with 8 bits. Interlaced pictures are field pictures.
+    /// Throws for what is no stream of 4:2:0, 4:2:2 or 4:4:4 with 8 bits. Interlaced pictures of 4:2:0 are field pictures.
     /// \param matrix  as Is709 takes it.
     Y4MReader(const std::string& name, const std::string& matrix);
 
@@ -50,7 +50,7 @@ public:
     Y4MWriter(const std::string& name, const Y4MHead& head);
 
     /// Of the size of the stream. For planes of 4:4:4 any raster format, and what is transparent is seen over black; for
-    /// 4:2:0 that of the head.
+    /// 4:2:0 and 4:2:2 that of the head.
     void Write(const Frame& frame);
     void Commit() { fFile.Commit(); }
 

@@ -34,9 +34,15 @@ public:
 };
 
 void AddCommands(CLI::App& program) {
-    for (const Command* command : Command::All()) {
-        CLI::App* app = program.add_subcommand(command->Name(), command->Description());
-        app->group(command->Heading());
+    for (const Command* command : Command::All()) { // a family before what belongs to it
+        const std::string family = command->Family();
+        CLI::App* const parent = family.empty() ? &program : program.get_subcommand(family);
+        CLI::App* const app = parent->add_subcommand(command->Name(), command->Description());
+        app->group(family.empty() ? command->Heading() : "Commands");
+        if (command->IsFamily()) {
+            app->require_subcommand(1);
+            continue;
+        }
         Words words(*app);
         app->callback(command->Declare(words));
     }

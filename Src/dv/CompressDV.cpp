@@ -69,7 +69,7 @@ PK_Result CompressDV25(const void* src, int32_t rowBytes, PK_PixelFormat format,
 
     const int32_t written = RunDVEncoder({top, rowBytes, dst, dstBytes, width, height, flags, kind});
     if (written < 0) return written;
-    return written == dstBytes ? PK_Success : PK_ErrBadDVDestination;
+    return written == dstBytes && written != 0 ? PK_Success : PK_ErrBadDVDestination;
 }
 
 PK_Result CompressDV50(const void* src, int32_t rowBytes, int32_t width, int32_t height, void* dst,

@@ -2,8 +2,8 @@
 
 // The variable-length code as an encoder looks it up: by the run of zeros and the amplitude that ends it.
 
-#include "primitives/DVCodes.h"
 #include "dv/DVTables.h"
+#include "primitives/DVCodes.h"
 
 #include <array>
 

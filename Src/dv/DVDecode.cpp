@@ -137,15 +137,25 @@ private:
         ToBytes(block, bytes);
         const uint8_t* from = bytes + side * lines.first + firstOfBlock;
         const Plane<uint8_t>& plane = fPlanes[place.plane];
-        uint8_t* to = plane.Row(lines.row) + x;
-        for (int32_t i = 0; i < lines.count; ++i) {
-            if (columns == kSide)
-                std::memcpy(to, from, kSide);
-            else
-                std::memcpy(to, from, static_cast<size_t>(columns));
-            from += side * lines.step;
-            to += plane.rowBytes * lines.rowStep;
+        uint8_t* const to = plane.Row(lines.row) + x;
+        const ptrdiff_t toStep = plane.rowBytes * lines.rowStep;
+        const int32_t fromStep = side * lines.step;
+        switch (columns) {
+        case 8:
+            return CopyLines<8>(from, fromStep, to, toStep, lines.count);
+        case 4:
+            return CopyLines<4>(from, fromStep, to, toStep, lines.count);
+        case 2:
+            return CopyLines<2>(from, fromStep, to, toStep, lines.count);
+        default:
+            return CopyLines<1>(from, fromStep, to, toStep, lines.count);
         }
+    }
+
+    template <size_t kColumns>
+    static void CopyLines(const uint8_t* from, int32_t fromStep, uint8_t* to, ptrdiff_t toStep,
+                          int32_t count) {
+        for (; count > 0; --count, from += fromStep, to += toStep) std::memcpy(to, from, kColumns);
     }
 
     const DecodedPicture& fPicture;
@@ -243,7 +253,8 @@ void DecodeDVToPlanes(const uint8_t* frame, const DecodedPicture& picture, const
     ForEachSegment(frame, picture, PlaneWriter(picture, planes));
 }
 
-void DecodeDVToYUYV(const uint8_t* frame, const DecodedPicture& picture, uint8_t* pixels, ptrdiff_t rowBytes) {
+void DecodeDVToYUYV(const uint8_t* frame, const DecodedPicture& picture, uint8_t* pixels,
+                    ptrdiff_t rowBytes) {
     ForEachSegment(frame, picture, YUYVWriter(picture, pixels, rowBytes));
 }
 

@@ -93,7 +93,8 @@ inline constexpr auto kAreaShift = [] {
 }();
 static_assert(kAreaShift[0] == 0x03020201 && kAreaShift[3] == 0x05050404 && kAreaShift[63] == 0x01010101);
 
-/// The weights of the forward transforms as 16-bit fractions, those of AC rounded before they are halved; 1/4 for DC.
+/// The weights of the forward transforms as 16-bit fractions, those of AC rounded before they are halved; 1/4 for DC. The
+/// one weight of 1/2, of the difference of the fields, does not fit a signed value: it stands there as -1/2.
 inline constexpr auto kForwardWeights = [] {
     std::array<DVFactors, kDVModes> weights{};
     for (int32_t mode = 0; mode < kDVModes; ++mode)

@@ -30,4 +30,21 @@ private:
     uint32_t fSaved;
 };
 
+/// The mode that a program begins with, for what is made once and must not depend on who needs it first. Nothing of it is
+/// seen by the caller.
+class InitialFloatMode {
+public:
+    InitialFloatMode() noexcept : fSaved(_mm_getcsr()) {
+        constexpr uint32_t kInitial = 0x1f80; // rounding to nearest, all exceptions masked
+        _mm_setcsr(kInitial);
+    }
+    ~InitialFloatMode() { _mm_setcsr(fSaved); }
+
+    InitialFloatMode(const InitialFloatMode&) = delete;
+    InitialFloatMode& operator=(const InitialFloatMode&) = delete;
+
+private:
+    uint32_t fSaved;
+};
+
 } // namespace PK

@@ -16,6 +16,8 @@
 #include "convert/DVRowKernels.h"
 #include "convert/KernelTable.h"
 #include "convert/PlanarKernels.h"
+#include "dv/DVBlockKernels.h"
+#include "dv/DVSampleKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
 #include "filters/GaussianBlurKernels.h"
@@ -107,7 +109,11 @@ constexpr KernelRow kPrimitives[] = {
     Entry<&BlockTransformKernels::inverse248>("InverseDCT248", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::inverse88>("LevelsToSamples_88", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::inverse248>("LevelsToSamples_248", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVFourBlocksKernels::inverse88>("LevelsOfFourToSamples_88", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVFourBlocksKernels::inverse248>("LevelsOfFourToSamples_248", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::half>("LevelsToSamples_Half", {SignedWords(64), SignedWords(16)}),
+    Entry<&DVTransformKernels::quarter88>("LevelsToSamples_Quarter88", {SignedWords(64), SignedWords(4)}),
+    Entry<&DVTransformKernels::quarter248>("LevelsToSamples_Quarter248", {SignedWords(64), SignedWords(4)}),
     Entry<&DVMacroblockKernels::toBytes>("SamplesToBytes", {SignedWords(64), Bytes(64)}),
     Entry<&DVMacroblockKernels::toYUYV>("SamplesToYUYV", {SignedWords(64), Bytes(32)}),
 };
@@ -383,6 +389,16 @@ constexpr KernelRow kMotion[] = {
     Sampler<&MotionResampleKernels::alphaFirst>("ResampleMotionRow", PK_PixelFormat_PRGB_4444_32f_Linear),
 };
 
+constexpr KernelRow kDV[] = {
+    Entry<&DVSampleKernels::loadYUYV>("LoadDVBlocks_YUYV", {Bytes(256), SignedWords(256)}),
+    Entry<&DVSampleKernels::loadUYVY>("LoadDVBlocks_UYVY", {Bytes(256), SignedWords(256)}),
+    Entry<&DVBlockKernels::lineDifferences>("DVLineDifferences", {SignedWords(64), Integers(2)}),
+    Entry<&DVBlockKernels::greatest>("GreatestOfDVBlock", {SignedWords(64), Integers(1)}),
+    Entry<&DVBlockKernels::scale>("ScaleDVBlock", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVBlockKernels::sumOfLogarithms>("SumOfDVLogarithms", {SignedWords(64), Integers(1)}),
+    Entry<&DVBlockKernels::quantise>("QuantiseDVBlock", {SignedWords(64), Bytes(73)}),
+};
+
 constexpr KernelRow kColour[] = {
     Entry<&GammaKernels::convert>("ConvertGammaKernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
     Entry<&PQKernels::toRec709>("PQToRec709Kernel", {kBGRA32f, kBGRA32f}, kUnlessFused, kEights),
@@ -414,6 +430,7 @@ std::vector<KernelRow> KernelRegister() {
     add(kDissolves);
     add(kDeinterlacing);
     add(kMotion);
+    add(kDV);
     add(kColour);
     return all;
 }

@@ -57,8 +57,15 @@ std::string WordsOfCall(const Request& request, int32_t rowBytes) {
            Words(request.pixelFormat) + (request.isNull ? ", null buffer" : "");
 }
 
+/// A frame is filled whole, whatever the size.
+bool IsDV25(PK_PixelFormat format) {
+    return format == PK_PixelFormat_NTSCDV25 || format == PK_PixelFormat_PALDV25;
+}
+
 /// Memory for as much as a fill may touch; none where it may touch nothing.
 RowsLayout DrawImage(ByteStream& stream, const Request& request) {
+    if (IsDV25(request.format))
+        return {static_cast<size_t>(PK_PixelFormatSize(request.format, 0, 0)), 1, stream.AnyI32()};
     if (!request.size.HasPixels()) return {0, 0, stream.AnyI32()};
     const auto [width, height] = request.size;
     if (PK::Is420Planar(request.format)) {
@@ -114,7 +121,8 @@ void FuzzFills(ByteStream& stream) {
     CheckIsNamed(result);
     image.CheckPadding();
     const std::vector<uint8_t> rows = image.Rows();
-    if (!request.size.IsPossible() || request.isNull)
+    const bool isPossible = request.size.IsPossible() || IsDV25(request.format);
+    if (!isPossible || request.isNull)
         CheckSame(untouched, rows, "what is impossible writes nothing");
     else if (result == PK_Success && IsOfUnits(request.format))
         CheckRepeats(request, rows, layout.rowLength, before);

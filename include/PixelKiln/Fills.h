@@ -34,7 +34,7 @@ extern "C" {
 /// \param height    rows, not negative.
 /// \param format    the format of the image.
 /// \return
-///  - PK_Success: filled. A width or height of 0 does nothing, with any buffer.
+///  - PK_Success: filled. A width or height of 0 does nothing, with any buffer, but to a frame of DV25.
 ///  - PK_ErrBadSrcFormat: a stream that is neither DV nor a well-formed planar 4:2:0 format.
 ///  - PK_ErrNotSupported: any other depth or layout, RGB_444_10u among them.
 ///  - PK_ErrFailed: a null buffer, a negative width or height, a width too great, or planes too large for 32 bits.

@@ -40,8 +40,8 @@ extern "C" {
 /// Fields: 0 is a progressive image or all rows; 1 is the field on rows 0, 2, 4 and so on, 2 that on rows 1, 3, 5 and so
 /// on. For an image, 1 or 2 tells which of them comes first in time.
 ///
-/// Memory: row bytes may be of either sign; no alignment is asked for. Row bytes of a stream are not looked at. Source and
-/// destination must not overlap.
+/// Memory: row bytes may be of either sign; no alignment is asked for. Row bytes of a stream are not looked at, but for a DV25
+/// or DV100 destination, whose row bytes are the bytes of the frame. Source and destination must not overlap.
 ///
 /// Threads: motion is a task on all processors, all else runs on the calling thread. May be called from any number of
 /// threads at the same time on different destinations. PK_Initialize must have been called. The floating-point mode is

@@ -45,7 +45,7 @@ void AddConversions(Calls& calls) {
                          }});
 }
 
-/// The pictures between stream and raster are there before the codec that is not.
+/// Pictures between stream and raster, one of them of a size that is refused.
 void AddStreams(Calls& calls) {
     constexpr int32_t kDVWidth = 720, kDVHeight = 480;
     const std::vector<uint8_t> picture = Content(4 * kDVWidth * kDVHeight);
@@ -55,15 +55,21 @@ void AddStreams(Calls& calls) {
                      [stream = Content(240000)](uint8_t* block) {
                          return PK_Convert(stream.data(), 0, PK_PixelFormat_NTSCDV50, block, 4 * kDVWidth,
                                            PK_PixelFormat_BGRA_4444_8u, kDVWidth, kDVHeight, 4);
-                     },
-                     PK_ErrNotSupported});
+                     }});
+    calls.push_back({{"PK_Convert"},
+                     TakesOrRefuses("the planes of the picture"),
+                     picture,
+                     [stream = std::vector<uint8_t>(120000)](uint8_t* block) {
+                         return PK_Convert(stream.data(), 0, PK_PixelFormat_NTSCDV25, block, 4 * kDVWidth,
+                                           PK_PixelFormat_BGRA_4444_8u, kDVWidth, kDVHeight, 4);
+                     }});
     calls.push_back({{"PK_Convert"},
                      TakesOrRefuses("the picture that is encoded, and the rows to it"),
                      Content(240000),
                      [source = Image(PK_PixelFormat_ARGB_4444_15u)](uint8_t* block) {
                          return Convert(source, block, PK_PixelFormat_NTSCDV50);
                      },
-                     PK_ErrNotSupported});
+                     PK_ErrBadDVSourceSize});
 }
 
 Call MaskComposite(PK_PixelFormat first, PK_PixelFormat second, PK_PixelFormat to, Memory memory) {

@@ -161,8 +161,7 @@ TEST(NamedFills, RefuseOrLeaveWhatTheyCannotFill) {
         EXPECT_EQ(fill(pixels, 64, 1, 1, PK_PixelFormat_RGB_444_10u), PK_ErrNotSupported);
         EXPECT_EQ(fill(pixels, 64, 1, 1, PK_PixelFormat_Invalid), PK_ErrNotSupported);
         EXPECT_EQ(fill(pixels, 64, 1, 1, 0x1c4), PK_ErrNotSupported);
-        EXPECT_EQ(fill(pixels, 64, 1, 1, PK_PixelFormat_NTSCDV25), PK_ErrNotSupported);
-        EXPECT_EQ(fill(pixels, 64, 1, 1, PK_PixelFormat_PALDV25), PK_ErrNotSupported);
+        EXPECT_EQ(fill(nullptr, 64, 1, 1, PK_PixelFormat_NTSCDV25), PK_ErrFailed);
         EXPECT_EQ(fill(pixels, 64, 1, 1, kMalformed420), PK_ErrBadSrcFormat);
         EXPECT_EQ(fill(pixels, 64, 1, 1, kUnknownStream), PK_ErrBadSrcFormat);
         for (const PK_PixelFormat format :

@@ -53,6 +53,62 @@ DecodeTarget Choose(const Picture& picture, int32_t width, int32_t height, int32
     return target;
 }
 
+/// What DV25 is decoded to for a wish.
+DecodeTarget ChooseDV25(PK_PixelFormat stream, const DecodeTarget& wanted, int32_t quality) {
+    DecodeTarget target{};
+    const int32_t height = stream == PK_PixelFormat_NTSCDV25 ? 480 : 576;
+    EXPECT_EQ(ChooseDecodeTarget({stream, 720, height}, wanted, quality, target), PK_Success);
+    return target;
+}
+
+TEST(Streams, DV25DecodesToTheSmallestSizeAboveTheWantedOne) {
+    constexpr PK_PixelFormat kBGRA = PK_PixelFormat_BGRA_4444_8u;
+    struct Wish {
+        int32_t width, height, quality;
+        int32_t givenWidth, givenNTSC; // height; that of PAL is 6/5 of it
+    };
+    // Heights of wishes are those of NTSC.
+    constexpr Wish kWishes[] = {
+        {720, 480, 0, 720, 480}, {720, 240, 0, 720, 240}, {720, 235, 5, 720, 240}, {1, 1, 3, 720, 240},
+        {1, 245, 3, 720, 480},   {360, 240, 2, 720, 240}, {359, 240, 2, 720, 240}, {359, 235, 2, 360, 240},
+        {360, 1, 0, 720, 240},   {90, 60, 2, 90, 60},     {91, 60, 2, 180, 120},   {90, 65, 0, 180, 120},
+        {180, 120, 2, 180, 120}, {181, 120, 2, 360, 240}, {180, 125, 2, 360, 240}, {100, 300, 2, 720, 480},
+        {1, 1, 2, 90, 60},
+    };
+    for (const Wish& wish : kWishes)
+        for (const bool isPAL : {false, true}) {
+            const auto ofSystem = [&](int32_t height) { return isPAL ? height * 6 / 5 : height; };
+            const DecodeTarget expected = {kBGRA, wish.givenWidth, ofSystem(wish.givenNTSC)};
+            EXPECT_EQ(ChooseDV25(isPAL ? PK_PixelFormat_PALDV25 : PK_PixelFormat_NTSCDV25,
+                                 {kBGRA, wish.width, ofSystem(wish.height)}, wish.quality),
+                      expected)
+                << wish.width << " x " << wish.height << ", quality " << wish.quality;
+        }
+}
+
+TEST(Streams, DV25DecodesToEightBits) {
+    constexpr PK_PixelFormat kFormats[][2] = {
+        {PK_PixelFormat_BGRA_4444_8u, PK_PixelFormat_BGRA_4444_8u},
+        {PK_PixelFormat_BGRP_4444_8u, PK_PixelFormat_BGRP_4444_8u},
+        {PK_PixelFormat_BGRX_4444_8u, PK_PixelFormat_BGRX_4444_8u},
+        {PK_PixelFormat_VUYA_4444_8u, PK_PixelFormat_VUYA_4444_8u},
+        {PK_PixelFormat_VUYP_4444_8u, PK_PixelFormat_VUYP_4444_8u},
+        {PK_PixelFormat_VUYX_4444_8u, PK_PixelFormat_VUYX_4444_8u},
+        {PK_PixelFormat_VUYA_4444_8u_709, PK_PixelFormat_VUYX_4444_8u},
+        {PK_PixelFormat_VUYP_4444_32f, PK_PixelFormat_VUYX_4444_8u},
+        {PK_PixelFormat_BGRA_4444_32f, PK_PixelFormat_VUYX_4444_8u},
+        {PK_PixelFormat_ARGB_4444_8u, PK_PixelFormat_BGRX_4444_8u},
+        {PK_PixelFormat_BGRA_4444_15u, PK_PixelFormat_BGRX_4444_8u},
+        {PK_PixelFormat_YUYV_422_8u, PK_PixelFormat_UYVY_422_8u},
+        {PK_PixelFormat_UYVY_422_8u_709, PK_PixelFormat_UYVY_422_8u},
+        {PK_PixelFormat_V210_422_10u, PK_PixelFormat_UYVY_422_8u},
+        {PK_PixelFormat_RGB_444_10u, PK_PixelFormat_UYVY_422_8u},
+    };
+    for (const auto& [wanted, given] : kFormats)
+        EXPECT_EQ(given, ChooseDV25(PK_PixelFormat_PALDV25, {wanted, 720, 576}, 2).format)
+            << std::hex << wanted;
+}
+
 TEST(Streams, DVDecodesToItsNativeFormatAtFullSize) {
     for (const Picture& picture : kPictures) {
         const auto& [format, width, height] = picture.native;

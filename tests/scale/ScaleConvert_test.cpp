@@ -191,16 +191,33 @@ TEST(ScaleConvert, RowBytesOfFieldsAreTheDouble) {
                   PK_ErrFailed);
 }
 
-TEST(ScaleConvert, StreamsWithoutDecoderAreRefused) {
-    std::vector<uint8_t> stream(480000), picture(720 * 240 * 4, 7);
-    for (const int32_t quality : {2, 3})
-        EXPECT_EQ(PK_ScaleConvert(stream.data(), 0, 720, 480, PK_PixelFormat_NTSCDV50, 1, picture.data(),
-                                  2880, 720, 240, kBGRA, 0, quality),
-                  PK_ErrNotSupported);
-    EXPECT_EQ(PK_ScaleConvert(picture.data(), 2880, 720, 240, kBGRA, 0, stream.data(), 0, 720, 480,
-                              PK_PixelFormat_NTSCDV50, 0, 2),
-              PK_ErrNotSupported);
-    for (const uint8_t byte : picture) ASSERT_EQ(byte, 7);
+TEST(ScaleConvert, AFieldOfDVHasTheRowsOfItsParity) {
+    constexpr int32_t kWidth = 720, kHeight = 480, kRowBytes = 2 * kWidth;
+    std::vector<uint8_t> picture(kRowBytes * kHeight), whole(picture.size());
+    for (size_t i = 0; i < picture.size(); ++i)
+        picture[i] = static_cast<uint8_t>(100 + (i / kRowBytes % 2 == 0 ? 40 : 0) + i % 13);
+    for (const PK_PixelFormat stream : {PK_PixelFormat_NTSCDV25, PK_PixelFormat_NTSCDV50}) {
+        const PK_PixelFormat pairs =
+            stream == PK_PixelFormat_NTSCDV25 ? PK_PixelFormat_UYVY_422_8u : PK_PixelFormat_YUYV_422_8u;
+        std::vector<uint8_t> frame(static_cast<size_t>(PK_PixelFormatSize(stream, 0, 0)));
+        ASSERT_EQ(PK_Convert(picture.data(), kRowBytes, pairs, frame.data(),
+                             static_cast<int32_t>(frame.size()), stream, kWidth, kHeight, 2),
+                  PK_Success);
+        ASSERT_EQ(PK_Convert(frame.data(), 0, stream, whole.data(), kRowBytes, pairs, kWidth, kHeight, 2),
+                  PK_Success);
+        for (const int32_t field : {0, 1, 2})
+            for (const int32_t quality : {2, 3}) {
+                std::vector<uint8_t> rows(whole.size() / 2);
+                ASSERT_EQ(PK_ScaleConvert(frame.data(), 0, kWidth, kHeight, stream, field, rows.data(),
+                                          kRowBytes, kWidth, kHeight / 2, pairs, 0, quality),
+                          PK_Success);
+                for (int32_t row = 0; row < kHeight / 2; ++row) {
+                    const auto expected = whole.begin() + kRowBytes * (2 * row + (field == 2 ? 1 : 0));
+                    ASSERT_TRUE(std::equal(expected, expected + kRowBytes, rows.begin() + kRowBytes * row))
+                        << "field " << field << ", row " << row;
+                }
+            }
+    }
 }
 
 TEST(ScaleConvert, OfPlanesChecksItsArgumentsInOrder) {

@@ -23,7 +23,7 @@ rm out/quiet.png
 
 expect 1 "cannot fill a frame of UYVY_422_8u at 2x2: the destination format is not accepted" \
     fill out/x.raw --size 2x2 --to UYVY_422_8u --colour clear-black
-expect 1 "this combination is not offered" fill out/x.raw --size 720x480 --to NTSCDV25 --colour black
+expect 1 "this combination is not offered" fill out/x.raw --size 2x2 --to RGB_444_10u --colour black
 expect 1 "cannot fill a frame of RGB_444_10u" fill out/x.raw --size 2x2 --to RGB_444_10u --colour 1,2,3,4
 expect 2 "name it with --to" fill out/x.raw --size 2x2 --colour black
 expect 2 "--size" fill out/x.png --colour black

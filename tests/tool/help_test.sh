@@ -15,6 +15,18 @@ for command in $commands; do
     expect 2 "Run with --help" "$command" --nosuch
 done
 
+# Commands of a family are listed on its page.
+family=$("$program" dv --help | sed -n '/^Commands:/,/^$/p' | awk '/^  [a-z]/ { print $1 }')
+is "the family of DV" "$(echo $family)" "decode draw encode info merge"
+for command in $family; do
+    expect 0 "pixelkiln dv $command [OPTIONS]" dv "$command" --help
+    is "dv $command is described" "$("$program" dv "$command" --help | head -1)" \
+        "$("$program" dv --help | awk -v name="$command" '$1 == name { sub(/^  [a-z]+ +/, ""); print }')"
+    expect 2 "Run with --help" dv "$command" --nosuch
+done
+expect 2 "A subcommand is required" dv nosuch
+expect 2 "info" info dv
+
 expect 0 "Exit codes" --help
 expect 0 "pixelkiln 0." --version
 expect 0 "Examples:" convert --help

@@ -52,7 +52,7 @@ done
 expect 2 "--to" scale "$media/chelsea.png" out/x.raw --to-size 3x3
 expect 2 "tell --dst-field" scale "$media/chelsea.png" out/x.png --to-size 3x3 --render-field 1
 expect 2 "--src-field" scale "$media/chelsea.png" out/x.png --to-size 3x3 --src-field 3
-expect 1 "cannot scale" scale "$media/chelsea.png" out/x.raw --to NTSCDV50 --to-size 720x480
+expect 1 "cannot scale" scale "$media/chelsea.png" out/x.raw --to NTSCDV50 --to-size 720x486
 expect 3 "No such file" scale in/missing.png out/x.png --to-size 3x3
 is "nothing left behind" "$(names out)" ""
 

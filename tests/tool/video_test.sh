@@ -142,6 +142,24 @@ is "of frames" "$(decimal < x.yuv)" "1 1 2 2 3 3 4 4 15 35 128 128"
 expect 0 "" convert in/rows.raw x.yuv --from VUYX_4444_8u --to yuv420p:fields --size 2x4 --packed
 is "of fields" "$(decimal < x.yuv)" "1 1 2 2 3 3 4 4 20 30 128 128"
 
+# 4:2:2 and 4:4:4, which have formats of interleaved samples.
+stream "W3 H2 F50:1 Ib A59:54 C422" "11 12 13 21 22 23 1 2 3 4 5 6 7 8" > in/422.y4m
+expect 0 "3x2, UYVY_422_8u to UYVY_422_8u" convert in/422.y4m x.raw --to UYVY_422_8u --packed
+is "samples of 4:2:2" "$(decimal < x.raw)" "1 11 5 12 2 13 6 0 3 21 7 22 4 23 8 0"
+expect 0 "3x2, UYVY_422_8u to UYVY_422_8u" convert in/422.y4m x.y4m
+is "its head goes on" "$(head_of x.y4m)" "YUV4MPEG2 W3 H2 F50:1 Ib A59:54 C422 XCOLORRANGE=LIMITED"
+is "and its planes" "$(planes x.y4m)" "11 12 13 21 22 23 1 2 3 4 5 6 7 8"
+stream "W2 H2 C444" "11 12 21 22 1 2 3 4 5 6 7 8" > in/444.y4m
+expect 0 "2x2, VUYX_4444_8u to VUYX_4444_8u" convert in/444.y4m x.y4m
+is "planes of 4:4:4" "$(head_of x.y4m) $(planes x.y4m)" \
+    "YUV4MPEG2 W2 H2 F25:1 Ip A1:1 C444 XCOLORRANGE=LIMITED 11 12 21 22 1 2 3 4 5 6 7 8"
+stream "W2 H2 C444" "235 16 16 235 128 128 128 128 128 128 128 128" > in/chequers.y4m
+is "4:4:4 to RGB" "$("$program" convert in/chequers.y4m - --to BGRX_4444_8u --packed | hex)" \
+    "00 00 00 ff ff ff ff ff ff ff ff ff 00 00 00 ff"
+# Players take streams of many rows for Rec. 709, whatever the samples are.
+expect 0 "UYVY_422_8u_709 to UYVY_422_8u_709" convert in/422.y4m x.y4m --matrix 709
+is "of the other matrix" "$(head_of x.y4m | grep -o ' C4..')" " C444"
+
 # What works on pixels gets pixels, and the output is planes again.
 expect 0 "4x4, YUV_420_MPEG4_FRAME to YUV_420_MPEG4_FRAME" rotate in/four.y4m turned.y4m --degrees 180
 is "a stream turned" "$(planes turned.y4m | cut -d ' ' -f 1-16)" "44 43 42 41 34 33 32 31 24 23 22 21 14 13 12 11"
@@ -160,7 +178,12 @@ refused() {
 }
 refused "has the chroma of DV in PAL (C420paldv)" "W2 H2 C420paldv"
 refused "is of mixed frames (Im)" "W2 H2 Im"
-refused "has the colour space C422;" "W2 H2 C422"
+refused "has the colour space C440;" "W2 H2 C440"
+refused "is C422 of the full range" "W2 H2 C422 XCOLORRANGE=FULL"
+refused "is C444 of the full range" "W2 H2 XCOLORRANGE=FULL C444"
+refused "ends within a frame, 6 bytes into 8" "W2 H2 C422"
+refused "ends within a frame, 6 bytes into 12" "W2 H2 C444"
+refused "has the colour space C444alpha;" "W2 H2 C444alpha"
 refused "has the colour space C420p10;" "W2 H2 C420p10"
 refused "has the colour space Cmono;" "W2 H2 Cmono"
 refused "tells no size" "W2"

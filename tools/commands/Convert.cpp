@@ -19,7 +19,8 @@ yuv420p, yuvj420p (of the full range) and nv12 are the planes that FFmpeg has by
 padding. What they leave open may stand behind them, as in nv12:center:fields: chroma :left as in MPEG-2
 or in the :center, progressive :frames or interlaced :fields. What is still open is as in the input, else
 left, frames and the matrix of the size. A Y4M stream tells all but the matrix. It is read from planes of
-4:2:0, and written with those of the input or of --to, or else with planes of 4:4:4.
+4:2:0, 4:2:2 (as UYVY_422_8u) or 4:4:4 (as VUYX_4444_8u), and written with those of 4:2:0 or 4:2:2 that
+the input or --to has, or else with planes of 4:4:4.
 
 Examples:
   pixelkiln convert photo.png photo.v210 --to V210_422_10u
