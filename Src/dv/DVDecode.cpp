@@ -1,5 +1,6 @@
 #include "dv/DVDecode.h"
 
+#include "frame/FloatMode.h"
 #include "primitives/DVMacroblocks.h"
 
 #include <algorithm>
@@ -72,6 +73,7 @@ int32_t FirstChannel(const uint8_t* frame, const DVFormat& format) {
 template <class Write>
 void ForEachSegment(const uint8_t* frame, const DecodedPicture& picture, const Write& write) {
     const DVFormat& format = picture.format;
+    const InitialFloatMode mode; // a frame stands for the same samples whatever the caller's mode is
     const int32_t firstChannel = FirstChannel(frame, format);
     DVDecodeState state(format, picture.size);
     for (int32_t channel = 0; channel < format.channels; ++channel)

@@ -82,7 +82,9 @@ DVSteps DVDecodeState::Steps(int32_t macroblock, int32_t block) const {
     if (!fFormat.IsHD()) return {&kInverseSteps[mode][kDVQuantRow[classNumber][qno]], 1};
     constexpr int32_t kLumaBlocks = 4;
     const auto& weights = kInverseWeights[(fFormat.isProgressive ? 2 : 0) + (block < kLumaBlocks ? 0 : 1)];
-    return {&weights, static_cast<float>(kDV100Steps[qno] << classNumber)};
+    constexpr float kHalvesGoUp =
+        1 / (2 * kDV100WeightUnit); // and nothing else does: products are in these units
+    return {&weights, static_cast<float>(kDV100Steps[qno] << classNumber), kHalvesGoUp};
 }
 
 bool DVDecodeState::Is248(int32_t macroblock, int32_t block) const {

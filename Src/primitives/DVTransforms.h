@@ -19,6 +19,7 @@ struct DVFactorTable {
 struct DVSteps {
     const DVFactorTable* factors;
     float step;
+    float bias = 0; ///< What is added to products before they are rounded.
 };
 
 /// The bodies of one target. Levels times factors, rounded to integers, are coefficients of the orthonormal transforms

@@ -10,19 +10,19 @@ namespace {
 /// Levels as coefficients. What DC gives to every sample is added at the end.
 struct Levels {
     Levels(const int16_t* levels, const DVSteps& by)
-        : block(levels), factors(by.factors->raster), step(Floats(by.step)),
+        : block(levels), factors(by.factors->raster), step(Floats(by.step)), bias(Floats(by.bias)),
           flat(Floats(0.5f * static_cast<float>(levels[0]))) {}
 
     F32 Load(int line, int column = 0) const {
         const int place = kSide * line + column;
         return ToFloat(
-            Nearest(ToFloat(LoadSignedWords(block + place)) * (LoadFloats(factors + place) * step)));
+            Nearest(ToFloat(LoadSignedWords(block + place)) * (LoadFloats(factors + place) * step) + bias));
     }
     F32 Finish(F32 samples) const { return samples + flat; }
 
     const int16_t* block;
     const float* factors;
-    F32 step, flat;
+    F32 step, bias, flat;
 };
 
 template <class ColumnButterfly>
@@ -37,13 +37,15 @@ public:
 
     LevelsOfLanes(const int16_t* levels, const DVSteps* steps) : fLevels(levels) {
         fFactors = reinterpret_cast<const uint8_t*>(steps[0].factors->parted);
-        float step[kBlocks], flat[kBlocks];
+        float step[kBlocks], bias[kBlocks], flat[kBlocks];
         for (int i = 0; i < kBlocks; ++i) {
             step[i] = steps[i].step;
+            bias[i] = steps[i].bias;
             flat[i] = 0.5f * static_cast<float>(levels[kLevels * i]);
             fToFactors[4 * i] = reinterpret_cast<const uint8_t*>(steps[i].factors->parted) - fFactors;
         }
         fStep = LoadOnePerBlock(step);
+        fBias = LoadOnePerBlock(bias);
         fFlat = LoadOnePerBlock(flat);
     }
 
@@ -59,13 +61,13 @@ private:
 
     F32 Coefficients(I32 levels, int halfLine) const {
         const F32 factors = LoadFloatBlocksAt(fFactors + 4 * halfLine * sizeof(float), fToFactors);
-        return ToFloat(Nearest(ToFloat(levels) * (factors * fStep)));
+        return ToFloat(Nearest(ToFloat(levels) * (factors * fStep) + fBias));
     }
 
     const int16_t* fLevels;
     const uint8_t* fFactors;
     int64_t fToFactors[kLanes];
-    F32 fStep, fFlat;
+    F32 fStep, fBias, fFlat;
 };
 
 template <class ColumnButterfly>
@@ -90,7 +92,7 @@ void Quarter(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
         0.11548494f; // the mean of cos(pi / 8) and cos(3 pi / 8), by 1/2, and 1 / sqrt(8) across
     constexpr float kTwist = 0.10669417f; // the square of that mean, by 1/4
     const auto product = [&](int32_t place) {
-        return static_cast<float>(levels[place]) * (steps.factors->raster[place] * steps.step);
+        return static_cast<float>(levels[place]) * (steps.factors->raster[place] * steps.step) + steps.bias;
     };
     float coefficients[kLanes];
     Store(coefficients, ToFloat(Nearest(PixelFloats(product(1), product(8), kHasTwist ? product(9) : 0, 0))));

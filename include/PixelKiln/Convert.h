@@ -60,8 +60,8 @@ extern "C" {
 ///
 /// Threads: runs on the calling thread; may be called from any number of threads at the same time on
 /// different destinations. PK_Initialize must have been called. During the call MXCSR has the flush-to-zero
-/// and the precision bit set in addition, and rounds as the caller has it; it is restored on return, whatever
-/// the result, and pending x87 exceptions are cleared.
+/// and the precision bit set in addition, and rounds as the caller has it, but for the codecs of DV, which round to
+/// nearest; it is restored on return, whatever the result, and pending x87 exceptions are cleared.
 ///
 /// \param source               first byte of the image.
 /// \param sourceRowBytes       bytes from one row to the next.

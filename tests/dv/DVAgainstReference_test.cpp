@@ -1,6 +1,6 @@
 // Frames of DV decoded at full size, held to a decoder that was written from the tables of the standard alone.
 
-#include "dv/DVExpected.h"
+#include "support/DVExpected.h"
 #include "support/DVFrameWriter.h"
 #include "support/DVFrames.h"
 #include "support/Random.h"

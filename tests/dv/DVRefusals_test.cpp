@@ -1,6 +1,6 @@
 // What becomes of DV frames that are no good, of sizes that no decoder makes, and of bytes around a frame and its picture.
 
-#include "dv/DVExpected.h"
+#include "support/DVExpected.h"
 #include "support/DVFrameWriter.h"
 #include "support/DVFrames.h"
 #include "support/GuardedImage.h"

@@ -1,6 +1,6 @@
 // Fields, reduced sizes and kinds of output of DV frames, held to what the reference's planes say of them.
 
-#include "dv/DVExpected.h"
+#include "support/DVExpected.h"
 #include "support/DVFrames.h"
 
 #include <PixelKiln/ScaleConvert.h>

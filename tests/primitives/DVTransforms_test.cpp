@@ -30,8 +30,8 @@ double Wave(int k, int place, int period) {
 Reals Coefficients(const Levels& levels, const DVSteps& steps) {
     Reals coefficients;
     for (size_t i = 0; i < kPlaces; ++i)
-        coefficients[i] =
-            std::nearbyint(static_cast<double>(levels[i]) * steps.factors->raster[i] * steps.step);
+        coefficients[i] = std::nearbyint(
+            static_cast<double>(levels[i]) * steps.factors->raster[i] * steps.step + steps.bias);
     coefficients[0] = 4 * levels[0];
     return coefficients;
 }
@@ -122,6 +122,7 @@ TEST(DVTransforms, EverySingleLevel) {
             levels[place] = static_cast<int16_t>(level);
             Check(levels, {&factors, 1});
             Check(levels, {&factors, 3});
+            Check(levels, {&factors, 2, 0x1p-8f}); // halves of products in 128ths go up
         }
 }
 

@@ -119,8 +119,9 @@ Coefficients WithStepsOfDV100(const Block& block, int qno, const std::array<int,
     coefficients[0] = 4 * block.dc;
     for (size_t i = 1; i < 64; ++i) {
         const auto place = static_cast<size_t>(DVScan(false)[i].raster);
-        coefficients[place] = std::nearbyint(block.levels[i] * DV100Step(qno) *
-                                             std::pow(2, block.classNumber) * table[place] / 32);
+        const double product =
+            block.levels[i] * DV100Step(qno) * std::pow(2, block.classNumber) * table[place] / 32;
+        coefficients[place] = std::floor(product + 0.5);
     }
     return coefficients;
 }

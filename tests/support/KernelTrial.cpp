@@ -296,9 +296,10 @@ struct DrawnSteps {
         for (float& factor : factors.raster) factor = static_cast<float>(random.Below(32768)) / 256;
         for (int i = 0; i < 64; ++i) factors.parted[i - i % 8 + i % 8 / 2 + i % 2 * 4] = factors.raster[i];
         step = static_cast<float>(1 + random.Below(416));
+        bias = static_cast<float>(random.Below(2)) / 64;
     }
     PK::DVFactorTable factors;
-    float step;
+    float step, bias;
 };
 
 KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
@@ -310,7 +311,7 @@ KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
             Typed<Transform>([=](Transform run, const Sources& sources, uint8_t* destination) {
                 int16_t block[64];
                 std::memcpy(block, sources[0], sizeof block);
-                run(block, {&drawn->factors, drawn->step}, block);
+                run(block, {&drawn->factors, drawn->step, drawn->bias}, block);
                 std::memcpy(destination, block, samples.bytes);
             })};
 }
@@ -325,7 +326,8 @@ KernelTrial LevelsOfFourTrial(const KernelRow& kernel, int32_t, Random& random) 
             int16_t levels[kDVBlocksAtOnce * 64], samples[kDVBlocksAtOnce * 64];
             std::memcpy(levels, sources[0], sizeof levels);
             DVSteps steps[kDVBlocksAtOnce];
-            for (size_t i = 0; i < kDVBlocksAtOnce; ++i) steps[i] = {&(*drawn)[i].factors, (*drawn)[i].step};
+            for (size_t i = 0; i < kDVBlocksAtOnce; ++i)
+                steps[i] = {&(*drawn)[i].factors, (*drawn)[i].step, (*drawn)[i].bias};
             run(levels, steps, samples);
             std::memcpy(destination, samples, sizeof samples);
         })};

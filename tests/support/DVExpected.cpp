@@ -1,4 +1,4 @@
-#include "dv/DVExpected.h"
+#include "support/DVExpected.h"
 
 #include <gtest/gtest.h>
 
