@@ -57,7 +57,8 @@ void DV100SegmentCompressor::Compress(uint8_t* segment) {
     const bool isWhole = fPolicy.coefficientBits == 0;
     const auto& weights = isWhole ? kWeights<0> : kWeights<kBestBits - kBestDVPolicy.sampleBits>;
     const float roundUp = isWhole ? fPolicy.roundUpHD : kNearest;
-    for (int32_t place = 0; DVBlock & block : Blocks()) {
+    int32_t place = 0;
+    for (DVBlock& block : Blocks()) {
         const int32_t inMacroblock = place % kBlocks;
         const size_t table = (fIs720p ? 2 : 0) + (inMacroblock < kLumaBlocks ? 0 : 1);
         alignas(64) int16_t values[kCoefficients];

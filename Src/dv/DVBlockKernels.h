@@ -1,7 +1,6 @@
 #pragma once
 
-// What the encoders of DV do with the samples and coefficients of blocks of 8 x 8, around the transforms. Kernel sources
-// include this header.
+// What the encoders of DV do with the coefficients of blocks of 8 x 8. Kernel sources include this header.
 
 #include "primitives/simd/Targets.h"
 
@@ -26,16 +25,7 @@ struct DVQuantisation {
     float roundUp, least;
 };
 
-/// Where the samples of 16 x 8 pixels of 4:2:2 go, as blocks.
-struct DVSampleBlocks {
-    int16_t *luma, *cb, *cr;
-    int32_t lumaStride; ///< Values from the left block of luma to the right one.
-    int32_t bits;       ///< Samples less 128 are taken 2^bits times.
-};
-
 struct DVBlockKernels {
-    using Load = void (*)(const uint8_t* pixels, int64_t rowBytes, const DVSampleBlocks& blocks);
-    Load loadYUYV, loadUYVY;
     /// Every value becomes sign x (|value| x factor + roundUp), cut to an integer and saturated.
     void (*scale)(const DVBlockFactors& factors, float roundUp, int16_t* block);
     /// The sum of log2(1 + |value| x factor) in 2^-15, linear between powers of two.

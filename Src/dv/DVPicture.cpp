@@ -52,7 +52,7 @@ DVMacroblockSource::ChromaBlocks ChromaAt(int16_t* blocks, int32_t place) {
 
 DVMacroblockSource::DVMacroblockSource(const DVPicture& picture, int32_t sampleBits)
     : fPicture(picture), fBits(sampleBits),
-      fLoad(picture.isLumaFirst ? Best<DVBlockKernels>().loadYUYV : Best<DVBlockKernels>().loadUYVY) {}
+      fLoad(picture.isLumaFirst ? Best<DVSampleKernels>().loadYUYV : Best<DVSampleKernels>().loadUYVY) {}
 
 void DVMacroblockSource::TakePiece(int32_t x, int32_t y, int16_t* luma, const ChromaBlocks& chroma,
                                    int32_t lumaStride) const {

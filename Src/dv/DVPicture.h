@@ -2,8 +2,8 @@
 
 // The picture that the encoders of DV take, and its samples as blocks of a macroblock.
 
-#include "dv/DVBlockKernels.h"
 #include "dv/DVPlacement.h"
+#include "dv/DVSampleKernels.h"
 #include "dv/DVTables.h"
 
 namespace PK {
@@ -41,7 +41,7 @@ private:
 
     DVPicture fPicture;
     int32_t fBits;
-    DVBlockKernels::Load fLoad;
+    DVSampleKernels::Load fLoad;
 };
 
 } // namespace PK

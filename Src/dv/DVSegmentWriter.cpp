@@ -14,45 +14,46 @@ constexpr DVArea kAreasHD[] = {{4, 10}, {14, 10}, {24, 10}, {34, 10}, {44, 10}, 
 
 constexpr int32_t kBitsOfByte = 8;
 
-/// Words one behind the other, the highest bit first.
+uint64_t LoadBigEndian(const uint8_t* bytes) {
+    uint64_t word;
+    std::memcpy(&word, bytes, sizeof word);
+    return __builtin_bswap64(word);
+}
+
+void StoreBigEndian(uint8_t* bytes, uint64_t word) {
+    const uint64_t bigEndian = __builtin_bswap64(word);
+    std::memcpy(bytes, &bigEndian, sizeof bigEndian);
+}
+
+/// Words one behind the other, the highest bit first, and ones behind them.
 class BitWriter {
 public:
     explicit BitWriter(uint8_t* bytes) : fFirst(bytes), fNext(bytes) {}
 
     /// \param bits  up to 32, and none above `count`.
     void Put(uint32_t bits, int32_t count) {
-        fHeld = fHeld << count | bits;
         fCount += count;
-        if (fCount < kWord) return;
-        fCount -= kWord;
-        Store(static_cast<uint32_t>(fHeld >> fCount));
-        fNext += kWord / kBitsOfByte;
+        fHeld |= uint64_t{bits} << (kHeld - fCount);
+        StoreBigEndian(fNext, fHeld);
+        fNext += fCount / kBitsOfByte;
+        fHeld <<= fCount & ~(kBitsOfByte - 1);
+        fCount %= kBitsOfByte;
     }
 
     /// \return how many bits there are.
     int32_t Finish() {
-        Store(static_cast<uint32_t>(fHeld << (kWord - fCount)));
+        StoreBigEndian(fNext, fHeld | ~uint64_t{0} >> fCount);
+        std::memset(fNext + sizeof fHeld, 0xff, sizeof fHeld);
         return static_cast<int32_t>(fNext - fFirst) * kBitsOfByte + fCount;
     }
 
 private:
-    static constexpr int32_t kWord = 32;
-
-    void Store(uint32_t word) {
-        const uint32_t bigEndian = __builtin_bswap32(word);
-        std::memcpy(fNext, &bigEndian, sizeof bigEndian);
-    }
+    static constexpr int32_t kHeld = 64;
 
     uint8_t *fFirst, *fNext;
-    uint64_t fHeld = 0;
-    int32_t fCount = 0;
+    uint64_t fHeld = 0; // at the upper end
+    int32_t fCount = 0; // of its bits, below eight between two words
 };
-
-/// Up to eight bits from any place on, at the upper end of a byte; the bits behind them are of no meaning.
-uint32_t BitsAt(const uint8_t* bytes, int32_t place) {
-    const uint8_t* const first = bytes + place / kBitsOfByte;
-    return (uint32_t{first[0]} << kBitsOfByte | first[1]) >> (kBitsOfByte - place % kBitsOfByte) & 0xff;
-}
 
 } // namespace
 
@@ -94,23 +95,34 @@ void DVSegmentWriter::FillOwnArea(int32_t place, uint8_t* macroblock) {
     uint8_t* const bytes = macroblock + area.offset;
     const int32_t room = kBitsOfByte * area.bytes;
     bits.packed = std::min(bits.count, room);
-    std::memcpy(bytes, bits.bytes, area.bytes);
     fSpare[place] = {bytes, bits.packed, room};
-    if (bits.packed == room) return;
-    uint8_t* const last = bytes + bits.packed / kBitsOfByte;
-    *last |= static_cast<uint8_t>(0xff >> bits.packed % kBitsOfByte);
-    std::fill(last + 1, bytes + area.bytes, uint8_t{0xff});
+    // Behind the last word there are ones enough for every area. Two copies of eight bytes make eight to sixteen.
+    constexpr size_t kHalf = 8;
+    std::memcpy(bytes, bits.bytes, kHalf);
+    std::memcpy(bytes + area.bytes - kHalf, bits.bytes + area.bytes - kHalf, kHalf);
 }
 
-/// Byte by byte of the area. Its bits from `next` on are ones.
-void DVSegmentWriter::Move(Bits& from, Spare& to) {
+/// By words of the segment as long as there is a whole one, then by bytes. A word may go beyond the area: what it finds there
+/// it leaves.
+void DVSegmentWriter::Move(Bits& from, Spare& to) const {
+    constexpr int32_t kWordBits = 64, kMostAtOnce = 48;
     while (from.packed < from.count && to.next < to.end) {
+        uint8_t* const bytes = to.bytes + to.next / kBitsOfByte;
         const int32_t before = to.next % kBitsOfByte;
-        const int32_t count = std::min(kBitsOfByte - before, from.count - from.packed);
-        const uint32_t taken = BitsAt(from.bytes, from.packed) >> (kBitsOfByte - count);
-        const int32_t behind = kBitsOfByte - before - count;
-        const uint32_t others = ~(((1u << count) - 1) << behind);
-        to.bytes[to.next / kBitsOfByte] &= static_cast<uint8_t>(others | taken << behind);
+        const bool isWord = fSegmentEnd - bytes >= kWordBits / kBitsOfByte;
+        const int32_t count = std::min(
+            {isWord ? kMostAtOnce : kBitsOfByte - before, from.count - from.packed, to.end - to.next});
+        const uint64_t taken = LoadBigEndian(from.bytes + from.packed / kBitsOfByte)
+                                   << (from.packed % kBitsOfByte) >>
+                               (kWordBits - count);
+        const int32_t behind = kWordBits - before - count;
+        const uint64_t place = ~uint64_t{0} >> (kWordBits - count) << behind;
+        const uint64_t held = isWord ? LoadBigEndian(bytes) : uint64_t{*bytes} << (kWordBits - kBitsOfByte);
+        const uint64_t filled = (held & ~place) | taken << behind;
+        if (isWord)
+            StoreBigEndian(bytes, filled);
+        else
+            *bytes = static_cast<uint8_t>(filled >> (kWordBits - kBitsOfByte));
         from.packed += count;
         to.next += count;
     }
@@ -128,6 +140,7 @@ void DVSegmentWriter::FillSpare(int32_t firstBlock, int32_t endBlock) {
 
 void DVSegmentWriter::Pack(uint8_t* segment) {
     const int32_t blocks = kMacroblocksOfSegment * fBlocks;
+    fSegmentEnd = segment + kSegmentBytes;
     for (int32_t i = 0; i < blocks; ++i) FillOwnArea(i, segment + kDIFBlockBytes * (i / fBlocks));
     for (int32_t i = 0; i < blocks; i += fBlocks) FillSpare(i, i + fBlocks);
     FillSpare(0, blocks);

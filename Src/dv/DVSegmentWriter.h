@@ -49,7 +49,8 @@ public:
     void Pack(uint8_t* segment);
 
 private:
-    static constexpr int32_t kRoom = 256; // 63 of the longest words, and a head, have 230 bytes
+    static constexpr int32_t kRoom =
+        256; // 63 of the longest words, and a head, have 231 bytes, and ones are behind them
 
     struct Bits {
         int32_t count; // in all
@@ -64,11 +65,12 @@ private:
     };
 
     void FillOwnArea(int32_t place, uint8_t* macroblock);
-    static void Move(Bits& from, Spare& to);
+    void Move(Bits& from, Spare& to) const;
     void FillSpare(int32_t firstBlock, int32_t endBlock);
 
     int32_t fBlocks;
     std::span<const DVArea> fAreas;
+    uint8_t* fSegmentEnd = nullptr;
     Bits fBits[kMostBlocks];
     Spare fSpare[kMostBlocks];
 };

@@ -65,11 +65,16 @@ SegmentCompressor::SegmentCompressor(const DVPolicy& policy, bool haveDummies)
     : SegmentCompressor(policy, kBlocks, 0) {
     if (!haveDummies) return;
     for (int32_t i = 0; i < kMacroblocksOfSegment; ++i)
-        for (const int32_t place : {1, 3}) fBlocks[kBlocks * i + place].isDummy = true;
+        for (const int32_t place : {1, 3}) {
+            DVBlock& block = fBlocks[kBlocks * i + place];
+            block.isDummy = true;
+            block.dc = kLeastDC;
+        }
 }
 
 SegmentCompressor::SegmentCompressor(const DVPolicy& policy, int32_t blocksOfMacroblock, int32_t firstStep)
-    : fPolicy(policy), fTransforms(Best<BlockTransformKernels>()), fKernels(Best<DVBlockKernels>()),
+    : fPolicy(policy), fTransforms(Best<BlockTransformKernels>()),
+      fCoefficientKernels(Best<CoefficientKernels>()), fKernels(Best<DVBlockKernels>()),
       fBlocksOfMacroblock(blocksOfMacroblock), fLastStep(firstStep), fWriter(blocksOfMacroblock) {
     for (int32_t i = 0; i < DVSegmentWriter::kMostBlocks; ++i) fBlocks[i] = {fMemory[i], 0, 0, 0, false};
 }
@@ -87,19 +92,14 @@ int16_t SegmentCompressor::DCOf(int16_t transformed) const {
 }
 
 void SegmentCompressor::Transform(DVBlock& block) const {
-    if (block.isDummy) {
-        std::fill_n(block.coefficients, kCoefficients, int16_t{0});
-        block.dc = kLeastDC;
-        return;
-    }
     alignas(64) int16_t values[kDVModes][kCoefficients];
     fTransforms.forward8x8(block.coefficients, values[0]);
     fTransforms.forward248(block.coefficients, values[1]);
     block.dc = DCOf(values[0][0]);
     if (fPolicy.coefficientBits == 0) {
-        const CoefficientKernels& kernels = Best<CoefficientKernels>();
         for (int32_t mode = 0; mode < kDVModes; ++mode)
-            kernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients, kScale16);
+            fCoefficientKernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients,
+                                                  kScale16);
         constexpr int32_t kFieldDifference = 32;
         static_assert(kWeights248[kFieldDifference] == INT16_MIN, "1/2 with the wrong sign");
         int16_t& difference = values[1][kFieldDifference];
@@ -116,8 +116,7 @@ void SegmentCompressor::Transform(DVBlock& block) const {
 
 bool SegmentCompressor::IsBetterInFields(const int16_t (&values)[kDVModes][kCoefficients]) const {
     if (fPolicy.mode == DVPolicy::Mode::MoreZeros) {
-        const CoefficientKernels& kernels = Best<CoefficientKernels>();
-        return kernels.countZeros8x8(values[0]) < kernels.countZeros8x8(values[1]);
+        return fCoefficientKernels.countZeros8x8(values[0]) < fCoefficientKernels.countZeros8x8(values[1]);
     }
     const float unit = PowerOfTwo(-fPolicy.coefficientBits);
     return fKernels.sumOfLogarithms(values[1], unit) < fKernels.sumOfLogarithms(values[0], unit);
@@ -126,9 +125,11 @@ bool SegmentCompressor::IsBetterInFields(const int16_t (&values)[kDVModes][kCoef
 /// 12 more, a class more. Chroma begins one class higher, and its second block two.
 void SegmentCompressor::ChooseClass(DVBlock& block, int32_t placeInMacroblock) const {
     if (fPolicy.classes != DVPolicy::Class::ByMagnitude) return;
-    int32_t greatest = 0;
-    for (int32_t i = 0; i < kCoefficients; ++i)
-        greatest = std::max(greatest, std::abs(int32_t{block.coefficients[i]}));
+    int16_t greatest = 0; // in 16 bits, of which a vector has the most
+    for (int32_t i = 0; i < kCoefficients; ++i) {
+        const int16_t value = block.coefficients[i];
+        greatest = std::max(greatest, std::max(value, static_cast<int16_t>(-value)));
+    }
     constexpr int32_t kMagnitudes = 12, kHighest = 3;
     const int32_t first = std::max(0, placeInMacroblock - kLumaBlocks + 1);
     block.classNumber = static_cast<uint8_t>(std::min(greatest / kMagnitudes + first, kHighest));
@@ -152,25 +153,39 @@ int32_t SegmentCompressor::FinestStep() const {
     return static_cast<int32_t>(std::size(kSteps)) - 1;
 }
 
-SegmentCompressor::Quantiser SegmentCompressor::Quantise(const DVBlock& block, int32_t step,
-                                                         DVLevels& levels) const {
+void SegmentCompressor::Quantise(const DVBlock& block, int32_t step, QuantisedBlock& quantised) const {
     for (bool isTooLarge = false;; isTooLarge = true) {
         const Quantiser quantiser = QuantiserOf(block, step, isTooLarge);
-        fKernels.quantise(block.coefficients, {quantiser.factors, fRoundUp, quantiser.least}, levels);
-        if (!levels.areTooLarge || isTooLarge) return quantiser;
+        fKernels.quantise(block.coefficients, {quantiser.factors, fRoundUp, quantiser.least},
+                          quantised.levels);
+        quantised.qno = quantiser.qno;
+        quantised.classNumber = quantiser.classNumber;
+        if (!quantised.levels.areTooLarge || isTooLarge) return;
     }
 }
 
 int32_t SegmentCompressor::BitsOfMacroblock(int32_t macroblock, int32_t step) {
     int32_t& known = fBits[macroblock][step];
-    if (known != kUnknown) return known;
-    int32_t bits = 0;
-    DVLevels levels;
-    for (int32_t i = 0; i < fBlocksOfMacroblock; ++i) {
-        Quantise(fBlocks[macroblock * fBlocksOfMacroblock + i], step, levels);
-        bits += levels.areTooLarge ? kBudget : BitsOfBlock(levels);
+    if (known == kUnknown) {
+        known = 0;
+        for (const QuantisedBlock& block : QuantisedAt(macroblock, step))
+            known += block.levels.areTooLarge ? kBudget : BitsOfBlock(block.levels);
     }
-    return known = bits;
+    return known;
+}
+
+std::span<const SegmentCompressor::QuantisedBlock> SegmentCompressor::QuantisedAt(int32_t macroblock,
+                                                                                  int32_t step) {
+    QuantisedMacroblock& kept = fQuantised[macroblock][step % kKeptSteps];
+    const auto count = static_cast<size_t>(fBlocksOfMacroblock);
+    if (kept.step != step) {
+        kept.step = step;
+        for (size_t i = 0; i < count; ++i) {
+            const DVBlock& block = fBlocks[static_cast<size_t>(macroblock) * count + i];
+            if (!block.isDummy) Quantise(block, step, kept.blocks[i]);
+        }
+    }
+    return {kept.blocks, count};
 }
 
 bool SegmentCompressor::Fits(int32_t step) {
@@ -221,26 +236,32 @@ void SegmentCompressor::RefineMacroblocks(int32_t (&steps)[kMacroblocksOfSegment
 void SegmentCompressor::QuantiseAndWrite(float roundUp, uint8_t* segment) {
     fRoundUp = roundUp;
     for (auto& bits : fBits) std::fill(std::begin(bits), std::end(bits), kUnknown);
+    for (auto& macroblock : fQuantised)
+        for (QuantisedMacroblock& kept : macroblock) kept.step = kUnknown;
     fLastStep = FinestThatFits();
     int32_t steps[kMacroblocksOfSegment];
     std::fill(std::begin(steps), std::end(steps), fLastStep);
     if (fPolicy.quantiser == DVPolicy::Quantiser::OfMacroblock) RefineMacroblocks(steps);
-    for (int32_t place = 0; DVBlock & block : Blocks()) {
-        const int32_t macroblock = place / fBlocksOfMacroblock;
-        DVLevels levels;
-        const Quantiser quantiser = Quantise(block, steps[macroblock], levels);
-        block.classNumber = quantiser.classNumber;
+    for (int32_t macroblock = 0, place = 0; macroblock < kMacroblocksOfSegment; ++macroblock) {
+        const auto quantised = QuantisedAt(macroblock, steps[macroblock]);
         constexpr int32_t kQNO = 3; // behind the ID
-        segment[kDIFBlockBytes * macroblock + kQNO] = quantiser.qno;
-        fWriter.SetBlock(place++, block, levels);
+        segment[kDIFBlockBytes * macroblock + kQNO] = quantised[0].qno;
+        for (const QuantisedBlock& of : quantised) {
+            DVBlock& block = fBlocks[place];
+            block.classNumber = of.classNumber;
+            fWriter.SetBlock(place++, block, of.levels);
+        }
     }
     fWriter.Pack(segment);
 }
 
 void SegmentCompressor::Compress(uint8_t* segment) {
-    for (int32_t place = 0; DVBlock & block : Blocks()) {
+    int32_t place = 0;
+    for (DVBlock& block : Blocks()) {
+        const int32_t inMacroblock = place++ % fBlocksOfMacroblock;
+        if (block.isDummy) continue;
         Transform(block);
-        ChooseClass(block, place++ % fBlocksOfMacroblock);
+        ChooseClass(block, inMacroblock);
     }
     QuantiseAndWrite(fPolicy.roundUp, segment);
 }

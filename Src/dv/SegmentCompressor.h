@@ -8,6 +8,7 @@
 namespace PK {
 
 struct BlockTransformKernels;
+struct CoefficientKernels;
 
 /// Compresses segment after segment, and begins the search for a quantiser where the one before has found its own.
 class SegmentCompressor {
@@ -58,15 +59,29 @@ protected:
 
     const DVPolicy& fPolicy;
     const BlockTransformKernels& fTransforms;
+    const CoefficientKernels& fCoefficientKernels;
     const DVBlockKernels& fKernels;
 
 private:
     static constexpr int32_t kBudget = 3040, kUnknown = -1;
+    static constexpr int32_t kKeptSteps = 2; ///< The search ends between two neighbours.
+    static constexpr int32_t kMostBlocks = 8;
+
+    /// As it is with a quantiser. That of a dummy stays without levels.
+    struct QuantisedBlock {
+        DVLevels levels{};
+        uint8_t qno = 0, classNumber = 0;
+    };
+    struct QuantisedMacroblock {
+        int32_t step;
+        QuantisedBlock blocks[kMostBlocks];
+    };
 
     void Transform(DVBlock& block) const;
     bool IsBetterInFields(const int16_t (&values)[kDVModes][kCoefficients]) const;
     void ChooseClass(DVBlock& block, int32_t placeInMacroblock) const;
-    Quantiser Quantise(const DVBlock& block, int32_t step, DVLevels& levels) const;
+    void Quantise(const DVBlock& block, int32_t step, QuantisedBlock& quantised) const;
+    std::span<const QuantisedBlock> QuantisedAt(int32_t macroblock, int32_t step);
     int32_t BitsOfMacroblock(int32_t macroblock, int32_t step);
     bool Fits(int32_t step);
     int32_t FinestThatFits();
@@ -77,9 +92,10 @@ private:
     float fRoundUp = 0;
     int32_t fBits[kMacroblocksOfSegment]
                  [kMostSteps]; ///< Of the segment at hand, as far as they were asked for.
+    QuantisedMacroblock fQuantised[kMacroblocksOfSegment][kKeptSteps];
     DVSegmentWriter fWriter;
     DVBlock fBlocks[DVSegmentWriter::kMostBlocks];
-    alignas(64) int16_t fMemory[DVSegmentWriter::kMostBlocks][kCoefficients];
+    alignas(64) int16_t fMemory[DVSegmentWriter::kMostBlocks][kCoefficients]{};
 };
 
 } // namespace PK

@@ -3,6 +3,7 @@
 #include "primitives/Status.h"
 
 #include <algorithm>
+#include <bit>
 #include <cstring>
 
 namespace PK {
@@ -190,17 +191,21 @@ public:
         AppendBits(range.data, range.position, range.end - range.position);
     }
 
+    bool IsEmpty() const { return fEnd == 0; }
     BitRange Rest() const { return {fBytes, fPosition, fEnd}; }
 
     /// Goes on with blocks that are not done with, in the code word that each was cut in, as long as there are bits.
-    template <size_t kBlocks>
-    void Continue(const DVHuffmanTable& table, Block (&blocks)[kBlocks]) {
-        for (Block& block : blocks) {
-            if (fPosition == fEnd) return;
-            if (block.isDone) continue;
+    /// \param open  a bit for each of them, the lowest for the first
+    /// \return those that still are not done with.
+    uint64_t Continue(const DVHuffmanTable& table, Block* blocks, uint64_t open) {
+        for (uint64_t left = open; left != 0 && fPosition != fEnd; left &= left - 1) {
+            const int32_t index = std::countr_zero(left);
+            Block& block = blocks[index];
             const BitWindow window(block.cut, block.cutBits, Rest());
             fPosition = fEnd - Parse(table, window, block.cutBits + fEnd - fPosition, block);
+            open ^= uint64_t{block.isDone} << index;
         }
+        return open;
     }
 
 private:
@@ -246,19 +251,19 @@ public:
     }
 
     void Parse() {
-        bool isDone = true;
-        for (int32_t i = 0; i < kMacroblocks; ++i) isDone = ParseAreas(i, kWhole) && isDone;
-        if (!isDone) ParseSpareBits();
+        for (int32_t i = 0; i < kMacroblocks; ++i) ParseAreas(i, kWhole);
+        ParseSpareBits();
     }
 
     /// Until every block has reached the last place that is wanted. Most do so in their own areas; where one does not, only
     /// whole blocks tell what they leave to others.
     void ParseTo(DVParseDepth depth) {
         for (int32_t i = 0; i < kMacroblocks; ++i) {
-            if (ParseAreas(i, depth)) continue;
-            if (!ParseAgain(i)) ParseSpareBitsOfMacroblock(i);
-            if (HasReached(i, depth)) continue;
-            return ParseAllAgain();
+            ParseAreas(i, depth);
+            if (fOpen[i] == 0) continue;
+            ParseAgain(i);
+            ParseSpareBitsOfMacroblock(i);
+            if (!HasReached(i, depth)) return ParseAllAgain();
         }
     }
 
@@ -266,9 +271,8 @@ private:
     static constexpr int32_t kBlocks = std::size(Layout::kAreaBytes); // of a macroblock
 
     /// The blocks of a macroblock, each in its own area.
-    /// \return whether all are done with.
-    bool ParseAreas(int32_t macroblock, DVParseDepth depth) {
-        bool isDone = true;
+    void ParseAreas(int32_t macroblock, DVParseDepth depth) {
+        uint64_t open = 0;
         const uint8_t* area = fBytes + kBlockBytes * macroblock + kFirstArea;
         const uint32_t quantiser = area[-1] & 0xf;
         for (int32_t i = 0; i < kBlocks; ++i) {
@@ -278,22 +282,22 @@ private:
             fTarget.parameters[index] = area[1] | quantiser << 16;
             coefficients[0] = static_cast<int16_t>(static_cast<int16_t>(area[0] << 8 | area[1]) >> 7);
             const uint32_t stop = is248 ? depth.stop248 : depth.stop88;
-            Block& block = fBlocks[macroblock][i];
+            Block& block = fBlocks[index];
             block = {coefficients, fTarget.scans[is248 ? 1 : 0], 0, stop, false, 0, 0};
             const auto begin = static_cast<uint32_t>(area - fBytes) * 8;
             area += Layout::kAreaBytes[i];
             const BitRange codes = {fBytes, begin + kHeadBits, static_cast<uint32_t>(area - fBytes) * 8};
             const uint32_t left = PK::Parse(fTable, BitWindow(codes), codes.end - codes.position, block);
             fRest[macroblock][i] = {fBytes, codes.end - left, codes.end};
-            isDone = isDone && block.isDone;
+            open |= uint64_t{!block.isDone} << i;
         }
-        return isDone;
+        fOpen[macroblock] = open;
     }
 
     /// To the end of the blocks.
-    bool ParseAgain(int32_t macroblock) {
+    void ParseAgain(int32_t macroblock) {
         std::fill_n(fTarget.coefficients + kBlocks * macroblock * kPlaces, kBlocks * kPlaces, int16_t{0});
-        return ParseAreas(macroblock, kWhole);
+        ParseAreas(macroblock, kWhole);
     }
 
     void ParseAllAgain() {
@@ -303,7 +307,8 @@ private:
     }
 
     bool HasReached(int32_t macroblock, DVParseDepth depth) const {
-        return std::ranges::all_of(fBlocks[macroblock], [&](const Block& block) {
+        const std::span blocks(fBlocks + kBlocks * macroblock, kBlocks);
+        return std::ranges::all_of(blocks, [&](const Block& block) {
             return block.place >= (block.scan == fTarget.scans[0] ? depth.stop88 : depth.stop248);
         });
     }
@@ -312,21 +317,32 @@ private:
     void ParseSpareBitsOfMacroblock(int32_t macroblock) {
         BitPool<kBlockBytes>& pool = fPools[macroblock];
         for (const BitRange& rest : fRest[macroblock]) pool.AppendArea(rest);
-        pool.Continue(fTable, fBlocks[macroblock]);
+        fOpen[macroblock] = pool.Continue(fTable, fBlocks + kBlocks * macroblock, fOpen[macroblock]);
     }
 
     /// And with those that are left in what all macroblocks leave.
     void ParseSpareBits() {
-        for (int32_t i = 0; i < kMacroblocks; ++i) ParseSpareBitsOfMacroblock(i);
+        uint64_t open = 0;
+        for (int32_t i = 0; i < kMacroblocks; ++i) {
+            if (fOpen[i] != 0) ParseSpareBitsOfMacroblock(i);
+            open |= fOpen[i] << kBlocks * i;
+        }
+        if (open == 0) return;
         BitPool<kSegmentBytes> ofSegment;
-        for (const auto& pool : fPools) ofSegment.Append(pool.Rest());
-        for (auto& blocks : fBlocks) ofSegment.Continue(fTable, blocks);
+        for (int32_t i = 0; i < kMacroblocks; ++i) {
+            if (fPools[i].IsEmpty())
+                for (const BitRange& rest : fRest[i]) ofSegment.AppendArea(rest);
+            else
+                ofSegment.Append(fPools[i].Rest());
+        }
+        ofSegment.Continue(fTable, fBlocks, open);
     }
 
     const DVHuffmanTable& fTable;
     const Target& fTarget;
     uint8_t fBytes[kSegmentBytes + kReadAhead] = {};
-    Block fBlocks[kMacroblocks][kBlocks];
+    Block fBlocks[kMacroblocks * kBlocks];
+    uint64_t fOpen[kMacroblocks]; ///< The blocks of each that are not done with, a bit for each.
     BitRange fRest[kMacroblocks][kBlocks];
     BitPool<kBlockBytes> fPools[kMacroblocks];
 };

@@ -17,6 +17,7 @@
 #include "convert/KernelTable.h"
 #include "convert/PlanarKernels.h"
 #include "dv/DVBlockKernels.h"
+#include "dv/DVSampleKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/DeinterlaceKernels.h"
 #include "filters/GaussianBlurKernels.h"
@@ -387,8 +388,8 @@ constexpr KernelRow kMotion[] = {
 };
 
 constexpr KernelRow kDV[] = {
-    Entry<&DVBlockKernels::loadYUYV>("LoadDVBlocks_YUYV", {Bytes(256), SignedWords(256)}),
-    Entry<&DVBlockKernels::loadUYVY>("LoadDVBlocks_UYVY", {Bytes(256), SignedWords(256)}),
+    Entry<&DVSampleKernels::loadYUYV>("LoadDVBlocks_YUYV", {Bytes(256), SignedWords(256)}),
+    Entry<&DVSampleKernels::loadUYVY>("LoadDVBlocks_UYVY", {Bytes(256), SignedWords(256)}),
     Entry<&DVBlockKernels::scale>("ScaleDVBlock", {SignedWords(64), SignedWords(64)}),
     Entry<&DVBlockKernels::sumOfLogarithms>("SumOfDVLogarithms", {SignedWords(64), Integers(1)}),
     Entry<&DVBlockKernels::quantise>("QuantiseDVBlock", {SignedWords(64), Bytes(73)}),

@@ -57,6 +57,13 @@ void AddStreams(Calls& calls) {
                                            PK_PixelFormat_BGRA_4444_8u, kDVWidth, kDVHeight, 4);
                      }});
     calls.push_back({{"PK_Convert"},
+                     TakesOrRefuses("the planes of the picture"),
+                     picture,
+                     [stream = std::vector<uint8_t>(120000)](uint8_t* block) {
+                         return PK_Convert(stream.data(), 0, PK_PixelFormat_NTSCDV25, block, 4 * kDVWidth,
+                                           PK_PixelFormat_BGRA_4444_8u, kDVWidth, kDVHeight, 4);
+                     }});
+    calls.push_back({{"PK_Convert"},
                      TakesOrRefuses("the picture that is encoded, and the rows to it"),
                      Content(240000),
                      [source = Image(PK_PixelFormat_ARGB_4444_15u)](uint8_t* block) {

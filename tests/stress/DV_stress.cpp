@@ -1,4 +1,4 @@
-// Encoders of DV, beside each other and beside starts and stops.
+// Encoders and decoders of DV, beside each other and beside starts and stops.
 
 #include "stress/Calls.h"
 #include "stress/Operation.h"
@@ -40,6 +40,16 @@ Call SecondOfPair(PKTest::Random& random) {
         }};
 }
 
+/// Of bytes that are no picture's, at a quarter of the size or the whole.
+Call Decoding(PK_PixelFormat from, PK_PixelFormat to, int32_t width, int32_t height, PKTest::Random& random) {
+    std::vector<uint8_t> frame = RandomImage(from, width, height, random);
+    for (const size_t byte : {4u, 5u, 6u, 7u}) frame[byte] = 0x79; // a good header
+    return {RandomImage(to, width, height, random), [=](uint8_t* pixels) {
+                return PK_Convert(frame.data(), 0, from, pixels, PK_PixelFormatRowBytes(to, width), to, width,
+                                  height, 2);
+            }};
+}
+
 Call Black(PKTest::Random& random) {
     constexpr PK_PixelFormat kTo = PK_PixelFormat_NTSCDV25;
     return {RandomImage(kTo, 720, 480, random),
@@ -48,7 +58,13 @@ Call Black(PKTest::Random& random) {
 
 std::function<bool()> PrepareDV() {
     PKTest::Random random(31);
-    std::vector<Call> calls = {DVCPRO(random), SecondOfPair(random), Black(random)};
+    constexpr PK_PixelFormat k25 = PK_PixelFormat_NTSCDV25, k100 = PK_PixelFormat_NTSC_DV100_720p;
+    std::vector<Call> calls = {DVCPRO(random),
+                               SecondOfPair(random),
+                               Black(random),
+                               Decoding(k25, PK_PixelFormat_BGRA_4444_8u, 720, 480, random),
+                               Decoding(k25, PK_PixelFormat_UYVY_422_8u, 180, 120, random),
+                               Decoding(k100, PK_PixelFormat_YUYV_422_8u_709, 960, 720, random)};
     for (const Encoding& job : kEncodings)
         calls.push_back(
             {RandomImage(job.to, job.width, job.height, random),

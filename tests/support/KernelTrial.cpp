@@ -10,6 +10,7 @@
 #include "convert/ConvertNV12toYV12Kernels.h"
 #include "convert/PlanarKernels.h"
 #include "dv/DVBlockKernels.h"
+#include "dv/DVSampleKernels.h"
 #include "filters/BoxBlurKernels.h"
 #include "filters/GaussianCoefficients.h"
 #include "filters/ResampleKernel.h"
@@ -345,7 +346,7 @@ KernelTrial CountTrial(const KernelRow& kernel, int32_t, Random&) {
 /// Sixteen pixels of eight rows to four blocks.
 KernelTrial LoadBlocksTrial(const KernelRow& kernel, int32_t, Random& random) {
     const auto bits = static_cast<int32_t>(random.Below(4));
-    using Load = DVBlockKernels::Load;
+    using Load = DVSampleKernels::Load;
     return {{RowOf(kernel.operands.source, 1)},
             RowOf(kernel.operands.destination, 1),
             Typed<Load>([=](Load run, const Sources& sources, uint8_t* destination) {
@@ -555,7 +556,7 @@ constexpr SpecialTrial kSpecial[] = {
     {"DVMacroblock", SamplesToBytesTrial, "SamplesToBytes"},
     {"DVMacroblock", SamplesToYUYVTrial},
     {"DVRow", PlanesTrial<1>, "FullPlanes"},
-    {"DVBlock", LoadBlocksTrial, "Load"},
+    {"DVSample", LoadBlocksTrial},
     {"DVBlock", ScaleBlockTrial, "Scale"},
     {"DVBlock", SumOfLogarithmsTrial, "Sum"},
     {"DVBlock", QuantiseBlockTrial, "Quantise"},
