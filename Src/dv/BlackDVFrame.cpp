@@ -1,7 +1,6 @@
 #include "dv/BlackDVFrame.h"
 
 #include "dv/EncodeDV.h"
-#include "frame/FloatMode.h"
 #include "primitives/FirstUse.h"
 
 #include <array>
@@ -24,7 +23,6 @@ Frame<kStream> Encode() {
     }
     constexpr int64_t kSameRowAgain = 0;
     Frame<kStream> frame;
-    const InitialFloatMode mode;
     EncodeDV(kFormat, {row.data(), kSameRowAgain, true}, 0, kBestDVPolicy, frame.data());
     return frame;
 }

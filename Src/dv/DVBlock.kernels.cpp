@@ -26,6 +26,33 @@ void Scale(const DVBlockFactors& factors, float roundUp, int16_t* block) {
                                          Scaled(block + i + kLanes, factors + i + kLanes, add)));
 }
 
+inline uint32_t SumOfLanes(I32 sum) {
+    uint32_t lanes[kLanes], total = 0;
+    Store(lanes, sum);
+    for (int i = 0; i < kLanes; ++i) total += lanes[i];
+    return total;
+}
+
+DVLineDifferences LineDifferences(const int16_t* samples) {
+    constexpr int kLine = 8, kSixLines = 6 * kLine;
+    I32 ofFrame = Ints(0), ofField = Ints(0);
+    for (int i = 0; i < kSixLines; i += kLanes) {
+        const I32 line = LoadSignedWords(samples + i);
+        ofFrame = ofFrame + Magnitude(LoadSignedWords(samples + i + kLine) - line);
+        ofField = ofField + Magnitude(LoadSignedWords(samples + i + 2 * kLine) - line);
+    }
+    return {SumOfLanes(ofFrame), SumOfLanes(ofField)};
+}
+
+uint32_t Greatest(const int16_t* block) {
+    I32 greatest = Ints(0);
+    for (int i = 0; i < kBlock; i += kLanes) greatest = Max(greatest, Magnitude(LoadSignedWords(block + i)));
+    uint32_t lanes[kLanes], most = 0;
+    Store(lanes, greatest);
+    for (int i = 0; i < kLanes; ++i) most = lanes[i] > most ? lanes[i] : most;
+    return most;
+}
+
 /// The bits of a float are its logarithm, linear between powers of two.
 uint32_t SumOfLogarithms(const int16_t* block, float factor) {
     const F32 one = Floats(1), by = Floats(factor);
@@ -34,10 +61,7 @@ uint32_t SumOfLogarithms(const int16_t* block, float factor) {
         const F32 x = ToFloat(Magnitude(LoadSignedWords(block + i))) * by + one;
         sum = sum + ShiftRight<8>(Bits(x) - Bits(one));
     }
-    uint32_t lanes[kLanes], total = 0;
-    Store(lanes, sum);
-    for (int i = 0; i < kLanes; ++i) total += lanes[i];
-    return total;
+    return SumOfLanes(sum);
 }
 
 struct Quantiser {
@@ -69,7 +93,7 @@ void Quantise(const int16_t* coefficients, const DVQuantisation& quantisation, D
     levels.areTooLarge = AnyNegative(Ints(255) - quantiser.greatest);
 }
 
-constexpr DVBlockKernels kKernels = {Scale, SumOfLogarithms, Quantise};
+constexpr DVBlockKernels kKernels = {LineDifferences, Greatest, Scale, SumOfLogarithms, Quantise};
 
 } // namespace
 } // namespace PK_TARGET

@@ -25,7 +25,16 @@ struct DVQuantisation {
     float roundUp, least;
 };
 
+/// Sums of differences between the samples of a block, over its first six lines: with the next line, and with the next of
+/// the same field.
+struct DVLineDifferences {
+    uint32_t ofFrame, ofField;
+};
+
 struct DVBlockKernels {
+    DVLineDifferences (*lineDifferences)(const int16_t* samples);
+    /// The greatest of all magnitudes.
+    uint32_t (*greatest)(const int16_t* block);
     /// Every value becomes sign x (|value| x factor + roundUp), cut to an integer and saturated.
     void (*scale)(const DVBlockFactors& factors, float roundUp, int16_t* block);
     /// The sum of log2(1 + |value| x factor) in 2^-15, linear between powers of two.

@@ -16,8 +16,9 @@ struct DVPolicy {
         OfMacroblock, ///< The finest that fits all five, and then finer ones for those where there is room.
     };
     enum class Mode : uint8_t {
-        MoreZeros,     ///< 2-4-8 where its coefficients have more zeros.
-        LessMagnitude, ///< 2-4-8 where the sum of log2(1 + coefficient) is less.
+        MoreZeros, ///< 2-4-8 where its coefficients have more zeros.
+        LessMagnitude, ///< 2-4-8 where the sum of log2(1 + coefficient) is less, unless the lines of the frame differ by less
+        ///< than 3/4 of what those of a field do.
     };
     enum class Fields : uint8_t {
         Never,

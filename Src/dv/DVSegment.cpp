@@ -8,25 +8,33 @@
 namespace PK {
 namespace {
 
-using Factors = std::array<float, kCoefficients>;
+/// Integers in parts of a unit, but for that of DC.
+constexpr DVFactorTable FactorTable(const DVFactors& factors, float unit) {
+    constexpr int32_t kSide = 8;
+    DVFactorTable table{};
+    for (int32_t i = 1; i < kCoefficients; ++i) {
+        const int32_t column = i % kSide;
+        const float factor = static_cast<float>(factors[i]) / unit;
+        table.raster[i] = factor;
+        table.parted[i - column + column / 2 + (column % 2) * kSide / 2] = factor;
+    }
+    return table;
+}
 
-/// The steps of DV25 and DV50 by mode and row, without the fractional bits.
+/// The steps of DV25 and DV50 by mode and row.
 constexpr auto kInverseSteps = [] {
-    std::array<std::array<Factors, kDVQuantRows>, kDVModes> steps{};
+    std::array<std::array<DVFactorTable, kDVQuantRows>, kDVModes> tables{};
     for (int32_t mode = 0; mode < kDVModes; ++mode)
         for (int32_t row = 0; row < kDVQuantRows; ++row)
-            for (int32_t i = 1; i < kCoefficients; ++i)
-                steps[mode][row][i] = static_cast<float>(kDVDequant[mode][row][i]) / kDVDequantUnit;
-    return steps;
+            tables[mode][row] = FactorTable(kDVDequant[mode][row], kDVDequantUnit);
+    return tables;
 }();
 
 /// What the step of DV100 is multiplied by.
 constexpr auto kInverseWeights = [] {
-    std::array<Factors, std::size(kDV100Weights)> weights{};
-    for (size_t table = 0; table < std::size(kDV100Weights); ++table)
-        for (int32_t i = 1; i < kCoefficients; ++i)
-            weights[table][i] = static_cast<float>(kDV100Weights[table][i]) / kDV100WeightUnit;
-    return weights;
+    std::array<DVFactorTable, std::size(kDV100Weights)> tables{};
+    for (size_t i = 0; i < tables.size(); ++i) tables[i] = FactorTable(kDV100Weights[i], kDV100WeightUnit);
+    return tables;
 }();
 
 } // namespace
@@ -71,10 +79,23 @@ void DVDecodeState::Parse(const uint8_t* segment) {
 DVSteps DVDecodeState::Steps(int32_t macroblock, int32_t block) const {
     const uint32_t parameters = Parameters(macroblock, block);
     const uint32_t mode = parameters >> 6 & 1, classNumber = parameters >> 4 & 3, qno = parameters >> 16;
-    if (!fFormat.IsHD()) return {kInverseSteps[mode][kDVQuantRow[classNumber][qno]].data(), 1};
+    if (!fFormat.IsHD()) return {&kInverseSteps[mode][kDVQuantRow[classNumber][qno]], 1};
     constexpr int32_t kLumaBlocks = 4;
     const auto& weights = kInverseWeights[(fFormat.isProgressive ? 2 : 0) + (block < kLumaBlocks ? 0 : 1)];
-    return {weights.data(), static_cast<float>(kDV100Steps[qno] << classNumber)};
+    return {&weights, static_cast<float>(kDV100Steps[qno] << classNumber)};
+}
+
+bool DVDecodeState::Is248(int32_t macroblock, int32_t block) const {
+    return !fFormat.IsHD() && (Parameters(macroblock, block) & kModeBit) != 0;
+}
+
+/// Blocks of one mode.
+void DVDecodeState::TransformFour(int32_t macroblock, int32_t firstBlock) {
+    DVSteps steps[kDVBlocksAtOnce];
+    for (int32_t i = 0; i < kDVBlocksAtOnce; ++i) steps[i] = Steps(macroblock, firstBlock + i);
+    int16_t* const blocks = Block(macroblock, firstBlock);
+    const bool is248 = Is248(macroblock, firstBlock);
+    (is248 ? fFourTransforms.inverse248 : fFourTransforms.inverse88)(blocks, steps, blocks);
 }
 
 DVTransformKernels::Transform DVDecodeState::TransformOf(bool is248) const {
@@ -84,10 +105,19 @@ DVTransformKernels::Transform DVDecodeState::TransformOf(bool is248) const {
 
 void DVDecodeState::Transform(int32_t macroblock) {
     if (fHasLinesInTurns[macroblock] && fSize != DVSize::Full) return JoinHalvedFields(macroblock);
-    for (int32_t i = 0; i < Blocks(); ++i) {
+    for (int32_t i = 0; i < Blocks();) {
+        const auto isAsFirst = [&](int32_t other) {
+            return Is248(macroblock, i + other) == Is248(macroblock, i);
+        };
+        if (fSize == DVSize::Full && i + kDVBlocksAtOnce <= Blocks() && isAsFirst(1) && isAsFirst(2) &&
+            isAsFirst(3)) {
+            TransformFour(macroblock, i);
+            i += kDVBlocksAtOnce;
+            continue;
+        }
         int16_t* const block = Block(macroblock, i);
-        const bool is248 = !fFormat.IsHD() && (Parameters(macroblock, i) & kModeBit) != 0;
-        TransformOf(is248)(block, Steps(macroblock, i), block);
+        TransformOf(Is248(macroblock, i))(block, Steps(macroblock, i), block);
+        ++i;
     }
 }
 

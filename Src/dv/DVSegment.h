@@ -57,7 +57,9 @@ private:
     void TakeDC(const uint8_t* segment);
     void Parse(const uint8_t* segment);
     DVSteps Steps(int32_t macroblock, int32_t block) const;
+    bool Is248(int32_t macroblock, int32_t block) const;
     DVTransformKernels::Transform TransformOf(bool is248) const;
+    void TransformFour(int32_t macroblock, int32_t firstBlock);
     void Transform(int32_t macroblock);
     void JoinHalvedFields(int32_t macroblock);
 
@@ -65,6 +67,7 @@ private:
     DVSize fSize;
     const DVHuffmanTable& fTable = DVCodeTable();
     const DVTransformKernels& fTransforms = Best<DVTransformKernels>();
+    const DVFourBlocksKernels& fFourTransforms = Best<DVFourBlocksKernels>();
     bool fHasLinesInTurns[kMacroblocksOfSegment] = {};
     uint32_t fParameters[kMostBlocks] = {};
     alignas(64) int16_t fCoefficients[kMostBlocks * kCoefficients] = {};

@@ -2,6 +2,7 @@
 
 #include "dv/DIFStructure.h"
 #include "dv/DV100SegmentCompressor.h"
+#include "frame/FloatMode.h"
 
 namespace PK {
 namespace {
@@ -81,6 +82,7 @@ void EncodeHDSegments(const FrameEncoder& encoder, const DVFormat& format, int32
 
 void EncodeDV(const DVFormat& format, const DVPicture& picture, int32_t firstChannel, const DVPolicy& policy,
               uint8_t* frame) {
+    const InitialFloatMode mode; // by which transforms round: a picture has one frame, whoever asks for it
     WriteDIFStructure(format, firstChannel, frame);
     const FrameEncoder encoder(format, picture, policy);
     if (format.IsHD())

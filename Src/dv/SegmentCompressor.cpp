@@ -91,45 +91,52 @@ int16_t SegmentCompressor::DCOf(int16_t transformed) const {
     return static_cast<int16_t>(std::clamp<int32_t>(dc, kLeastDC, kGreatestDC));
 }
 
-void SegmentCompressor::Transform(DVBlock& block) const {
-    alignas(64) int16_t values[kDVModes][kCoefficients];
-    fTransforms.forward8x8(block.coefficients, values[0]);
-    fTransforms.forward248(block.coefficients, values[1]);
-    block.dc = DCOf(values[0][0]);
-    if (fPolicy.coefficientBits == 0) {
-        for (int32_t mode = 0; mode < kDVModes; ++mode)
-            fCoefficientKernels.multiplyScaled16s(kForwardWeights[mode].data(), values[mode], kCoefficients,
-                                                  kScale16);
-        constexpr int32_t kFieldDifference = 32;
-        static_assert(kWeights248[kFieldDifference] == INT16_MIN, "1/2 with the wrong sign");
-        int16_t& difference = values[1][kFieldDifference];
-        difference = static_cast<int16_t>(-difference);
-        block.dc = std::clamp(values[0][0], kLeastDC, kGreatestDC);
-    } else {
-        for (int32_t mode = 0; mode < kDVModes; ++mode)
-            fKernels.scale(*reinterpret_cast<const DVBlockFactors*>(kFineWeights[mode].data()), 0.5f,
-                           values[mode]);
+void SegmentCompressor::Weigh(int32_t mode, int16_t* values) const {
+    if (fPolicy.coefficientBits != 0) {
+        const auto& weights = kFineWeights[static_cast<size_t>(mode)];
+        fKernels.scale(*reinterpret_cast<const DVBlockFactors*>(weights.data()), 0.5f, values);
+        return;
     }
-    block.mode = IsBetterInFields(values) ? 1 : 0;
-    TakeInOrder(block, values[block.mode]);
+    const DVFactors& weights = kForwardWeights[static_cast<size_t>(mode)];
+    fCoefficientKernels.multiplyScaled16s(weights.data(), values, kCoefficients, kScale16);
+    if (mode == 0) return;
+    constexpr int32_t kFieldDifference = 32;
+    static_assert(kWeights248[kFieldDifference] == INT16_MIN, "1/2 with the wrong sign");
+    values[kFieldDifference] = static_cast<int16_t>(-values[kFieldDifference]);
 }
 
-bool SegmentCompressor::IsBetterInFields(const int16_t (&values)[kDVModes][kCoefficients]) const {
-    if (fPolicy.mode == DVPolicy::Mode::MoreZeros) {
-        return fCoefficientKernels.countZeros8x8(values[0]) < fCoefficientKernels.countZeros8x8(values[1]);
-    }
+bool SegmentCompressor::MayBeInFields(const int16_t* samples) const {
+    if (fPolicy.mode == DVPolicy::Mode::MoreZeros) return true;
+    const DVLineDifferences differences = fKernels.lineDifferences(samples);
+    return 4 * differences.ofFrame > 3 * differences.ofField;
+}
+
+bool SegmentCompressor::IsBetterInFields(const int16_t* frame, const int16_t* fields) const {
+    if (fPolicy.mode == DVPolicy::Mode::MoreZeros)
+        return fCoefficientKernels.countZeros8x8(frame) < fCoefficientKernels.countZeros8x8(fields);
     const float unit = PowerOfTwo(-fPolicy.coefficientBits);
-    return fKernels.sumOfLogarithms(values[1], unit) < fKernels.sumOfLogarithms(values[0], unit);
+    return fKernels.sumOfLogarithms(fields, unit) < fKernels.sumOfLogarithms(frame, unit);
+}
+
+void SegmentCompressor::Transform(DVBlock& block) const {
+    alignas(64) int16_t frame[kCoefficients], fields[kCoefficients];
+    fTransforms.forward8x8(block.coefficients, frame);
+    const int16_t dc = DCOf(frame[0]);
+    Weigh(0, frame);
+    block.dc = fPolicy.coefficientBits == 0 ? std::clamp(frame[0], kLeastDC, kGreatestDC) : dc;
+    block.mode = 0;
+    if (MayBeInFields(block.coefficients)) {
+        fTransforms.forward248(block.coefficients, fields);
+        Weigh(1, fields);
+        block.mode = IsBetterInFields(frame, fields) ? 1 : 0;
+    }
+    TakeInOrder(block, block.mode == 1 ? fields : frame);
 }
 
 /// 12 more, a class more. Chroma begins one class higher, and its second block two.
 void SegmentCompressor::ChooseClass(DVBlock& block, int32_t placeInMacroblock) const {
     if (fPolicy.classes != DVPolicy::Class::ByMagnitude) return;
-    int16_t greatest = 0; // in 16 bits, of which a vector has the most
-    for (int32_t i = 0; i < kCoefficients; ++i) {
-        const int16_t value = block.coefficients[i];
-        greatest = std::max(greatest, std::max(value, static_cast<int16_t>(-value)));
-    }
+    const auto greatest = static_cast<int32_t>(fKernels.greatest(block.coefficients));
     constexpr int32_t kMagnitudes = 12, kHighest = 3;
     const int32_t first = std::max(0, placeInMacroblock - kLumaBlocks + 1);
     block.classNumber = static_cast<uint8_t>(std::min(greatest / kMagnitudes + first, kHighest));

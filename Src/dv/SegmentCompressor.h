@@ -78,7 +78,9 @@ private:
     };
 
     void Transform(DVBlock& block) const;
-    bool IsBetterInFields(const int16_t (&values)[kDVModes][kCoefficients]) const;
+    void Weigh(int32_t mode, int16_t* values) const;
+    bool MayBeInFields(const int16_t* samples) const;
+    bool IsBetterInFields(const int16_t* frame, const int16_t* fields) const;
     void ChooseClass(DVBlock& block, int32_t placeInMacroblock) const;
     void Quantise(const DVBlock& block, int32_t step, QuantisedBlock& quantised) const;
     std::span<const QuantisedBlock> QuantisedAt(int32_t macroblock, int32_t step);

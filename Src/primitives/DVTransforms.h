@@ -8,10 +8,16 @@
 
 namespace PK {
 
-/// What the levels of a block are multiplied by: a factor each, and a step for all. The factor of DC is 0, since DC is 8
-/// samples in steps of 4 whatever the others are.
+/// A factor for each level of a block, twice: line after line, and of each line first those of even and then those of odd
+/// columns. That of DC is 0, since DC is 8 samples in steps of 4 whatever the others are.
+struct DVFactorTable {
+    float raster[64];
+    float parted[64];
+};
+
+/// What the levels of a block are multiplied by: a factor each, and a step for all.
 struct DVSteps {
-    const float* factors; ///< 64
+    const DVFactorTable* factors;
     float step;
 };
 
@@ -35,6 +41,20 @@ struct DVTransformKernels {
     static constexpr Offer kOffer = Offer::flags;
     template <Target>
     static const DVTransformKernels& For(); // DVTransforms.kernels.cpp
+};
+
+inline constexpr int kDVBlocksAtOnce = 4;
+
+/// The inverse transforms of four blocks one behind the other, each with its own steps.
+struct DVFourBlocksKernels {
+    using Transform = void (*)(const int16_t* levels, const DVSteps (&steps)[kDVBlocksAtOnce],
+                               int16_t* samples);
+    Transform inverse88, inverse248;
+
+    static constexpr const char* kFamily = "DVFourBlocks";
+    static constexpr Offer kOffer = Offer::flags;
+    template <Target>
+    static const DVFourBlocksKernels& For(); // DVTransforms.kernels.cpp
 };
 
 } // namespace PK

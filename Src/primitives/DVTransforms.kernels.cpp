@@ -10,7 +10,7 @@ namespace {
 /// Levels as coefficients. What DC gives to every sample is added at the end.
 struct Levels {
     Levels(const int16_t* levels, const DVSteps& by)
-        : block(levels), factors(by.factors), step(Floats(by.step)),
+        : block(levels), factors(by.factors->raster), step(Floats(by.step)),
           flat(Floats(0.5f * static_cast<float>(levels[0]))) {}
 
     F32 Load(int line, int column = 0) const {
@@ -30,6 +30,56 @@ void Inverse(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
     TransformBlock<ColumnButterfly, InverseEight>(Levels(levels, steps), samples);
 }
 
+/// The levels of a block for each block of lanes.
+class LevelsOfLanes {
+public:
+    static constexpr int kBlocks = kLanes / 4;
+
+    LevelsOfLanes(const int16_t* levels, const DVSteps* steps) : fLevels(levels) {
+        fFactors = reinterpret_cast<const uint8_t*>(steps[0].factors->parted);
+        float step[kBlocks], flat[kBlocks];
+        for (int i = 0; i < kBlocks; ++i) {
+            step[i] = steps[i].step;
+            flat[i] = 0.5f * static_cast<float>(levels[kLevels * i]);
+            fToFactors[4 * i] = reinterpret_cast<const uint8_t*>(steps[i].factors->parted) - fFactors;
+        }
+        fStep = LoadOnePerBlock(step);
+        fFlat = LoadOnePerBlock(flat);
+    }
+
+    void Load(int line, F32& even, F32& odd) const {
+        const I32 words = Bits(LoadFloatBlocks(fLevels + kSide * line, kLevels * sizeof(int16_t)));
+        even = Coefficients(ShiftRightSigned<16>(ShiftLeft<16>(words)), 2 * line);
+        odd = Coefficients(ShiftRightSigned<16>(words), 2 * line + 1);
+    }
+    F32 Finish(F32 samples) const { return samples + fFlat; }
+
+private:
+    static constexpr int kLevels = kSide * kSide;
+
+    F32 Coefficients(I32 levels, int halfLine) const {
+        const F32 factors = LoadFloatBlocksAt(fFactors + 4 * halfLine * sizeof(float), fToFactors);
+        return ToFloat(Nearest(ToFloat(levels) * (factors * fStep)));
+    }
+
+    const int16_t* fLevels;
+    const uint8_t* fFactors;
+    int64_t fToFactors[kLanes];
+    F32 fStep, fFlat;
+};
+
+template <class ColumnButterfly>
+void InverseBlocks(const int16_t* levels, const DVSteps (&steps)[kDVBlocksAtOnce], int16_t* samples) {
+    constexpr int kLevels = kSide * kSide;
+    if constexpr (LevelsOfLanes::kBlocks == kDVBlocksAtOnce) {
+        TransformBlocksOfLanes<ColumnButterfly, InverseEight>(LevelsOfLanes(levels, steps), samples,
+                                                              kLevels * sizeof(int16_t));
+    } else {
+        for (int i = 0; i < kDVBlocksAtOnce; ++i)
+            Inverse<ColumnButterfly>(levels + kLevels * i, steps[i], samples + kLevels * i);
+    }
+}
+
 void Half(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
     ReduceBlock(Levels(levels, steps), samples);
 }
@@ -40,7 +90,7 @@ void Quarter(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
         0.11548494f; // the mean of cos(pi / 8) and cos(3 pi / 8), by 1/2, and 1 / sqrt(8) across
     constexpr float kTwist = 0.10669417f; // the square of that mean, by 1/4
     const auto product = [&](int32_t place) {
-        return static_cast<float>(levels[place]) * (steps.factors[place] * steps.step);
+        return static_cast<float>(levels[place]) * (steps.factors->raster[place] * steps.step);
     };
     float coefficients[kLanes];
     Store(coefficients, ToFloat(Nearest(PixelFloats(product(1), product(8), kHasTwist ? product(9) : 0, 0))));
@@ -54,7 +104,7 @@ void Quarter(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
     std::memcpy(samples, words, 4 * sizeof(int16_t));
 }
 
-/// A block has no use for sixteen lanes: those bodies are the ones of eight.
+/// One block has no use for sixteen lanes: those bodies are the ones of eight.
 template <int kVectorLanes>
 const DVTransformKernels& Bodies() {
     if constexpr (kVectorLanes > kSide) {
@@ -66,12 +116,19 @@ const DVTransformKernels& Bodies() {
     }
 }
 
+constexpr DVFourBlocksKernels kFourBlocks = {InverseBlocks<InverseEight>, InverseBlocks<InverseFields>};
+
 } // namespace
 } // namespace PK_TARGET
 
 template <>
 const DVTransformKernels& DVTransformKernels::For<Target::PK_TARGET>() {
     return PK_TARGET::Bodies<PK_TARGET::kLanes>();
+}
+
+template <>
+const DVFourBlocksKernels& DVFourBlocksKernels::For<Target::PK_TARGET>() {
+    return PK_TARGET::kFourBlocks;
 }
 
 } // namespace PK

@@ -109,6 +109,8 @@ constexpr KernelRow kPrimitives[] = {
     Entry<&BlockTransformKernels::inverse248>("InverseDCT248", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::inverse88>("LevelsToSamples_88", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::inverse248>("LevelsToSamples_248", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVFourBlocksKernels::inverse88>("LevelsOfFourToSamples_88", {SignedWords(64), SignedWords(64)}),
+    Entry<&DVFourBlocksKernels::inverse248>("LevelsOfFourToSamples_248", {SignedWords(64), SignedWords(64)}),
     Entry<&DVTransformKernels::half>("LevelsToSamples_Half", {SignedWords(64), SignedWords(16)}),
     Entry<&DVTransformKernels::quarter88>("LevelsToSamples_Quarter88", {SignedWords(64), SignedWords(4)}),
     Entry<&DVTransformKernels::quarter248>("LevelsToSamples_Quarter248", {SignedWords(64), SignedWords(4)}),
@@ -390,6 +392,8 @@ constexpr KernelRow kMotion[] = {
 constexpr KernelRow kDV[] = {
     Entry<&DVSampleKernels::loadYUYV>("LoadDVBlocks_YUYV", {Bytes(256), SignedWords(256)}),
     Entry<&DVSampleKernels::loadUYVY>("LoadDVBlocks_UYVY", {Bytes(256), SignedWords(256)}),
+    Entry<&DVBlockKernels::lineDifferences>("DVLineDifferences", {SignedWords(64), Integers(2)}),
+    Entry<&DVBlockKernels::greatest>("GreatestOfDVBlock", {SignedWords(64), Integers(1)}),
     Entry<&DVBlockKernels::scale>("ScaleDVBlock", {SignedWords(64), SignedWords(64)}),
     Entry<&DVBlockKernels::sumOfLogarithms>("SumOfDVLogarithms", {SignedWords(64), Integers(1)}),
     Entry<&DVBlockKernels::quantise>("QuantiseDVBlock", {SignedWords(64), Bytes(73)}),

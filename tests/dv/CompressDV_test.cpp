@@ -13,6 +13,7 @@
 #include <string>
 #include <thread>
 #include <vector>
+#include <xmmintrin.h>
 
 namespace {
 
@@ -74,6 +75,20 @@ TEST_P(CompressDV, GivesTheSameBytesAtEveryInstructionSetAndInEveryThread) {
         for (int i = 0; i < 4; ++i)
             threads.emplace_back([&] { EXPECT_EQ(Encode(stream, picture, quality), frame); });
         for (std::thread& thread : threads) thread.join();
+    }
+}
+
+TEST_P(CompressDV, GivesTheSameBytesWhateverTheRoundingModeOfTheCaller) {
+    const Stream& stream = GetParam();
+    const Bytes picture = Picture(stream.width, stream.height);
+    const Bytes frame = Encode(stream, picture);
+    const uint32_t before = _mm_getcsr();
+    for (const unsigned mode : {_MM_ROUND_DOWN, _MM_ROUND_UP, _MM_ROUND_TOWARD_ZERO}) {
+        _MM_SET_ROUNDING_MODE(mode);
+        const uint32_t set = _mm_getcsr();
+        EXPECT_EQ(Encode(stream, picture), frame);
+        EXPECT_EQ(_mm_getcsr(), set);
+        _mm_setcsr(before);
     }
 }
 

@@ -8,6 +8,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 
@@ -16,7 +17,7 @@ namespace {
 
 constexpr int kSide = 8, kPlaces = 64;
 using Levels = std::array<int16_t, kPlaces>;
-using Factors = std::array<float, kPlaces>;
+using Factors = DVFactorTable;
 using Reals = std::array<double, kPlaces>;
 
 double C(int k) {
@@ -29,7 +30,8 @@ double Wave(int k, int place, int period) {
 Reals Coefficients(const Levels& levels, const DVSteps& steps) {
     Reals coefficients;
     for (size_t i = 0; i < kPlaces; ++i)
-        coefficients[i] = std::nearbyint(static_cast<double>(levels[i]) * steps.factors[i] * steps.step);
+        coefficients[i] =
+            std::nearbyint(static_cast<double>(levels[i]) * steps.factors->raster[i] * steps.step);
     coefficients[0] = 4 * levels[0];
     return coefficients;
 }
@@ -103,15 +105,23 @@ void Check(const Levels& levels, const DVSteps& steps) {
         }
 }
 
+/// Makes the other order of the factors too.
+const Factors& Parted(Factors& factors) {
+    for (size_t line = 0; line < kSide; ++line)
+        for (size_t i = 0; i < kSide; ++i)
+            factors.parted[kSide * line + i] = factors.raster[kSide * line + (i < 4 ? 2 * i : 2 * i - 7)];
+    return factors;
+}
+
 TEST(DVTransforms, EverySingleLevel) {
     Factors factors;
-    for (size_t i = 0; i < kPlaces; ++i) factors[i] = static_cast<float>(95 * i) / 256; // exact
+    for (size_t i = 0; i < kPlaces; ++i) factors.raster[i] = static_cast<float>(95 * i) / 256; // exact
     for (size_t place = 0; place < kPlaces; ++place)
         for (const int level : {-255, -3, 1, 17, 255}) {
             Levels levels{};
             levels[place] = static_cast<int16_t>(level);
-            Check(levels, {factors.data(), 1});
-            Check(levels, {factors.data(), 3});
+            Check(levels, {&factors, 1});
+            Check(levels, {&factors, 3});
         }
 }
 
@@ -119,13 +129,42 @@ TEST(DVTransforms, RandomLevels) {
     PKTest::Random random(20261125);
     for (int turn = 0; turn < 300; ++turn) {
         Factors factors;
-        for (float& factor : factors) factor = static_cast<float>(random.Below(4000)) / 256;
-        factors[0] = 0;
+        for (float& factor : factors.raster) factor = static_cast<float>(random.Below(4000)) / 256;
+        factors.raster[0] = 0;
         Levels levels;
         for (int16_t& level : levels)
             level = static_cast<int16_t>(static_cast<int32_t>(random.Below(31)) - 15);
         levels[0] = static_cast<int16_t>(static_cast<int32_t>(random.Below(512)) - 256);
-        Check(levels, {factors.data(), static_cast<float>(1 + random.Below(4))});
+        Check(levels, {&factors, static_cast<float>(1 + random.Below(4))});
+    }
+}
+
+/// Four blocks are transformed as each alone, with steps of their own.
+TEST(DVTransforms, FourBlocks) {
+    PKTest::Random random(20261126);
+    for (int turn = 0; turn < 100; ++turn) {
+        Factors factors[kDVBlocksAtOnce];
+        DVSteps steps[kDVBlocksAtOnce];
+        std::array<int16_t, kDVBlocksAtOnce * kPlaces> levels;
+        for (int16_t& level : levels)
+            level = static_cast<int16_t>(static_cast<int32_t>(random.Below(41)) - 20);
+        for (size_t i = 0; i < kDVBlocksAtOnce; ++i) {
+            for (float& factor : factors[i].raster) factor = static_cast<float>(random.Below(4000)) / 256;
+            factors[i].raster[0] = 0;
+            steps[i] = {&Parted(factors[i]), static_cast<float>(1 + random.Below(9))};
+        }
+        for (const Target target : PKTest::TargetsOfThisProcessor()) {
+            const auto& singly = KernelsFor<DVTransformKernels>(target);
+            const auto& together = KernelsFor<DVFourBlocksKernels>(target);
+            for (const bool is248 : {false, true}) {
+                std::array<int16_t, kDVBlocksAtOnce * kPlaces> expected, samples = levels;
+                for (size_t i = 0; i < kDVBlocksAtOnce; ++i)
+                    (is248 ? singly.inverse248 : singly.inverse88)(levels.data() + kPlaces * i, steps[i],
+                                                                   expected.data() + kPlaces * i);
+                (is248 ? together.inverse248 : together.inverse88)(samples.data(), steps, samples.data());
+                ASSERT_EQ(expected, samples) << TargetName(target) << (is248 ? ", 2-4-8" : ", 8-8");
+            }
+        }
     }
 }
 
@@ -135,19 +174,19 @@ TEST(DVTransforms, AFlatBlock) {
     for (const int dc : {-256, -7, 0, 10, 255}) {
         Levels levels{};
         levels[0] = static_cast<int16_t>(dc);
-        for (const float step : {1.0f, 416.0f}) Check(levels, {factors.data(), step});
+        for (const float step : {1.0f, 416.0f}) Check(levels, {&factors, step});
     }
 }
 
 TEST(DVTransforms, SamplesSaturate) {
     Factors factors;
-    factors.fill(1000);
-    factors[0] = 0;
+    std::ranges::fill(factors.raster, 1000.0f);
+    factors.raster[0] = 0;
     Levels levels;
     levels.fill(255);
     PKTest::AtEveryTarget([&] {
         Levels samples;
-        Best<DVTransformKernels>().inverse88(levels.data(), {factors.data(), 416}, samples.data());
+        Best<DVTransformKernels>().inverse88(levels.data(), {&factors, 416}, samples.data());
         EXPECT_EQ(32767, samples[0]);
     });
 }

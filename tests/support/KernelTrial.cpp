@@ -290,11 +290,19 @@ KernelTrial TransformTrial(const KernelRow& kernel, int32_t, Random&) {
             })};
 }
 
-/// With a step and factors that are drawn.
+/// A step and factors.
+struct DrawnSteps {
+    explicit DrawnSteps(Random& random) {
+        for (float& factor : factors.raster) factor = static_cast<float>(random.Below(32768)) / 256;
+        for (int i = 0; i < 64; ++i) factors.parted[i - i % 8 + i % 8 / 2 + i % 2 * 4] = factors.raster[i];
+        step = static_cast<float>(1 + random.Below(416));
+    }
+    PK::DVFactorTable factors;
+    float step;
+};
+
 KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
-    const auto factors = std::make_shared<std::array<float, 64>>();
-    for (float& factor : *factors) factor = static_cast<float>(random.Below(32768)) / 256;
-    const auto step = static_cast<float>(1 + random.Below(416));
+    const auto drawn = std::make_shared<DrawnSteps>(random);
     using Transform = DVTransformKernels::Transform;
     const TrialRow samples = RowOf(kernel.operands.destination, 1);
     return {{RowOf(kernel.operands.source, 1)},
@@ -302,9 +310,25 @@ KernelTrial LevelsTrial(const KernelRow& kernel, int32_t, Random& random) {
             Typed<Transform>([=](Transform run, const Sources& sources, uint8_t* destination) {
                 int16_t block[64];
                 std::memcpy(block, sources[0], sizeof block);
-                run(block, {factors->data(), step}, block);
+                run(block, {&drawn->factors, drawn->step}, block);
                 std::memcpy(destination, block, samples.bytes);
             })};
+}
+
+KernelTrial LevelsOfFourTrial(const KernelRow& kernel, int32_t, Random& random) {
+    const auto drawn = std::make_shared<std::vector<DrawnSteps>>();
+    for (int i = 0; i < kDVBlocksAtOnce; ++i) drawn->emplace_back(random);
+    using Transform = DVFourBlocksKernels::Transform;
+    const TrialRow blocks = RowOf(kernel.operands.source, kDVBlocksAtOnce);
+    return {
+        {blocks}, blocks, Typed<Transform>([=](Transform run, const Sources& sources, uint8_t* destination) {
+            int16_t levels[kDVBlocksAtOnce * 64], samples[kDVBlocksAtOnce * 64];
+            std::memcpy(levels, sources[0], sizeof levels);
+            DVSteps steps[kDVBlocksAtOnce];
+            for (size_t i = 0; i < kDVBlocksAtOnce; ++i) steps[i] = {&(*drawn)[i].factors, (*drawn)[i].step};
+            run(levels, steps, samples);
+            std::memcpy(destination, samples, sizeof samples);
+        })};
 }
 
 KernelTrial SamplesToBytesTrial(const KernelRow& kernel, int32_t, Random&) {
@@ -328,18 +352,6 @@ KernelTrial SamplesToYUYVTrial(const KernelRow& kernel, int32_t, Random& random)
                 int16_t blocks[4][64];
                 std::memcpy(blocks, sources[0], sizeof blocks);
                 run({blocks[0], blocks[1], blocks[2], blocks[3], lineStep}, destination, 32);
-            })};
-}
-
-KernelTrial CountTrial(const KernelRow& kernel, int32_t, Random&) {
-    using CountZeros = decltype(CoefficientKernels::countZeros8x8);
-    return {{RowOf(kernel.operands.source, 1)},
-            RowOf(kernel.operands.destination, 1),
-            Typed<CountZeros>([](CountZeros run, const Sources& sources, uint8_t* destination) {
-                int16_t block[64];
-                std::memcpy(block, sources[0], sizeof block);
-                const uint32_t count = run(block);
-                std::memcpy(destination, &count, sizeof count);
             })};
 }
 
@@ -378,6 +390,20 @@ KernelTrial ScaleBlockTrial(const KernelRow& kernel, int32_t, Random& random) {
                 std::memcpy(block, sources[0], sizeof block);
                 run(AsBlockFactors(*factors), roundUp, block);
                 std::memcpy(destination, block, sizeof block);
+            })};
+}
+
+/// A function of a block that tells a number or two.
+template <class Told>
+KernelTrial BlockTrial(const KernelRow& kernel, int32_t, Random&) {
+    using Tell = Told (*)(const int16_t* block);
+    return {{RowOf(kernel.operands.source, 1)},
+            RowOf(kernel.operands.destination, 1),
+            Typed<Tell>([](Tell run, const Sources& sources, uint8_t* destination) {
+                int16_t block[64];
+                std::memcpy(block, sources[0], sizeof block);
+                const Told told = run(block);
+                std::memcpy(destination, &told, sizeof told);
             })};
 }
 
@@ -544,7 +570,7 @@ struct SpecialTrial {
 constexpr SpecialTrial kSpecial[] = {
     {"Channel", TrialWith<ChannelPattern, DrawFloat>, "InvertChannelRow_Float"},
     {"Channel", TrialWith<ChannelPattern, DrawInteger>},
-    {"Coefficient", CountTrial, "CountZeros"},
+    {"Coefficient", BlockTrial<uint32_t>, "CountZeros"},
     {"Coefficient", TrialWith<int32_t, DrawScale>},
     {"ConvertFloat", TrialWith<PowerOfTwo, DrawPower>},
     {"MultiplyConstant", TrialWith<ChannelFactors, DrawUnscaled>, "MultiplyConstantRow_Unscaled"},
@@ -553,11 +579,14 @@ constexpr SpecialTrial kSpecial[] = {
     {"Transpose", TransposeTrial, "TransposeArea"},
     {"BlockTransform", TransformTrial},
     {"DVTransform", LevelsTrial},
+    {"DVFourBlocks", LevelsOfFourTrial},
     {"DVMacroblock", SamplesToBytesTrial, "SamplesToBytes"},
     {"DVMacroblock", SamplesToYUYVTrial},
     {"DVRow", PlanesTrial<1>, "FullPlanes"},
     {"DVSample", LoadBlocksTrial},
     {"DVBlock", ScaleBlockTrial, "Scale"},
+    {"DVBlock", BlockTrial<DVLineDifferences>, "DVLineDifferences"},
+    {"DVBlock", BlockTrial<uint32_t>, "Greatest"},
     {"DVBlock", SumOfLogarithmsTrial, "Sum"},
     {"DVBlock", QuantiseBlockTrial, "Quantise"},
     {"W210", PlanesTrial<2>, "Average"},

@@ -203,6 +203,37 @@ inline void TransformBlock(const Lines& source, int16_t* destination) {
         TransformInRegisters<ColumnButterfly, LineButterfly>(source, destination);
 }
 
+/// A block for each block of lanes: all four of them with sixteen lanes. The lines of the blocks stand beside each other, in
+/// vectors of four even and of four odd columns, so that no vector mixes blocks and nothing crosses from one to the other.
+/// \param source  gives a line of all blocks, even columns and odd ones apart.
+/// \param stride  bytes from one block of the destination to the next.
+template <class ColumnButterfly, class LineButterfly, class Lines>
+inline void TransformBlocksOfLanes(const Lines& source, int16_t* destination, int64_t stride) {
+    F32 even[kSide], odd[kSide];
+    for (int i = 0; i < kSide; ++i) source.Load(i, even[i], odd[i]);
+    ColumnButterfly::Apply(even);
+    ColumnButterfly::Apply(odd);
+    for (int line = 0; line < kSide; line += 4) {
+        TransposePixels(even[line], even[line + 1], even[line + 2], even[line + 3]);
+        TransposePixels(odd[line], odd[line + 1], odd[line + 2], odd[line + 3]);
+        F32 columns[kSide];
+        for (int i = 0; i < 4; ++i) {
+            columns[2 * i] = even[line + i];
+            columns[2 * i + 1] = odd[line + i];
+        }
+        LineButterfly::Apply(columns);
+        for (F32& column : columns) column = source.Finish(column);
+        F32 left[2], right[2];
+        PackFourColumns(columns, left[0], left[1]);
+        PackFourColumns(columns + 4, right[0], right[1]);
+        int16_t* const lines = destination + kSide * line;
+        for (int i = 0; i < 2; ++i) {
+            StoreFloatBlocks(lines + 2 * kSide * i, stride, LowPairs(left[i], right[i]));
+            StoreFloatBlocks(lines + (2 * i + 1) * kSide, stride, HighPairs(left[i], right[i]));
+        }
+    }
+}
+
 /// Half the size, of the first four coefficients of the first four lines: the columns, then the lines.
 template <class Lines>
 inline void ReduceBlock(const Lines& source, int16_t* destination) {
