@@ -94,7 +94,8 @@ inline constexpr auto kAreaShift = [] {
 static_assert(kAreaShift[0] == 0x03020201 && kAreaShift[3] == 0x05050404 && kAreaShift[63] == 0x01010101);
 
 /// The weights of the forward transforms as 16-bit fractions, those of AC rounded before they are halved; 1/4 for DC. The
-/// one weight of 1/2, of the difference of the fields, does not fit a signed value: it stands there as -1/2.
+/// one weight of 1/2, of the difference of the fields, does not fit a signed value: it stands there as -1/2, and who weighs
+/// turns the sign of the product back, which so is as exact as the others.
 inline constexpr auto kForwardWeights = [] {
     std::array<DVFactors, kDVModes> weights{};
     for (int32_t mode = 0; mode < kDVModes; ++mode)
@@ -108,7 +109,8 @@ inline constexpr const DVFactors& kWeights88 = kForwardWeights[0];
 inline constexpr const DVFactors& kWeights248 = kForwardWeights[1];
 static_assert(kWeights88[2] == 30273 && kWeights88[7] == 23624 && kWeights88[9] == 31521 &&
               kWeights88[11] == 28924);
-static_assert(kWeights248[8] == 30273 && kWeights248[10] == 27969 && kWeights248[15] == 21826);
+static_assert(kWeights248[32] == INT16_MIN && kWeights248[8] == 30273 && kWeights248[10] == 27969 &&
+              kWeights248[15] == 21826);
 
 /// DV100: what a step is multiplied by, in 32nds, by place. 720 chroma at column 5, line 4 is not as its mirror; streams
 /// have it so.

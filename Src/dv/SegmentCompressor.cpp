@@ -101,7 +101,6 @@ void SegmentCompressor::Weigh(int32_t mode, int16_t* values) const {
     fCoefficientKernels.multiplyScaled16s(weights.data(), values, kCoefficients, kScale16);
     if (mode == 0) return;
     constexpr int32_t kFieldDifference = 32;
-    static_assert(kWeights248[kFieldDifference] == INT16_MIN, "1/2 with the wrong sign");
     values[kFieldDifference] = static_cast<int16_t>(-values[kFieldDifference]);
 }
 

@@ -53,7 +53,7 @@ inline std::vector<uint8_t> PictureOf(const DVFrame& frame) {
             grain = grain * 1664525 + 1013904223;
             const double wave = std::sin(0.021 * x + 0.00004 * x * y) + std::cos(0.034 * y);
             const int32_t edge = (x / 53 + y / 41) % 3 * 16;
-            bytes.push_back(static_cast<uint8_t>(100 + 30 * wave + edge + (grain >> 29)));
+            bytes.push_back(static_cast<uint8_t>(100 + 30 * wave + edge + (grain >> 30)));
             bytes.push_back(static_cast<uint8_t>(128 + 20 * std::sin(0.01 * (x - x % 2) + 0.02 * y + x % 2)));
         }
     return bytes;

@@ -61,14 +61,14 @@ TEST(DecodeDV, HeadersThatAreNone) {
     };
     for (const auto& [byte, number] : {Change{4, 2}, {4, 7}, {5, 0}, {6, 0}, {7, 0}, {5, 3}, {7, 7}}) {
         std::vector<uint8_t> frame = good;
-        frame[byte] = static_cast<uint8_t>((frame[byte] & 0xf8) | number);
+        frame[byte] = static_cast<uint8_t>((frame[byte] & 0xf8U) | number);
         Image image(PK_PixelFormat_BGRA_4444_8u, kWidth, kHeight, 4);
         EXPECT_EQ(PK_ErrBadDVFormat, Decode(frame, PK_PixelFormat_NTSCDV25, image))
             << byte << ' ' << int{number};
         EXPECT_TRUE(image.IsUntouched());
     }
     // The areas agree on the other number, and the track has its own.
-    for (const uint8_t track : {0, 1}) {
+    for (const int track : {0, 1}) {
         std::vector<uint8_t> frame = good;
         frame[4] = static_cast<uint8_t>((frame[4] & 0xf8) | track);
         for (const size_t byte : {5u, 6u, 7u}) frame[byte] = static_cast<uint8_t>(frame[byte] & 0xf8);
@@ -83,8 +83,7 @@ TEST(DecodeDV, SizesThatNobodyDecodesTo) {
     for (const PK_PixelFormat stream :
          {PK_PixelFormat_NTSCDV25, PK_PixelFormat_PALDV50, PK_PixelFormat_NTSC_DV100_1080i}) {
         const std::vector<uint8_t> frame(static_cast<size_t>(PK_PixelFormatSize(stream, 0, 0)));
-        for (const auto& [width, height] :
-             {std::pair{721, 480}, {720, 481}, {100, 100}, {1440, 1080}}) {
+        for (const auto& [width, height] : {std::pair{721, 480}, {720, 481}, {100, 100}, {1440, 1080}}) {
             Image image(PK_PixelFormat_BGRA_4444_8u, width, height, 4);
             EXPECT_EQ(PK_ErrSizeMismatch, Decode(frame, stream, image)) << width << " x " << height;
             EXPECT_TRUE(image.IsUntouched());
