@@ -108,17 +108,17 @@ void DVMacroblockSource::Take411Stacked(const DVPlace& place, int16_t* blocks) c
 
 /// A line of chroma is the mean of two lines of one field.
 void DVMacroblockSource::Take420(const DVPlace& place, int16_t* blocks) const {
-    alignas(64) Block both[2][2];
+    alignas(64) int16_t both[2][2 * kCoefficients]; // of each chroma, the second block below the first
     for (int32_t i = 0; i < 2; ++i)
-        TakePiece(place.x, place.y + kSide * i, blocks + 2 * kCoefficients * i, {both[0][i], both[1][i]});
+        TakePiece(place.x, place.y + kSide * i, blocks + 2 * kCoefficients * i,
+                  {both[0] + kCoefficients * i, both[1] + kCoefficients * i});
     const ChromaBlocks chroma = ChromaAt(blocks, 4);
     const int32_t halfUnit = fBits == 0 ? 1 : 0;
     for (int32_t line = 0; line < kSide; ++line) {
         const int32_t first = line / 2 * 4 + line % 2;
         for (int32_t i = 0; i < kSide; ++i) {
-            const auto mean = [&](const Block(&lines)[2]) {
-                const int16_t* const at =
-                    lines[0] + kSide * first + i; // the second block is behind the first
+            const auto mean = [&](const int16_t* lines) {
+                const int16_t* const at = lines + kSide * first + i;
                 return static_cast<int16_t>((at[0] + at[2 * kSide] + halfUnit) >> 1);
             };
             chroma.cb[kSide * line + i] = mean(both[0]);
