@@ -59,9 +59,6 @@ std::span<const BlockPlace> BlocksOf(DVShape shape) {
     return kSideBySideBlocks;
 }
 
-/// The steps of DV100 multiply weights in 32nds.
-constexpr int32_t kHDScale = 5;
-
 /// Frames of 720 lines come in pairs, of which the second has its blocks marked as those of channels 2 and 3.
 int32_t FirstChannel(const uint8_t* frame, const DVFormat& format) {
     constexpr uint8_t kOfFirst = 0x04;

@@ -14,7 +14,6 @@ constexpr int32_t kBlocks = 6;     // of a macroblock
 constexpr int32_t kLumaBlocks = 4; // of them
 constexpr int32_t kScale16 = 16;   // of the weights that are 16-bit fractions
 constexpr int16_t kLeastDC = -256, kGreatestDC = 255;
-constexpr int32_t kGreatestLevel = 255;
 
 constexpr float PowerOfTwo(int32_t exponent) {
     float power = 1;

@@ -9,7 +9,8 @@ namespace PK {
 namespace {
 
 constinit std::mutex sMutex;
-constinit mc_enc_dv::Handle sDVEncoder = nullptr; // Guarded by sMutex, as is every call of the encoder.
+// Guarded by sMutex, as is every call of an encoder that takes no calls at once.
+constinit mc_enc_dv::Handle sDVEncoder = nullptr;
 
 // The encoder takes memory and converts under this lock: it must be taken before the locks of those, whose handlers are
 // registered by constructors of priority 101. What is registered last comes first.
@@ -32,10 +33,12 @@ void CloseDVEncoder() noexcept {
 }
 
 int32_t RunDVEncoder(const DVEncoderJob& job) noexcept {
-    const std::scoped_lock lock(sMutex);
+    std::unique_lock lock(sMutex);
     if (sDVEncoder == nullptr) sDVEncoder = mc_enc_dv::Open();
-    return mc_enc_dv::Encode(sDVEncoder, job.pixels, job.rowBytes, job.dst, job.dstBytes, job.width,
-                             job.height, 0, job.flags, job.fourcc, 0, 0);
+    const mc_enc_dv::Handle encoder = sDVEncoder;
+    if (mc_enc_dv::IsReentrant()) lock.unlock();
+    return mc_enc_dv::Encode(encoder, job.pixels, job.rowBytes, job.dst, job.dstBytes, job.width, job.height,
+                             0, job.flags, job.fourcc, 0, 0);
 }
 
 } // namespace PK

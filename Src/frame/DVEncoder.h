@@ -1,6 +1,6 @@
 #pragma once
 
-// The host's encoder of DV25: one for the process, one frame at a time.
+// The host's encoder of DV25: one for the process, and one frame at a time unless it takes more.
 
 #include <cstdint>
 
@@ -21,7 +21,7 @@ struct DVEncoderJob {
     uint32_t fourcc;
 };
 
-/// Encodes when those before have ended; opens the encoder if the library has not been started.
+/// Encodes, if the encoder wants it so when those before have ended; opens the encoder if the library has not been started.
 /// \return the bytes that were written.
 int32_t RunDVEncoder(const DVEncoderJob& job) noexcept;
 

@@ -99,6 +99,10 @@ Handle Open() noexcept {
 
 void Close(Handle) noexcept {}
 
+bool IsReentrant() noexcept {
+    return true;
+}
+
 int32_t Encode(Handle, const void* pixels, int32_t rowBytes, void* dst, int32_t dstBytes, int32_t width,
                int32_t height, int32_t, int32_t flags, uint32_t fourcc, int32_t, int32_t) noexcept {
     const Picture picture = {

@@ -3,9 +3,9 @@
 /// \file
 /// The host's encoder of DV25, which the library reaches by the numbers 30, 31 and 32 of its functions.
 ///
-/// The library opens it once, when it starts or at its first frame, and closes it when it stops. It encodes one frame at a
-/// time, whatever the number of threads that ask for it, and holds a lock over the call: an encoder needs none. It may call
-/// the library's exported functions, but none that encodes DV25, starts or stops it.
+/// The library opens it once, when it starts or at its first frame, and closes it when it stops. Unless IsReentrant says
+/// otherwise it encodes one frame at a time, whatever the number of threads that ask for it, and holds a lock over the call: an
+/// encoder needs none. It may call the library's exported functions, but none that encodes DV25, starts or stops it.
 
 #include <PixelKiln/Types.h>
 
@@ -58,5 +58,8 @@ void Close(Handle encoder) noexcept;
 int32_t Encode(Handle encoder, const void* pixels, int32_t rowBytes, void* dst, int32_t dstBytes,
                int32_t width, int32_t height, int32_t, int32_t flags, uint32_t fourcc, int32_t,
                int32_t) noexcept;
+
+/// Whether frames may be encoded at once, also while the encoder is closed: it keeps nothing from one to another.
+bool IsReentrant() noexcept;
 
 } // namespace mc_enc_dv

@@ -56,7 +56,7 @@ PK_API PK_Result PK_CompressDV100720pWithChannelOffset(const void* src, int32_t 
 
 /// Encodes a frame of DV25 with chroma 4:1:1, as SMPTE 314M has it: of 625 lines too, which PK_Convert encodes with 4:2:0.
 ///
-/// Memory and threads: as PK_CompressDV100720pWithChannelOffset; frames of DV25 are encoded one at a time in a process.
+/// Memory and threads: as PK_CompressDV100720pWithChannelOffset; a host's own encoder of DV25 may take one frame at a time.
 ///
 /// \param src          first byte of the image.
 /// \param srcRowBytes  bytes from one row to the next.
