@@ -14,14 +14,14 @@ inline I32 LoadSamples(const int16_t* source) {
     return LoadSignedWords(source) + Ints(kGrey);
 }
 
-void ToBytes(const int16_t* block, uint8_t* bytes) {
+[[maybe_unused]] void ToBytes(const int16_t* block, uint8_t* bytes) {
     for (int32_t i = 0; i < kSamples; i += 4 * kLanes)
         Store(bytes + i, PackLanes(LoadSamples(block + i), LoadSamples(block + i + kLanes),
                                    LoadSamples(block + i + 2 * kLanes), LoadSamples(block + i + 3 * kLanes)));
 }
 
 /// Four pairs of pixels a block of lanes: those of the left luma block, then those of the right one.
-void ToYUYV(const DVPairs& pairs, uint8_t* destination, ptrdiff_t rowBytes) {
+[[maybe_unused]] void ToYUYV(const DVPairs& pairs, uint8_t* destination, ptrdiff_t rowBytes) {
     const auto toRight = static_cast<int64_t>((pairs.right - pairs.left) * 2);
     for (int32_t line = 0; line < kSide; line += pairs.lineStep, destination += rowBytes) {
         const int32_t first = kSide * line;

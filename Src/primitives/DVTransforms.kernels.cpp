@@ -82,7 +82,7 @@ void InverseBlocks(const int16_t* levels, const DVSteps (&steps)[kDVBlocksAtOnce
     }
 }
 
-void Half(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
+[[maybe_unused]] void Half(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
     ReduceBlock(Levels(levels, steps), samples);
 }
 

@@ -6,10 +6,10 @@
 #include "Failure.h"
 #include "Formats.h"
 #include "FrameFiles.h"
+#include "FramesInOrder.h"
 #include "SamplePlanes.h"
 #include "SharedWords.h"
 #include "Terminal.h"
-#include "Workers.h"
 
 namespace tool {
 namespace {

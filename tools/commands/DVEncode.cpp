@@ -5,9 +5,9 @@
 #include "Failure.h"
 #include "Formats.h"
 #include "FrameFiles.h"
+#include "FramesInOrder.h"
 #include "SharedWords.h"
 #include "Terminal.h"
-#include "Workers.h"
 
 #include <algorithm>
 

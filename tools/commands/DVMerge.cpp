@@ -5,10 +5,10 @@
 #include "Failure.h"
 #include "Formats.h"
 #include "Frame.h"
+#include "FramesInOrder.h"
 #include "OutputFile.h"
 #include "SharedWords.h"
 #include "Terminal.h"
-#include "Workers.h"
 
 namespace tool {
 namespace {
