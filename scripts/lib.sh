@@ -39,7 +39,7 @@ install_packages() {
 
 build_packages=(g++ cmake ninja-build pkg-config libboost-dev)
 tool_packages=(libpng-dev libcli11-dev libcairo2-dev fonts-dejavu-core)
-test_packages=(libgtest-dev libopencolorio-dev python3 ffmpeg)
+test_packages=(libgtest-dev libopencolorio-dev python3 ffmpeg libdv4-dev)
 bench_packages=(libbenchmark-dev libyuv-dev libpixman-1-dev libswscale-dev libavcodec-dev libavfilter-dev libavutil-dev
     libopencv-core-dev libopencv-imgproc-dev libzimg-dev libopencolorio-dev cimg-dev libdv4-dev)
 
