@@ -297,8 +297,8 @@ TEST(MergeDV, NullPointersAreRefused) {
         const Bytes frame = Grey(format, 60);
         for (const auto& [a, b] :
              {std::pair<const void*, const void*>{nullptr, frame.data()}, {frame.data(), nullptr}})
-            ExpectRefusal(PK_ErrFailed, [&, a = a, b = b](void* dst) {
-                return PK_MergeDVCPRO(a, b, dst, format.format, kQuality);
+            ExpectRefusal(PK_ErrFailed, [&, first = a, second = b](void* dst) {
+                return PK_MergeDVCPRO(first, second, dst, format.format, kQuality);
             });
         EXPECT_EQ(PK_ErrFailed, PK_MergeDVCPRO(frame.data(), frame.data(), nullptr, format.format, kQuality));
     }
@@ -318,8 +318,8 @@ TEST(MergeDV, AFrameOfDV25WithoutItsHeaderIsRefused) {
         Bytes bad = good;
         bad[5] ^= 1; // AP1 is not as the others
         for (const auto& [a, b] : {std::pair<const Bytes*, const Bytes*>{&good, &bad}, {&bad, &good}})
-            ExpectRefusal(PK_ErrBadDVFormat, [&, a = a, b = b](void* dst) {
-                return PK_MergeDVCPRO(a->data(), b->data(), dst, format->format, kQuality);
+            ExpectRefusal(PK_ErrBadDVFormat, [&, first = a, second = b](void* dst) {
+                return PK_MergeDVCPRO(first->data(), second->data(), dst, format->format, kQuality);
             });
     }
 }

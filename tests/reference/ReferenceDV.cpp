@@ -178,7 +178,7 @@ void PlaceEdge(DVPlane& plane, const Samples8x8& block, int x, int y) {
 }
 
 void PlaceMacroblock(DVPicture& picture, const std::vector<Samples8x8>& blocks, DVPlace place, bool isField) {
-    auto& [luma, cb, cr] = picture.planes;
+    DVPlane &luma = picture.planes[0], &cb = picture.planes[1], &cr = picture.planes[2];
     const auto [shape, x, y] = place;
     const auto placeHD = [&](size_t piece, int pieceX, int pieceY, int step) {
         Place(luma, blocks[2 * piece], pieceX, pieceY, step);

@@ -2,6 +2,7 @@
 
 #include "primitives/DVCodes.h"
 
+#include <cstddef>
 #include <deque>
 #include <map>
 #include <utility>
