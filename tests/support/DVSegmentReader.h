@@ -3,6 +3,7 @@
 // A slow reader of video segments, bit by bit, that shares nothing with the library but the list of code words.
 
 #include <array>
+#include <cstddef>
 #include <cstdint>
 #include <vector>
 
