@@ -89,15 +89,16 @@ struct Lines {
     int32_t row, rowStep;
 };
 
-/// The wanted ones of a block whose first line is row y of the picture, and the next so many rows further on.
+/// The wanted ones of a block at full size whose first line is row y of the picture, and the next so many rows further on.
 Lines LinesAt(const DecodedPicture& picture, int32_t y, int32_t lineStep) {
-    const int32_t side = SideOfBlock(picture.size);
-    if (picture.field == 0) return {0, 1, side, y, lineStep};
+    if (picture.field == 0) return {0, 1, kSide, y, lineStep};
     const int32_t parity = picture.field - 1;
-    if (lineStep == 1) return {parity, 2, side / 2, y / 2, 1};
-    return {0, 1, y % 2 == parity ? side : 0, y / 2, 1};
+    if (lineStep == 1) return {parity, 2, kSide / 2, y / 2, 1};
+    return {0, 1, y % 2 == parity ? kSide : 0, y / 2, 1};
 }
 
+/// By the size, so that the few samples of small blocks are moved without loops.
+template <DVSize kSize>
 class PlaneWriter {
 public:
     PlaneWriter(const DecodedPicture& picture, const DestinationPlanes& planes)
@@ -110,51 +111,51 @@ public:
     }
 
 private:
+    static constexpr int32_t kShift = static_cast<int32_t>(kSize), kSamples = SideOfBlock(kSize); // of a line
+
     void ToBytes(const int16_t* block, uint8_t* bytes) const {
-        if (fPicture.size == DVSize::Full) return fKernels.toBytes(block, bytes);
-        const int32_t side = SideOfBlock(fPicture.size);
-        for (int32_t i = 0; i < side * side; ++i)
-            bytes[i] = static_cast<uint8_t>(std::clamp<int32_t>(block[i], -128, 127) + 128);
+        if constexpr (kSize == DVSize::Full) {
+            fKernels.toBytes(block, bytes);
+        } else {
+            for (int32_t i = 0; i < kSamples * kSamples; ++i)
+                bytes[i] = static_cast<uint8_t>(std::clamp<int32_t>(block[i], -128, 127) + 128);
+        }
     }
 
     void WriteBlock(const int16_t* block, const DVPlace& origin, const BlockPlace& place,
                     bool inTurns) const {
         const bool isLuma = place.plane == kLuma;
-        const auto shift = static_cast<int32_t>(fPicture.size);
         const int32_t firstColumn = isLuma ? origin.x : origin.x >> fPicture.format.ChromaShift();
         const bool hasHalfTheRows = !isLuma && fPicture.format.sampling == DVSampling::k420;
         const int32_t firstRow = hasHalfTheRows ? origin.y / 2 : origin.y;
-        const int32_t side = SideOfBlock(fPicture.size);
-        const int32_t x = (firstColumn + kSide * place.x) >> shift;
-        const Lines lines = inTurns ? LinesAt(fPicture, firstRow + place.y, 2)
-                                    : LinesAt(fPicture, (firstRow + kSide * place.y) >> shift, 1);
-
-        // A lone column is for both.
-        const int32_t columns = place.part == Part::Whole ? side : std::max(side / 2, 1);
-        const int32_t firstOfBlock = place.part == Part::RightHalf ? side / 2 : 0;
-        uint8_t bytes[kCoefficients];
+        const Lines lines = LinesOf(firstRow, place.y, inTurns);
+        uint8_t bytes[kSamples * kSamples];
         ToBytes(block, bytes);
-        const uint8_t* from = bytes + side * lines.first + firstOfBlock;
         const Plane<uint8_t>& plane = fPlanes[place.plane];
-        uint8_t* const to = plane.Row(lines.row) + x;
-        const ptrdiff_t toStep = plane.rowBytes * lines.rowStep;
-        const int32_t fromStep = side * lines.step;
-        switch (columns) {
-        case 8:
-            return CopyLines<8>(from, fromStep, to, toStep, lines.count);
-        case 4:
-            return CopyLines<4>(from, fromStep, to, toStep, lines.count);
-        case 2:
-            return CopyLines<2>(from, fromStep, to, toStep, lines.count);
-        default:
-            return CopyLines<1>(from, fromStep, to, toStep, lines.count);
-        }
+        uint8_t* const to = plane.Row(lines.row) + ((firstColumn + kSide * place.x) >> kShift);
+        constexpr int32_t kHalf = kSamples / 2;
+        if (place.part == Part::Whole)
+            CopyLines<kSamples>(bytes, lines, to, plane.rowBytes);
+        else // a lone column is for both
+            CopyLines<std::max(kHalf, 1)>(bytes + (place.part == Part::RightHalf ? kHalf : 0), lines, to,
+                                          plane.rowBytes);
+    }
+
+    /// Of a block so many further down in a macroblock that begins at a row.
+    Lines LinesOf(int32_t firstRow, int32_t blocksBelow, bool inTurns) const {
+        const int32_t row = firstRow + kSide * blocksBelow;
+        if constexpr (kSize != DVSize::Full) return {0, 1, kSamples, row >> kShift, 1};
+        return inTurns ? LinesAt(fPicture, firstRow + blocksBelow, 2) : LinesAt(fPicture, row, 1);
     }
 
     template <size_t kColumns>
-    static void CopyLines(const uint8_t* from, int32_t fromStep, uint8_t* to, ptrdiff_t toStep,
-                          int32_t count) {
-        for (; count > 0; --count, from += fromStep, to += toStep) std::memcpy(to, from, kColumns);
+    static void CopyLines(const uint8_t* bytes, const Lines& lines, uint8_t* to, ptrdiff_t rowBytes) {
+        const uint8_t* from = bytes + kSamples * lines.first;
+        for (int32_t i = 0; i < lines.count; ++i) {
+            std::memcpy(to, from, kColumns);
+            from += kSamples * lines.step;
+            to += rowBytes * lines.rowStep;
+        }
     }
 
     const DecodedPicture& fPicture;
@@ -249,7 +250,16 @@ size_t DVPlanesBytes(const DecodedPicture& picture) {
 }
 
 void DecodeDVToPlanes(const uint8_t* frame, const DecodedPicture& picture, const DestinationPlanes& planes) {
-    ForEachSegment(frame, picture, PlaneWriter(picture, planes));
+    switch (picture.size) {
+    case DVSize::Full:
+        return ForEachSegment(frame, picture, PlaneWriter<DVSize::Full>(picture, planes));
+    case DVSize::Half:
+        return ForEachSegment(frame, picture, PlaneWriter<DVSize::Half>(picture, planes));
+    case DVSize::Quarter:
+        return ForEachSegment(frame, picture, PlaneWriter<DVSize::Quarter>(picture, planes));
+    case DVSize::Eighth:
+        return ForEachSegment(frame, picture, PlaneWriter<DVSize::Eighth>(picture, planes));
+    }
 }
 
 void DecodeDVToYUYV(const uint8_t* frame, const DecodedPicture& picture, uint8_t* pixels,

@@ -86,21 +86,20 @@ void InverseBlocks(const int16_t* levels, const DVSteps (&steps)[kDVBlocksAtOnce
     ReduceBlock(Levels(levels, steps), samples);
 }
 
+/// The four samples of a quarter are the lanes of a pixel.
 template <bool kHasTwist>
 void Quarter(const int16_t* levels, const DVSteps& steps, int16_t* samples) {
-    constexpr float kSlope =
-        0.11548494f; // the mean of cos(pi / 8) and cos(3 pi / 8), by 1/2, and 1 / sqrt(8) across
-    constexpr float kTwist = 0.10669417f; // the square of that mean, by 1/4
+    // The mean of cos(pi / 8) and cos(3 pi / 8), by 1/2, and 1 / sqrt(8) across; and the square of that mean, by 1/4.
+    constexpr float kSlope = 0.11548494f, kTwist = 0.10669417f;
     const auto product = [&](int32_t place) {
         return static_cast<float>(levels[place]) * (steps.factors->raster[place] * steps.step) + steps.bias;
     };
-    float coefficients[kLanes];
-    Store(coefficients, ToFloat(Nearest(PixelFloats(product(1), product(8), kHasTwist ? product(9) : 0, 0))));
-    const float flat = 0.5f * static_cast<float>(levels[0]);
-    const float across = kSlope * coefficients[0], down = kSlope * coefficients[1],
-                twist = kTwist * coefficients[2];
-    const I32 four = Nearest(PixelFloats(flat + ((across + down) + twist), flat - ((across - down) + twist),
-                                         flat + ((across - down) - twist), flat - ((across + down) - twist)));
+    const float twist = kHasTwist ? product(9) : 0;
+    const F32 coefficients = ToFloat(Nearest(PixelFloats(product(1), product(8), twist, 0)));
+    const F32 across = ShufflePixel<0, 0, 0, 0>(coefficients) * PixelFloats(kSlope, -kSlope, kSlope, -kSlope);
+    const F32 down = ShufflePixel<1, 1, 1, 1>(coefficients) * PixelFloats(kSlope, kSlope, -kSlope, -kSlope);
+    const F32 both = ShufflePixel<2, 2, 2, 2>(coefficients) * PixelFloats(kTwist, -kTwist, -kTwist, kTwist);
+    const I32 four = Nearest(Floats(0.5f * static_cast<float>(levels[0])) + ((across + down) + both));
     alignas(64) int16_t words[2 * kLanes];
     Store(words, PackSignedInBlocks(four, four));
     std::memcpy(samples, words, 4 * sizeof(int16_t));
