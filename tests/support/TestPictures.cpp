@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <cmath>
 #include <functional>
+#include <iterator>
 #include <stdexcept>
 
 namespace PKTest {
@@ -71,6 +72,20 @@ std::vector<uint8_t> Graphics(int32_t width, int32_t height) {
     });
 }
 
+/// Discs of full colours, that differ far less in luma.
+std::vector<uint8_t> Colours(int32_t width, int32_t height) {
+    constexpr Code kColours[][2] = {// Y and U, Y and V, of yellow, cyan, green, magenta, red and blue
+                                    {{150, 40}, {150, 145}}, {{140, 165}, {140, 40}},
+                                    {{130, 55}, {130, 50}},  {{110, 200}, {110, 205}},
+                                    {{100, 95}, {100, 220}}, {{90, 220}, {90, 110}}};
+    return Drawn(width, height, [=](int32_t x, int32_t y) {
+        const int32_t pair = x - x % 2;
+        const double dx = pair % 240 - 120.0, dy = y % 180 - 90.0;
+        const auto ring = static_cast<size_t>(std::sqrt(dx * dx + 1.6 * dy * dy) / 22 + pair / 240 + y / 180);
+        return kColours[ring % std::size(kColours)][x % 2];
+    });
+}
+
 std::vector<uint8_t> Noise(int32_t width, int32_t height) {
     Random random(17);
     const auto code = [&random] { return 16.0 + random.Below(220); };
@@ -88,6 +103,7 @@ std::vector<TestPicture> TestPictures(int32_t width, int32_t height) {
     }
     pictures.push_back({"fine", Fine(width, height)});
     pictures.push_back({"graphics", Graphics(width, height)});
+    pictures.push_back({"colours in motion", InMotion(Colours(width, height), width, height)});
     pictures.push_back({"noise", Noise(width, height)});
     return pictures;
 }

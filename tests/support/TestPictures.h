@@ -13,7 +13,7 @@ struct TestPicture {
     std::vector<uint8_t> yuyv; ///< rows without gaps, from the top
 };
 
-/// Photographs, the same as two fields of a moving camera, fine patterns, graphics and noise.
+/// Photographs, the same as two fields of a moving camera, fine patterns, graphics, colours that move, and noise.
 std::vector<TestPicture> TestPictures(int32_t width, int32_t height);
 
 } // namespace PKTest
