@@ -135,14 +135,14 @@ PK_Result DecodePairs(const ConversionChain& onward, const uint8_t* frame, const
     const int32_t width = destination.width, height = destination.height;
     const bool isFull = width == format.width, isHalf = width == format.width / 2;
     if (!isFull && !isHalf) return PK_ErrBadWidth;
-    if (height != format.height / 2 && !(isFull && height == format.height)) return PK_ErrBadHeight;
-    const DecodedPicture picture = *PictureOfSize(format, width, height, field);
+    const auto picture = PictureOfSize(format, width, height, field);
+    if (!picture) return PK_ErrBadHeight;
     if (isHalf) {
         if (!IsPacked4444(onward.source) || !IsYUV(onward.source)) return PK_ErrBadDstFormat;
-        return DecodeRows(onward, frame, picture, destination, true);
+        return DecodeRows(onward, frame, *picture, destination, true);
     }
     if (!onward.IsCopy() || onward.source != DVPairsFormat(format.stream)) return PK_ErrBadDstFormat;
-    DecodeDVToYUYV(frame, picture, destination.pixels, destination.rowBytes);
+    DecodeDVToYUYV(frame, *picture, destination.pixels, destination.rowBytes);
     return PK_Success;
 }
 
@@ -152,7 +152,8 @@ PK_Result DecodeDV25(const ConversionChain& onward, const uint8_t* frame, PK_Pix
                      const DestinationImage& destination, int32_t field, int32_t quality) {
     const DVFormat* const format = FindDVFormat(stream);
     if (format == nullptr || format->channels != 1) return PK_ErrBadSrcFormat;
-    if (!PictureOfSize(*format, destination.width, destination.height, field)) return PK_ErrSizeMismatch;
+    const auto size = PictureOfSize(*format, destination.width, destination.height, field);
+    if (!size) return PK_ErrSizeMismatch;
     const DVFormat* const ofFrame = FormatOfFrame(frame, *format);
     if (ofFrame == nullptr) return PK_ErrBadDVFormat;
     const PK_PixelFormat pixels = onward.source;
@@ -160,7 +161,7 @@ PK_Result DecodeDV25(const ConversionChain& onward, const uint8_t* frame, PK_Pix
                          WithAlpha(pixels, kAlphaMeaningless) == PK_PixelFormat_BGRX_4444_8u ||
                          WithAlpha(pixels, kAlphaMeaningless) == PK_PixelFormat_VUYX_4444_8u;
     if (!isKnown) return PK_ErrBadDstFormat;
-    const DecodedPicture picture = *PictureOfSize(*ofFrame, destination.width, destination.height, field);
+    const DecodedPicture picture = {*ofFrame, size->size, size->field};
     const bool interpolates = picture.size == DVSize::Full || quality >= kExactSizeQuality;
     return DecodeRows(onward, frame, picture, destination, interpolates);
 }

@@ -61,9 +61,10 @@ void DVDecodeState::Decode(const uint8_t* segment, const DVPlace (&places)[kMacr
 
 /// DC without its lowest bit is the mean of the block.
 void DVDecodeState::TakeDC(const uint8_t* segment) {
-    constexpr uint8_t kPlaces[] = {4, 18, 32, 46, 60, 70};
+    constexpr uint8_t kPlaces[] = {4, 18, 32, 46, 60, 70}, kSign = 0x80;
     for (int32_t i = 0; i < kMacroblocksOfSegment; ++i, segment += kDIFBlockBytes)
-        for (int32_t j = 0; j < Blocks(); ++j) Block(i, j)[0] = static_cast<int8_t>(segment[kPlaces[j]]);
+        for (int32_t j = 0; j < Blocks(); ++j)
+            Block(i, j)[0] = static_cast<int16_t>((segment[kPlaces[j]] ^ kSign) - kSign);
 }
 
 void DVDecodeState::Parse(const uint8_t* segment) {

@@ -35,7 +35,7 @@ void CloseDVEncoder() noexcept {
 int32_t RunDVEncoder(const DVEncoderJob& job) noexcept {
     std::unique_lock lock(sMutex);
     if (sDVEncoder == nullptr) sDVEncoder = mc_enc_dv::Open();
-    const mc_enc_dv::Handle encoder = sDVEncoder;
+    mc_enc_dv::Handle encoder = sDVEncoder;
     if (mc_enc_dv::IsReentrant()) lock.unlock();
     return mc_enc_dv::Encode(encoder, job.pixels, job.rowBytes, job.dst, job.dstBytes, job.width, job.height,
                              0, job.flags, job.fourcc, 0, 0);

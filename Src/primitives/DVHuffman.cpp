@@ -105,7 +105,7 @@ public:
     uint64_t Leading(uint32_t count) const { return fBits >> (64 - count); }
 
     /// The first bits, fewer than 56, with zeros behind them.
-    uint64_t Cut(uint32_t count) const { return count == 0 ? 0 : Leading(count) << (64 - count); }
+    uint64_t Cut(uint32_t count) const { return fBits & ~(~uint64_t{0} >> count); }
 
 private:
     const uint8_t* fNext;
