@@ -168,7 +168,7 @@ uint32_t Parse(const DVHuffmanTable& table, BitWindow window, uint32_t left, Blo
     }
     block.place = place;
     block.isDone = isDone;
-    block.cutBits = isDone ? 0 : left;
+    block.cutBits = isDone ? 0 : std::min(left, kWindowBits - 1); // less than the longest code word has
     block.cut = window.Cut(block.cutBits);
     return isDone ? left : 0;
 }
