@@ -30,7 +30,8 @@ PK_PixelFormat DVPairsFormat(PK_PixelFormat stream) {
 }
 
 DecodeTarget ChooseDV25Target(PK_PixelFormat stream, const DecodeTarget& wanted, int32_t quality) {
-    const int32_t width = FindDVFormat(stream)->width, height = FindDVFormat(stream)->height;
+    const DVFormat& full = *FindDVFormat(stream);
+    const int32_t width = full.width, height = full.height;
     const PK_PixelFormat format = DV25PixelFormat(wanted.format);
     const DecodeTarget whole = {format, width, wanted.height <= height / 2 ? height / 2 : height};
     if (quality >= kExactSizeQuality || wanted.width >= width / 2) return whole;

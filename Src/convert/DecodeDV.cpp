@@ -53,7 +53,7 @@ public:
         fWidenedWidth = is411 && interpolates && !isPairs ? picture.Width() : (picture.Width() + 1) / 2;
     }
 
-    /// Adds what Run takes.
+    /// Makes rows of pixels of the planes, and by the chain of the destination.
     PK_Result Run(const DestinationPlanes& planes, const DestinationImage& destination,
                   const ConversionChain& onward) const {
         RowMemory memory(destination.width);

@@ -112,10 +112,9 @@ static_assert(kWeights88[2] == 30273 && kWeights88[7] == 23624 && kWeights88[9] 
 static_assert(kWeights248[32] == INT16_MIN && kWeights248[8] == 30273 && kWeights248[10] == 27969 &&
               kWeights248[15] == 21826);
 
-/// DV100: what a step is multiplied by, in 32nds, by place. 720 chroma at column 5, line 4 is not as its mirror; streams
-/// have it so.
+/// DV100: what a step is multiplied by, in parts of this unit, by place: of luma and of chroma for 1080 lines, and then for 720.
+/// Chroma of 720 at column 5, line 4 is not as its mirror; streams have it so.
 inline constexpr float kDV100WeightUnit = 32;
-enum class DV100Table : uint8_t { Luma1080, Chroma1080, Luma720, Chroma720 };
 inline constexpr DVFactors kDV100Weights[4] = {
     {128, 16, 17, 18,  18, 19, 42, 44, 16, 17, 18,  18,  19, 38, 43, 45, 17,  18,  19,  19, 40, 41,
      45,  48, 18, 18,  19, 40, 41, 42, 46, 49, 18,  19,  40, 41, 42, 43, 48,  101, 19,  38, 41, 42,
